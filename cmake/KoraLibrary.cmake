@@ -1,0 +1,26 @@
+# One folder is one library. A library sees only the folders it names, so that the build
+# refuses an include that looks up or sideways.
+#
+#   kora_library(<name> [QT] [DEPENDS <library>...])
+#
+# QT: the folder may use Qt Widgets, printing and SVG.
+function(kora_library name)
+  cmake_parse_arguments(ARG "QT" "" "DEPENDS" ${ARGN})
+  file(GLOB sources CONFIGURE_DEPENDS *.cpp *.h)
+  add_library(${name} STATIC ${sources})
+  # A folder's headers are reached as "folder/header.h" through a tree of links, one root a
+  # library, so that a library's own dependencies are all that it can include.
+  file(RELATIVE_PATH place ${CMAKE_SOURCE_DIR}/src ${CMAKE_CURRENT_SOURCE_DIR})
+  set(root ${CMAKE_BINARY_DIR}/include/${name})
+  get_filename_component(parent ${root}/${place} DIRECTORY)
+  file(MAKE_DIRECTORY ${parent})
+  file(CREATE_LINK ${CMAKE_CURRENT_SOURCE_DIR} ${root}/${place} SYMBOLIC)
+  target_include_directories(${name} PUBLIC ${root})
+  target_link_libraries(${name} PUBLIC ${ARG_DEPENDS})
+  if(ARG_QT)
+    set_target_properties(${name} PROPERTIES AUTOMOC ON AUTORCC ON)
+    target_link_libraries(${name} PUBLIC Qt6::Widgets Qt6::PrintSupport Qt6::Svg)
+    target_compile_definitions(${name} PUBLIC QT_NO_KEYWORDS)
+    target_compile_options(${name} PRIVATE -Wno-shadow -Wno-conversion)
+  endif()
+endfunction()

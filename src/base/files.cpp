@@ -1,0 +1,341 @@
+#include "base/files.h"
+
+#include <algorithm>
+
+#include "base/runtime_error.h"
+#include "base/text.h"
+
+namespace kora {
+
+struct Files::Folder {
+  std::int64_t modified = -1;
+  // Lower-case name to the name on the host; where two differ in case alone, the first by bytes.
+  std::unordered_map<std::string, std::string> entries;
+};
+
+namespace {
+
+bool IsLetter(char c) { return (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z'); }
+bool IsSeparator(char c) { return c == '\\' || c == '/'; }
+
+// The names of a path without its drive, "." passed over and ".." taken back, never above the
+// drive.
+std::vector<std::string_view> PathNames(std::string_view path) {
+  std::vector<std::string_view> names;
+  size_t start = 0;
+  for (size_t i = 0; i <= path.size(); ++i) {
+    if (i < path.size() && !IsSeparator(path[i])) continue;
+    const std::string_view name = path.substr(start, i - start);
+    start = i + 1;
+    if (name.empty() || name == ".") continue;
+    if (name == "..") {
+      if (!names.empty()) names.pop_back();
+      continue;
+    }
+    names.push_back(name);
+  }
+  return names;
+}
+
+struct DosParts {
+  char drive = 'c';
+  std::string_view rest;
+};
+
+DosParts SplitDrive(std::string_view path) {
+  if (path.empty() || path.find('\0') != std::string_view::npos) throw RunTimeError(kBadFileName);
+  DosParts parts;
+  parts.rest = path;
+  if (path.size() >= 2 && path[1] == ':') {
+    if (!IsLetter(path[0])) throw RunTimeError(kBadFileName);
+    parts.drive = char(path[0] | 0x20);
+    parts.rest = path.substr(2);
+  }
+  return parts;
+}
+
+// Splits "c:\a\b.txt" into "c:\a\" and "b.txt".
+std::pair<std::string_view, std::string_view> SplitName(std::string_view path) {
+  size_t end = path.size();
+  while (end > 0 && !IsSeparator(path[end - 1]) && path[end - 1] != ':') --end;
+  return {path.substr(0, end), path.substr(end)};
+}
+
+std::string FolderOf(const std::string& host) {
+  const size_t slash = host.rfind('/');
+  if (slash == std::string::npos) return ".";
+  return slash == 0 ? "/" : host.substr(0, slash);
+}
+
+std::string Join(const std::string& folder, std::string_view name) {
+  std::string out = folder;
+  if (out.empty() || out.back() != '/') out += '/';
+  out += name;
+  return out;
+}
+
+}  // namespace
+
+Files::Files(std::string home, Io& io) : home_(std::move(home)), io_(io) {
+  while (home_.size() > 1 && home_.back() == '/') home_.pop_back();
+}
+
+Files::~Files() = default;
+
+std::int64_t Files::Modified(const std::string& host) const {
+  const HostStatus status = io_.Status(host);
+  return status.exists && status.folder ? status.modified : -1;
+}
+
+Files::Folder* Files::FolderFor(const std::string& host) const {
+  const std::int64_t modified = Modified(host);
+  if (modified < 0) {
+    listings_.erase(host);
+    return nullptr;
+  }
+  std::unique_ptr<Folder>& folder = listings_[host];
+  if (folder && folder->modified == modified) return folder.get();
+  folder = std::make_unique<Folder>();
+  std::vector<std::string> names;
+  try {
+    names = io_.List(host);
+  } catch (const RunTimeError&) {
+    listings_.erase(host);  // a folder that may not be listed has no names to offer
+    return nullptr;
+  }
+  std::sort(names.begin(), names.end());
+  for (std::string& name : names) {
+    std::string key = LCase(name);
+    folder->entries.emplace(std::move(key), std::move(name));
+  }
+  folder->modified = modified;
+  return folder.get();
+}
+
+const std::string* Files::FindEntry(const std::string& hostFolder, std::string_view name) const {
+  Folder* folder = FolderFor(hostFolder);
+  if (!folder) return nullptr;
+  const auto it = folder->entries.find(LCase(name));
+  return it == folder->entries.end() ? nullptr : &it->second;
+}
+
+// The program's own changes are entered into a listing that was true before them, so that
+// making thousands of files does not read the folder thousands of times.
+void Files::Note(const std::string& host, bool added, std::int64_t before) const {
+  const std::string hostFolder = FolderOf(host);
+  const auto it = listings_.find(hostFolder);
+  if (it == listings_.end()) return;
+  if (it->second->modified != before) {
+    listings_.erase(it);
+    return;
+  }
+  const std::string name = host.substr(host.rfind('/') + 1);
+  if (added) {
+    it->second->entries.emplace(LCase(name), name);
+  } else {
+    const auto entry = it->second->entries.find(LCase(name));
+    if (entry != it->second->entries.end() && entry->second == name)
+      it->second->entries.erase(entry);
+  }
+  it->second->modified = Modified(hostFolder);
+}
+
+std::string Files::ResolveFolder(std::string_view dosFolder) const {
+  const std::string key(dosFolder);
+  const auto known = folders_.find(key);
+  if (known != folders_.end()) return known->second;
+
+  std::string host;
+  const DosParts parts = SplitDrive(dosFolder.empty() ? std::string_view("c:\\") : dosFolder);
+  if (parts.drive == 'z') {
+    host.assign(1, '/');
+  } else {
+    host = Join(home_, std::string("drive_") + parts.drive);
+  }
+  std::vector<std::string_view> names = PathNames(parts.rest);
+  if (parts.drive == 'c' && !names.empty() && EqualNoCase(names.front(), "windows")) {
+    host = home_;
+    names.erase(names.begin());
+  }
+  bool all = true;
+  for (const std::string_view name : names) {
+    std::string next = Join(host, name);
+    if (!io_.Status(next).exists) {
+      if (const std::string* entry = FindEntry(host, name)) next = Join(host, *entry);
+      else all = false;
+    }
+    host = next;
+  }
+  // A folder that is not there yet may come in another case.
+  if (all) folders_.emplace(key, host);
+  return host;
+}
+
+std::string Files::HostPath(std::string_view path) const {
+  SplitDrive(path);
+  const auto [folder, name] = SplitName(path);
+  if (name.empty() || name == "." || name == "..") return ResolveFolder(path);
+  const std::string hostFolder = ResolveFolder(folder);
+  std::string host = Join(hostFolder, name);
+  if (io_.Status(host).exists) return host;
+  if (const std::string* entry = FindEntry(hostFolder, name)) return Join(hostFolder, *entry);
+  return host;
+}
+
+std::string Files::DosPath(std::string_view hostPath) const {
+  std::string out(hostPath);
+  const std::string drive = home_ + "/drive_c/";
+  if (out.rfind(drive, 0) == 0) {
+    out = "c:\\" + out.substr(drive.size());
+  } else {
+    out = "Z:" + (out.empty() || out[0] != '/' ? "/" + out : out);
+  }
+  std::replace(out.begin(), out.end(), '/', '\\');
+  return out;
+}
+
+bool Files::CheckFile(std::string_view path) const {
+  try {
+    return io_.Status(HostPath(path)).exists;
+  } catch (const RunTimeError&) {
+    return false;  // what is no path does not exist
+  }
+}
+
+bool Files::IsFolder(std::string_view path) const {
+  try {
+    return io_.Status(HostPath(path)).folder;
+  } catch (const RunTimeError&) {
+    return false;
+  }
+}
+
+std::unique_ptr<HostFile> Files::Open(std::string_view path, OpenMode mode) const {
+  SplitDrive(path);
+  const auto [folder, name] = SplitName(path);
+  if (name.empty()) throw RunTimeError(kBadFileName);
+  if (mode == OpenMode::kRead || mode == OpenMode::kReadWrite) {
+    const std::string hostFolder = ResolveFolder(folder);
+    try {
+      return io_.Open(Join(hostFolder, name), mode);
+    } catch (const RunTimeError& e) {
+      if (e.number() != kFileNotFound && e.number() != kPathNotFound) throw;
+    }
+    folders_.erase(std::string(folder));  // the folder may have been renamed meanwhile
+    return io_.Open(HostPath(path), mode);
+  }
+  const std::string host = HostPath(path);
+  const std::int64_t before = Modified(FolderOf(host));
+  auto file = io_.Open(host, mode);
+  Note(host, true, before);
+  return file;
+}
+
+std::vector<std::string> Files::List(std::string_view folder) const {
+  std::vector<std::string> names = io_.List(HostPath(folder));
+  std::sort(names.begin(), names.end(), [](const std::string& a, const std::string& b) {
+    const std::string x = LCase(a), y = LCase(b);
+    return x != y ? x < y : a < b;
+  });
+  return names;
+}
+
+void Files::MakeFolder(std::string_view path) const {
+  const std::string host = HostPath(path);
+  for (size_t i = 1; i <= host.size(); ++i) {
+    if (i < host.size() && host[i] != '/') continue;
+    const std::string part = host.substr(0, i);
+    const HostStatus status = io_.Status(part);
+    if (status.exists && !status.folder) throw RunTimeError(kPathAccess);
+    if (!status.exists) io_.MakeFolder(part);
+  }
+}
+
+void Files::Remove(std::string_view path) const {
+  const std::string host = HostPath(path);
+  const std::int64_t before = Modified(FolderOf(host));
+  io_.Remove(host);
+  Note(host, false, before);
+}
+
+void Files::Rename(std::string_view from, std::string_view to) const {
+  const std::string hostFrom = HostPath(from);
+  const std::string hostTo = HostPath(to);
+  io_.Rename(hostFrom, hostTo);
+  listings_.erase(FolderOf(hostFrom));
+  listings_.erase(FolderOf(hostTo));
+}
+
+std::string Files::ReadAll(std::string_view path, std::uint64_t limit) const {
+  const auto file = Open(path, OpenMode::kRead);
+  const std::uint64_t size = file->Size();
+  if (size > limit) throw RunTimeError(kOutOfMemory);
+  std::string bytes(size_t(size), '\0');
+  const size_t got = file->ReadAt(0, bytes.data(), bytes.size());
+  bytes.resize(got);
+  return bytes;
+}
+
+void Files::WriteAll(std::string_view path, std::string_view bytes) const {
+  const std::string host = HostPath(path);
+  const std::string temporary = host + ".tmp~";
+  const std::int64_t before = Modified(FolderOf(host));
+  try {
+    auto file = io_.Open(temporary, OpenMode::kReplace);
+    file->WriteAt(0, bytes.data(), bytes.size());
+    file->Flush();
+    file.reset();
+    io_.Rename(temporary, host);
+  } catch (const RunTimeError&) {
+    if (io_.Status(temporary).exists) {
+      try {
+        io_.Remove(temporary);
+      } catch (const RunTimeError&) {
+        // The first failure is the one to tell.
+      }
+    }
+    throw;
+  }
+  Note(host, true, before);
+}
+
+std::string WithBackslash(std::string_view folder) {
+  std::string out(folder);
+  if (!out.empty() && !IsSeparator(out.back())) out += '\\';
+  return out;
+}
+
+bool IsFileCode(std::string_view code) {
+  code = Trim(code);
+  if (code.empty() || code.size() > 6) return false;
+  if (code.back() == '.' || code.front() == '.') return false;
+  for (const char c : code) {
+    const auto u = static_cast<unsigned char>(c);
+    if (u < 0x21 || u == 0x7F || u >= 0x80) return false;
+    if (std::string_view("\\/:*?\"<>|,;=").find(c) != std::string_view::npos) return false;
+  }
+  const std::string stem = UCase(code.substr(0, code.find('.')));
+  for (const char* device : {"CON", "PRN", "AUX", "NUL"})
+    if (stem == device) return false;
+  if (stem.size() == 4 && (stem.rfind("COM", 0) == 0 || stem.rfind("LPT", 0) == 0) &&
+      stem[3] >= '1' && stem[3] <= '9')
+    return false;
+  return true;
+}
+
+std::string CodeFileName(std::string_view code, std::string_view extension) {
+  if (!IsFileCode(code)) throw RunTimeError(kBadFileName);
+  return std::string(Trim(code)) + std::string(extension);
+}
+
+bool LineReader::Next(std::string_view& line) {
+  if (rest_.empty()) return false;
+  const size_t end = rest_.find('\n');
+  line = rest_.substr(0, end);
+  rest_.remove_prefix(end == std::string_view::npos ? rest_.size() : end + 1);
+  if (!line.empty() && line.back() == '\r') line.remove_suffix(1);
+  ++number_;
+  return true;
+}
+
+}  // namespace kora

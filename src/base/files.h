@@ -1,0 +1,94 @@
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+#include "base/io.h"
+
+namespace kora {
+
+// DOS paths and the host files behind them. Paths are UTF-8 with "\" between the names and a
+// drive in front ("c:\korawin\data\Names.dat"); names match whatever their case. Drive C: is
+// the folder drive_c of the home, X: drive_x, and Z: the root of the host's file system; the
+// home itself stands for the Windows folder, "C:\WINDOWS\". A path can't climb above its
+// drive with "..".
+//
+// Opening asks the host for the exact name first and looks through the folder only when that
+// fails; folders are read once and read again only when they changed.
+class Files {
+ public:
+  // `home` is a host folder; it need not exist yet.
+  explicit Files(std::string home, Io& io = MachineIo());
+  ~Files();
+  Files(const Files&) = delete;
+  Files& operator=(const Files&) = delete;
+
+  const std::string& home() const { return home_; }
+  Io& io() const { return io_; }
+
+  // The host path of a DOS path: of the entry that is there in any case, or else where it
+  // would be made. A path with no drive is of drive C:. Error 52 for a path with an empty
+  // name, a NUL or a drive that is no letter.
+  std::string HostPath(std::string_view path) const;
+  // The DOS path that names a host path: on Z:, or on C: within the home's drive.
+  std::string DosPath(std::string_view hostPath) const;
+
+  // True when the path exists, file or folder.
+  bool CheckFile(std::string_view path) const;
+  bool IsFolder(std::string_view path) const;
+  std::unique_ptr<HostFile> Open(std::string_view path, OpenMode mode) const;
+  // Names in a folder, sorted without regard to case. Error 76 when it is not there.
+  std::vector<std::string> List(std::string_view folder) const;
+  // Makes the folder and those above it; nothing when it is there.
+  void MakeFolder(std::string_view path) const;
+  void Remove(std::string_view path) const;
+  void Rename(std::string_view from, std::string_view to) const;
+
+  // The whole file. Error 7 when larger than `limit` bytes.
+  std::string ReadAll(std::string_view path, std::uint64_t limit = 256u << 20) const;
+  // Replaces the file as a whole: written to a temporary file beside it, flushed, renamed
+  // over. A failure or a crash at any point leaves the old file or the new one.
+  void WriteAll(std::string_view path, std::string_view bytes) const;
+
+ private:
+  struct Folder;
+  Folder* FolderFor(const std::string& host) const;
+  const std::string* FindEntry(const std::string& hostFolder, std::string_view name) const;
+  std::string ResolveFolder(std::string_view dosFolder) const;
+  void Note(const std::string& host, bool added, std::int64_t before) const;
+  std::int64_t Modified(const std::string& host) const;
+
+  std::string home_;
+  Io& io_;
+  mutable std::unordered_map<std::string, std::string> folders_;  // DOS folder -> host folder
+  mutable std::unordered_map<std::string, std::unique_ptr<Folder>> listings_;
+};
+
+// "c:\korawin\data" and "c:\korawin\data\" both to "c:\korawin\data\"; empty stays empty.
+std::string WithBackslash(std::string_view folder);
+
+// True where `code` can name a file of its own in a folder: 1 to 6 bytes after trimming,
+// no path or wildcard character, no control byte, no device name ("NUL", "COM1"), no dots
+// at its end. Codes become file names only after this test.
+bool IsFileCode(std::string_view code);
+// Trimmed code + extension, as "BHP" and ".WDT" give "BHP.WDT". Error 52 unless IsFileCode.
+std::string CodeFileName(std::string_view code, std::string_view extension);
+
+// Reads lines that end in CR LF or LF. The last needs no end.
+class LineReader {
+ public:
+  explicit LineReader(std::string_view text) : rest_(text) {}
+  bool Next(std::string_view& line);
+  int number() const { return number_; }  // of the line last read, from 1
+
+ private:
+  std::string_view rest_;
+  int number_ = 0;
+};
+
+}  // namespace kora

@@ -1,0 +1,39 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace kora {
+
+enum class Buttons { kOk, kOkCancel, kYesNo, kYesNoCancel, kRetryCancel };
+enum class Answer { kOk, kCancel, kYes, kNo, kRetry };
+
+// How far a long pass has come. Destroying it ends the display.
+class Progress {
+ public:
+  virtual ~Progress() = default;
+  // Lets the window live meanwhile. False when the user asks to stop.
+  virtual bool Step(int done, int total) = 0;
+};
+
+// What the program says to the user and asks of him. One place, so that a command without
+// windows and the tests can answer.
+class Dialogs {
+ public:
+  virtual ~Dialogs() = default;
+  virtual void Message(std::string_view text, std::string_view title) = 0;
+  virtual Answer Ask(std::string_view text, std::string_view title, Buttons buttons) = 0;
+  // Nothing when cancelled; an empty answer counts as cancelled too.
+  virtual std::optional<std::string> Prompt(std::string_view text, std::string_view title,
+                                            std::string_view standing) = 0;
+  virtual std::unique_ptr<Progress> StartProgress(std::string_view title) = 0;
+  // The busy pointer. Calls do not nest.
+  virtual void SetBusy(bool busy) = 0;
+  // Handles what waits in the event queue (paint, mouse, keys).
+  virtual void Yield() = 0;
+};
+
+}  // namespace kora

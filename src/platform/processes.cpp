@@ -1,0 +1,72 @@
+#include "platform/processes.h"
+
+#include "base/runtime_error.h"
+
+#ifdef _WIN32
+#include <windows.h>
+#else
+#include <cerrno>
+#include <spawn.h>
+#include <sys/wait.h>
+#include <time.h>
+extern char** environ;
+#endif
+
+namespace kora {
+namespace {
+
+class HostProcesses : public Processes {
+ public:
+#ifdef _WIN32
+  int RunAndWait(const std::string& program, const std::vector<std::string>& arguments,
+                 const std::function<void()>& idle) override {
+    std::string line = "\"" + program + "\"";
+    for (const std::string& a : arguments) line += " \"" + a + "\"";
+    STARTUPINFOA start{};
+    start.cb = sizeof start;
+    PROCESS_INFORMATION process{};
+    if (!CreateProcessA(nullptr, line.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &start,
+                        &process))
+      throw RunTimeError(kFileNotFound);
+    while (WaitForSingleObject(process.hProcess, 20) == WAIT_TIMEOUT)
+      if (idle) idle();
+    DWORD code = 0;
+    GetExitCodeProcess(process.hProcess, &code);
+    CloseHandle(process.hThread);
+    CloseHandle(process.hProcess);
+    return int(code);
+  }
+#else
+  int RunAndWait(const std::string& program, const std::vector<std::string>& arguments,
+                 const std::function<void()>& idle) override {
+    std::vector<char*> argv;
+    argv.push_back(const_cast<char*>(program.c_str()));
+    for (const std::string& a : arguments) argv.push_back(const_cast<char*>(a.c_str()));
+    argv.push_back(nullptr);
+    pid_t pid = 0;
+    if (::posix_spawn(&pid, program.c_str(), nullptr, nullptr, argv.data(), environ) != 0)
+      throw RunTimeError(kFileNotFound);
+    int status = 0;
+    for (;;) {
+      const pid_t got = ::waitpid(pid, &status, idle ? WNOHANG : 0);
+      if (got == pid) break;
+      if (got < 0 && errno != EINTR) throw RunTimeError(kDeviceError);
+      if (got == 0) {
+        idle();
+        const timespec pause{0, 20 * 1000 * 1000};
+        ::nanosleep(&pause, nullptr);
+      }
+    }
+    return WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
+  }
+#endif
+};
+
+}  // namespace
+
+Processes& MachineProcesses() {
+  static HostProcesses processes;
+  return processes;
+}
+
+}  // namespace kora

@@ -1,0 +1,47 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "store/price_rec.h"
+
+namespace kora {
+
+struct ChartBar {
+  char Date[8];            // "yyyymmdd", NULs where the rules leave it blank
+  float Open, High, Low, Close;
+  std::int32_t Volume;     // of monthly bars in hundreds
+  std::int32_t SourceRec;  // record with an adjustment, 0 none
+
+  std::string_view date() const { return Date[0] ? std::string_view(Date, 8) : std::string_view(); }
+};
+
+// The bars of the chart on show and the figures that its scales are set from.
+struct ChartBars {
+  std::vector<ChartBar> bars;        // 0 to BarCount; a late flush may leave spare bars behind
+  std::int16_t FirstDataRec = 0;     // first record to load, at least 1
+  std::int16_t LastDataRec = 0;      // last record to load
+  std::int16_t BarCount = 0;         // highest index in use
+  float ChartHigh = 0;               // -100000 when nothing counted
+  float ChartLow = 0;                // lowest non-zero Low; 100000 when nothing counted
+  std::int32_t VolMax = 0, VolMin = 0, VolAvg = 0;  // of the non-zero volumes
+  bool VolumeShown = false;
+  std::int16_t CurrentDataRec = 0;   // the record being read, for messages; 0 none
+
+  const ChartBar& operator[](size_t i) const { return bars[i]; }
+  ChartBar& operator[](size_t i) { return bars[i]; }
+};
+
+// Loads records FirstDataRec to LastDataRec of `file` as days ("A"), weeks ("W") or months
+// ("M"). `volumeOption` is the user's request for volume, `recType` that of the name record.
+//
+// Weekly and monthly: a week ends where the weekday falls, a month where the month key grows.
+//
+// Errors: 63 for a slice outside the file, 5 for a weekly record whose date is no calendar
+// date (CurrentDataRec tells which), 6 where a volume leaves 32 bits.
+void LoadChartBars(const PriceFile& file, std::string_view chartPeriod, bool volumeOption,
+                   std::int16_t recType, ChartBars& out);
+
+}  // namespace kora

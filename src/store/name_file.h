@@ -1,0 +1,91 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <span>
+#include <string>
+#include <vector>
+
+#include "base/files.h"
+#include "base/record_file.h"
+#include "store/name_rec.h"
+
+namespace kora {
+
+class Dialogs;
+
+using NameFile = RecordFile<NameRec>;
+
+// Names.dat of a data folder. It is opened for each operation and closed at once.
+std::string NameFilePath(const std::string& dataPath);
+
+// All records, read in one run; empty when the file is not there.
+std::vector<NameRec> ReadNames(const Files& files, const std::string& dataPath);
+
+// The number of the first record whose six code bytes equal `paddedCode` (six characters,
+// compared as given), or 0. Reads the file in runs.
+std::int16_t FindCode(const NameFile& names, std::string_view paddedCode, NameRec& found);
+
+struct NameAndClass {
+  std::string Name;      // trimmed
+  std::string IndClass;  // trimmed
+};
+// For a title at chart time: the first record whose Code equals the given six bytes, compared
+// as given, so that lower case finds nothing. `record` is filled when found; both texts are
+// empty when not, or when there is no file.
+NameAndClass FindNameByCode(const Files& files, const std::string& dataPath,
+                            std::string_view code, NameRec& record);
+
+// The security that stands for every chart routine.
+struct CurrentName {
+  NameRec Rec{};                 // NameRec
+  std::int16_t NameRecNo = 0;    // record last found
+  std::int16_t NameCount = 0;    // records in the file at the last open
+  std::string CurrentCode;
+  std::string CurrentDataFile;   // full DOS path of the price file, empty when not found
+};
+
+// Pads and upper-cases CurrentCode, finds its record and sets CurrentDataFile to data folder +
+// code + ".WDT". Not found: the message "No File For That Name" and an empty CurrentDataFile.
+// Also returns whether it was found. Errors 53, 75, 76 when Names.dat can't be opened.
+bool LocateCurrentCode(const Files& files, const std::string& dataPath, Dialogs& dialogs,
+                       CurrentName& current);
+
+enum class NameSort {
+  kCategory,  // Category "000", RecType, Code: the order after a save
+  kCode,
+  kIndClass,  // IndClass, then Code
+};
+
+// Sorts record numbers by their 12-character keys: a Shell sort whose equal keys may change
+// places, which is why it is this one and no other.
+struct SortEntry {
+  std::int32_t RecNo;
+  std::string Key;
+};
+void ShellSort(std::vector<SortEntry>& items);
+std::string SortKey(const NameRec& record, NameSort mode);
+
+// Sorts the file, dropping records with NameStatus 1. With fewer than two records the file is
+// left as it is. Works over TEMP.WK1 and renames it to Names.DAT; a failure leaves the old file.
+void SortNameFile(const Files& files, const std::string& dataPath, NameSort mode);
+
+// The editor's sort of its own copy: Temp.Wk2 by way of Temp.Wk1.
+void SortEditorCopy(const Files& files, const std::string& dataPath, NameSort mode);
+
+// What is wrong with a row of the editor, or nothing.
+struct RowFault {
+  size_t row;           // from 0
+  std::string message;  // "Code must be entered", "Record Type must be entered"
+};
+// Checks the rows as the editor does before a save and resets a Category outside 0 to 99 to 0.
+// A row that is blank altogether has no fault.
+std::optional<RowFault> CheckRows(std::span<NameRec> rows);
+
+// Saves the editor's rows: names.bak is taken from names.DAT, the file made anew with
+// NameStatus 0, rows with a blank code left out, then sorted by category. Messages as they
+// come; a failing write brings names.DAT back from names.bak. True when saved.
+bool SaveNames(const Files& files, const std::string& dataPath, std::span<const NameRec> rows,
+               Dialogs& dialogs);
+
+}  // namespace kora
