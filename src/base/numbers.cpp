@@ -114,6 +114,14 @@ double Divide(double a, double b) {
   return a / b;
 }
 
+std::optional<float> ParseFloat(std::string_view text) {
+  float value = 0;
+  const char* end = text.data() + text.size();
+  const auto r = std::from_chars(text.data(), end, value);
+  if (r.ec != std::errc() || r.ptr != end || !std::isfinite(value)) return std::nullopt;
+  return value;
+}
+
 double Val(std::string_view text) {
   size_t i = 0;
   while (i < text.size() && (text[i] == ' ' || text[i] == '\t')) ++i;
