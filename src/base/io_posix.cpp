@@ -1,4 +1,5 @@
 #include <cerrno>
+#include <chrono>
 #include <cstring>
 #include <dirent.h>
 #include <fcntl.h>
@@ -154,6 +155,12 @@ class PosixIo : public Io {
 };
 
 }  // namespace
+
+bool TimeIsSettled(std::int64_t modified) {
+  using namespace std::chrono;
+  const auto now = duration_cast<nanoseconds>(system_clock::now().time_since_epoch()).count();
+  return modified < now - 2500000000;
+}
 
 Io& MachineIo() {
   static PosixIo io;
