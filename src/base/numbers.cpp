@@ -134,7 +134,8 @@ double Val(std::string_view text) {
     while (i < text.size() && IsDigit(text[i])) ++i;
   }
   // from_chars knows no leading plus.
-  const size_t first = text[start < text.size() ? start : 0] == '+' ? digits : start;
+  if (digits == i) return 0;
+  const size_t first = text[start] == '+' ? digits : start;
   double value = 0;
   const auto result =
       std::from_chars(text.data() + first, text.data() + i, value, std::chars_format::fixed);
