@@ -1,7 +1,9 @@
 #include <memory>
 
 #include "base/text.h"
+#include "koractl/options.h"
 #include "koractl/run.h"
+#include "koractl/table.h"
 #include "update/import_history.h"
 
 namespace kora {
@@ -37,9 +39,9 @@ int Import(const CommandLine& line, const std::vector<std::string>& sources,
       progress->Step(++done, int(sources.size()));
     }
   }
-  std::printf("%zu securities, %lld rows added, %lld replaced, %lld refused\n",
-              counts.Codes.size(), static_cast<long long>(counts.Added),
-              static_cast<long long>(counts.Replaced), static_cast<long long>(counts.Refused));
+  WriteOut(std::to_string(counts.Codes.size()) + " securities, " + std::to_string(counts.Added) +
+           " rows added, " + std::to_string(counts.Replaced) + " replaced, " +
+           std::to_string(counts.Refused) + " refused\n");
   return all ? kDone : kAbandoned;
 }
 
@@ -50,14 +52,9 @@ void AddImport(CLI::App& app, CommandLine& line) {
   const auto options = std::make_shared<ImportOptions>();
   CLI::App* command = app.add_subcommand("import", "Take price history from text files");
   command->add_option("FILE", *files, "Text files of prices")->required();
-  command->add_option("--dates", options->Dates, "Form of the dates (default: told by their shape)")
-      ->type_name("yyyymmdd|yyyy-mm-dd|d/m/yyyy")
-      ->transform(CLI::CheckedTransformer(
-                      std::map<std::string, ImportDates>{{"yyyymmdd", ImportDates::kCompact},
-                                                         {"yyyy-mm-dd", ImportDates::kDashed},
-                                                         {"d/m/yyyy", ImportDates::kSlashed}},
-                      CLI::ignore_case)
-                      .description(""));
+  const auto dates = std::make_shared<std::string>();
+  AddChoice(*command, "--dates", *dates, {"yyyymmdd", "yyyy-mm-dd", "d/m/yyyy"},
+            "Form of the dates (default: the first two, told by their shape)");
   command->add_option("--code", options->Code, "Code of the security (default: the code in the "
                                                "file, else the file's name)");
   command->add_option("--type", options->Type,
@@ -66,7 +63,10 @@ void AddImport(CLI::App& app, CommandLine& line) {
       ->check(CLI::Range(1, 5));
   command->add_option("--name", options->Name, "Name of a new security");
   command->add_flag("--skip-bad", options->SkipBad, "Leave out rows that can't be read");
-  command->callback([&line, files, options] {
+  command->callback([&line, files, dates, options] {
+    if (*dates == "yyyymmdd") options->Dates = ImportDates::kCompact;
+    if (*dates == "yyyy-mm-dd") options->Dates = ImportDates::kDashed;
+    if (*dates == "d/m/yyyy") options->Dates = ImportDates::kSlashed;
     line.run = [&line, files, options] { return Import(line, *files, *options); };
   });
 }

@@ -11,11 +11,9 @@ int Init(const CommandLine& line) {
     run.Abandon("There is an installation in " + session.files.home() + " already.", "KORA");
   Paths paths;
   SetDefaultPaths(paths, "C:");
-  for (const std::string& folder : {paths.WindowsPath.empty() ? std::string("C:\\WINDOWS\\")
-                                                              : paths.WindowsPath,
-                                    paths.SystemPath, paths.CurrentDataPath,
-                                    paths.ChartBackupPath, paths.SystemPath + "chtmisc\\",
-                                    paths.SystemPath + "chtsave\\"})
+  for (const std::string& folder :
+       {paths.SystemPath, paths.CurrentDataPath, paths.ChartBackupPath, paths.PfmDataPath,
+        paths.PfmBackupPath, paths.SystemPath + "download\\"})
     session.files.MakeFolder(folder);
   // What a broken-off or hand-made installation left is never emptied.
   session.files.Open(NameFilePath(paths.CurrentDataPath), OpenMode::kCreate);
@@ -24,6 +22,7 @@ int Init(const CommandLine& line) {
   WriteDefaultSettings(session.ini);
   if (!session.ini.Exists())
     throw RunTimeError(kPathAccess, "Kora.ini can't be written in " + session.files.home());
+  run.Open();  // makes the folders of saved charts and notes
   return kDone;
 }
 

@@ -3,6 +3,7 @@
 
 #include "base/runtime_error.h"
 #include "koractl/command.h"
+#include "koractl/options.h"
 
 using namespace kora;
 
@@ -32,14 +33,9 @@ int main(int argc, char** argv) {
       ->type_name("SECTION.KEY=VALUE")
       ->expected(1)
       ->take_all();
-  app.add_option("--answer", line.answer, "Answer to every question that offers it")
-      ->type_name("yes|no|ok|cancel")
-      ->transform(CLI::CheckedTransformer(std::map<std::string, Answer>{{"yes", Answer::kYes},
-                                                                        {"no", Answer::kNo},
-                                                                        {"ok", Answer::kOk},
-                                                                        {"cancel", Answer::kCancel}},
-                                          CLI::ignore_case)
-                      .description(""));
+  std::string answer;
+  AddChoice(app, "--answer", answer, {"yes", "no", "ok", "cancel"},
+            "Answer to every question that offers it");
   for (const auto add : {AddInit, AddDemo, AddNames, AddFind, AddPrices, AddBars, AddScale,
                          AddChart, AddImport})
     add(app, line);
@@ -51,6 +47,10 @@ int main(int argc, char** argv) {
   } catch (const CLI::ParseError& e) {
     return Usage(app, e.what());
   }
+  if (answer == "yes") line.answer = Answer::kYes;
+  if (answer == "no") line.answer = Answer::kNo;
+  if (answer == "ok") line.answer = Answer::kOk;
+  if (answer == "cancel") line.answer = Answer::kCancel;
   try {
     return line.run();
   } catch (const Abandoned&) {

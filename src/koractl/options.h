@@ -13,10 +13,9 @@ inline CLI::Option* AddChoice(CLI::App& command, const std::string& name, std::s
                               const std::vector<std::string>& words, const std::string& about) {
   std::string shown;
   for (const std::string& word : words) shown += (shown.empty() ? "" : "|") + word;
-  return command.add_option(name, value, about)
-      ->type_name(shown)
-      ->capture_default_str()
-      ->transform(CLI::IsMember(words, CLI::ignore_case).description(""));
+  CLI::Option* option = command.add_option(name, value, about)->type_name(shown);
+  if (!value.empty()) option->capture_default_str();
+  return option->transform(CLI::IsMember(words, CLI::ignore_case).description(""));
 }
 
 inline void AddPeriod(CLI::App& command, std::string& value) {
