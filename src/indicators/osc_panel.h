@@ -28,7 +28,7 @@ struct OscHost {
   Surface& panel;               // the oscillator picture
   ChartScript* script = nullptr;  // null or suppressed: drawn only
 
-  std::string OscCode;             // "STO", "FX", "R/F", "ROC", ...
+  std::string OscCode = {};        // "STO", "FX", "R/F", "ROC", ...
   std::string OscCaller = "CHTS";  // "ANAL" for the multi-oscillator view
   bool SlowStochastic = false;
   bool AnalPageMode = false;       // panels stacked in the multi-oscillator view
