@@ -10,7 +10,9 @@ function(kora_library name)
   add_library(${name} STATIC ${sources})
   # A folder's headers are reached as "folder/header.h" through a tree of links, one root a
   # library, so that a library's own dependencies are all that it can include.
-  file(RELATIVE_PATH place ${CMAKE_SOURCE_DIR}/src ${CMAKE_CURRENT_SOURCE_DIR})
+  # Folders of src/ are named without it, a folder beside it by its own name.
+  file(RELATIVE_PATH place ${CMAKE_SOURCE_DIR} ${CMAKE_CURRENT_SOURCE_DIR})
+  string(REGEX REPLACE "^src/" "" place ${place})
   set(root ${CMAKE_BINARY_DIR}/include/${name})
   get_filename_component(parent ${root}/${place} DIRECTORY)
   file(MAKE_DIRECTORY ${parent})
