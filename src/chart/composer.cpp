@@ -453,7 +453,9 @@ void Composer::DrawEnd() {
     DrawFixedGrid(canvas_);
   }
   DrawEndTexts();
-  if (whole) DrawAverages();
+  if (!whole) return;
+  DrawAverages();
+  for (const auto& overlay : services_.overlays) overlay(canvas_);
 }
 
 void Composer::DrawEndTexts() {

@@ -28,6 +28,12 @@ bool CanBeFace(const SurfaceFont& font) {
   });
 }
 
+// 96 dots to the inch, so that a point is 96/72 units.
+void SetDots(QImage& image) {
+  image.setDotsPerMeterX(3780);
+  image.setDotsPerMeterY(3780);
+}
+
 QString ToQt(std::string_view text) {
   return QString::fromUtf8(text.data(), qsizetype(text.size()));
 }
@@ -88,17 +94,12 @@ QtSurface::Face& QtSurface::face() const {
   font.setItalic(font_.italic);
   font.setKerning(false);
   font.setPointSizeF(font_.size);
-  if (made->standard) {
-    made->ascent = StandardAscent(font_);
-    made->height = StandardTextHeight(font_);
-  } else {
-    QImage inch(1, 1, QImage::Format_RGB32);
-    inch.setDotsPerMeterX(3780);
-    inch.setDotsPerMeterY(3780);
-    const QFontMetricsF metrics(font, &inch);
-    made->ascent = metrics.ascent();
-    made->height = std::ceil(metrics.height());
-  }
+  QImage dots(1, 1, QImage::Format_RGB32);
+  SetDots(dots);
+  const QFontMetricsF metrics(font, &dots);
+  made->qtAscent = metrics.ascent();
+  made->ascent = made->standard ? StandardAscent(font_) : metrics.ascent();
+  made->height = made->standard ? StandardTextHeight(font_) : std::ceil(metrics.height());
   faces_.push_back(std::move(made));
   return *(face_ = faces_.back().get());
 }
@@ -106,10 +107,9 @@ QtSurface::Face& QtSurface::face() const {
 double QtSurface::TextWidth(std::string_view text) const {
   const Face& f = face();
   if (f.standard) return RoundHalfEven(StandardTextWidth(text, font_));
-  QImage inch(1, 1, QImage::Format_RGB32);
-  inch.setDotsPerMeterX(3780);
-  inch.setDotsPerMeterY(3780);
-  return RoundHalfEven(QFontMetricsF(f.font, &inch).horizontalAdvance(ToQt(text)));
+  QImage dots(1, 1, QImage::Format_RGB32);
+  SetDots(dots);
+  return RoundHalfEven(QFontMetricsF(f.font, &dots).horizontalAdvance(ToQt(text)));
 }
 
 double QtSurface::TextHeight() const { return face().height; }
@@ -130,23 +130,6 @@ void QtSurface::Print(std::string_view text) {
   y_ += f.height;
 }
 
-void QtSurface::SetText(QPainter& painter, Face& face, double x, double y,
-                        const std::string& text) {
-  painter.setFont(face.font);
-  if (face.texts.size() >= kTextsKept) face.texts.clear();
-  const auto [place, added] = face.texts.try_emplace(text);
-  QStaticText& laid = place->second;
-  if (added) {
-    laid.setTextFormat(Qt::PlainText);
-    laid.setPerformanceHint(QStaticText::AggressiveCaching);
-    laid.setText(ToQt(text));
-    laid.prepare(painter.transform(), face.font);
-  }
-  // A static text hangs from Qt's ascent, which is not the face's own to the fraction.
-  const double top = face.ascent - QFontMetricsF(face.font, painter.device()).ascent();
-  painter.drawStaticText(QPointF(x, y + top), laid);
-}
-
 // ---- raster
 
 QtRasterSurface::QtRasterSurface(double width, double height, double dpr)
@@ -165,8 +148,7 @@ void QtRasterSurface::Allocate() {
   pixels_.assign(size_t(pixelsX_) * size_t(pixelsY_), back_);
   image_ = QImage(reinterpret_cast<uchar*>(pixels_.data()), pixelsX_, pixelsY_,
                   qsizetype(pixelsX_) * 4, QImage::Format_RGB32);
-  image_.setDotsPerMeterX(3780);  // 96 to the inch, so that points are 96/72 units
-  image_.setDotsPerMeterY(3780);
+  SetDots(image_);
   image_.setDevicePixelRatio(dpr_);
 }
 
@@ -343,7 +325,16 @@ void QtRasterSurface::DrawText(Face& face, double x, double y, const std::string
     painter_.setRenderHint(QPainter::TextAntialiasing);
   }
   painter_.setPen(QColor(fore_));
-  SetText(painter_, face, x, y, text);
+  painter_.setFont(face.font);
+  if (face.texts.size() >= kTextsKept) face.texts.clear();
+  const auto [place, added] = face.texts.try_emplace(text);
+  QStaticText& laid = place->second;
+  if (added) {
+    laid.setTextFormat(Qt::PlainText);
+    laid.setText(ToQt(text));
+    laid.prepare(painter_.transform(), face.font);
+  }
+  painter_.drawStaticText(QPointF(x, y + face.ascent - face.qtAscent), laid);
 }
 
 // ---- any painter

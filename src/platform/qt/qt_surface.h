@@ -57,7 +57,8 @@ class QtSurface : public Surface {
     SurfaceFont key;
     QFont font;
     bool standard = true;
-    double ascent = 0;
+    double ascent = 0;      // of the line; `qtAscent` is what Qt hangs the text from
+    double qtAscent = 0;
     double height = 0;
     std::unordered_map<std::string, QStaticText> texts;
   };
@@ -75,8 +76,6 @@ class QtSurface : public Surface {
 
   // `x`, `y`: upper left corner of the text in units.
   virtual void DrawText(Face& face, double x, double y, const std::string& text) = 0;
-  // Draws with `painter`, of whose units `dpi` make an inch for fonts.
-  static void SetText(QPainter& painter, Face& face, double x, double y, const std::string& text);
   Face& face() const;
 
   double width_, height_;
