@@ -9,9 +9,9 @@ mkdir -p "$folder"
 closes() {
   "$koractl" --home "$home" names | awk -F'\t' '$4 == 4 && length($3) <= 4 { print $3 }' |
     while read -r code; do
-      close="$("$koractl" --home "$home" prices "$code" 2>/dev/null |
-        awk -F'\t' 'NR > 1 && $6 > 0 { close = $6 } END { print close }')" || continue
-      [[ -z "$close" ]] || printf '%s\t%s\n' "$close" "$code"
+      last="$("$koractl" --home "$home" prices "$code" 2>/dev/null |
+        awk -F'\t' 'NR > 1 && $6 > 0 { last = $6 } END { print last }')" || continue
+      [[ -z "$last" ]] || printf '%s\t%s\n' "$last" "$code"
     done | sort -g
 }
 shares="$(closes)"
