@@ -34,7 +34,7 @@ TEST(CurrencyTest, LeavingTheRangeIsError6) {
   EXPECT_EQ(ErrorOf([] { Currency(922337203685478.0); }), 6);
   EXPECT_EQ(ErrorOf([] { Currency(-922337203685479.0); }), 6);
   EXPECT_EQ(ErrorOf([] { Currency(std::nan("")); }), 6);
-  EXPECT_EQ(ErrorOf([] { Currency(HUGE_VAL); }), 6);
+  EXPECT_EQ(ErrorOf([] { Currency{HUGE_VAL}; }), 6);
 }
 
 TEST(CurrencyTest, SumOutOfRangeIsError6AndLeavesTheSum) {
