@@ -55,24 +55,26 @@ class Loader {
   void Day(const PriceRec& rec, std::int32_t number) {
     const std::ptrdiff_t index = next_ - bars_;
     ChartBar& bar = *next_++;
+    const float high = rec.High, low = rec.Low, close = rec.Close;
+    std::int32_t volume = rec.Volume;
     // A bar index is held against a record number here: in a slice that starts late in the
     // file the first days without a close stay as they are.
-    if (rec.Close == 0 && index > firstDataRec_) {
+    if (close == 0 && index > firstDataRec_) {
       std::memset(bar.Date, 0, sizeof bar.Date);
       bar.Open = bar.High = bar.Low = bar.Close = previousClose_;
-      bar.Volume = 0;
+      bar.Volume = volume = 0;
     } else {
       static_assert(offsetof(ChartBar, SourceRec) == offsetof(PriceRec, AdjFactor));
       std::memcpy(&bar, &rec, offsetof(ChartBar, SourceRec));  // Date to Volume, as they stand
+      if (high == 0 && HasRange()) bar.Open = bar.High = bar.Low = close;
+      previousClose_ = close;
     }
     bar.SourceRec = rec.AdjFactor != 0 ? number : 0;
-    previousClose_ = bar.Close;
-    if (bar.High == 0 && HasRange()) bar.Open = bar.High = bar.Low = bar.Close;
 
     const bool closeOnly = recType_ == kAdvanceDecline;
-    RaiseHigh(rec.High == 0 || closeOnly ? rec.Close : rec.High);
-    LowerLow(rec.Low == 0 || closeOnly ? rec.Close : rec.Low);
-    CountVolume(bar.Volume);
+    RaiseHigh(high == 0 || closeOnly ? close : high);
+    LowerLow(low == 0 || closeOnly ? close : low);
+    CountVolume(volume);
   }
 
   void Week(const PriceRec& rec, std::int32_t number) {
@@ -116,8 +118,10 @@ class Loader {
   }
 
  private:
+  static constexpr float kNoLow = 100000;
+
   struct Period {
-    float Open = 0, High = 0, Low = 100000, Close = 0;
+    float Open = 0, High = 0, Low = kNoLow, Close = 0;
     float LastGoodClose = 0;
     std::int64_t Volume = 0;
     std::int32_t Source = 0;
@@ -172,7 +176,7 @@ class Loader {
     } else {
       bar.Open = period_.Open != 0 ? period_.Open : period_.LastGoodClose;
       bar.High = period_.High != 0 ? period_.High : period_.LastGoodClose;
-      bar.Low = period_.Low;  // never 0: it starts at 100000
+      bar.Low = period_.Low;  // never 0: it starts at kNoLow
       bar.Close = period_.LastGoodClose;
     }
     if (period_.Volume < std::numeric_limits<std::int32_t>::min() ||
@@ -184,7 +188,12 @@ class Loader {
     RaiseHigh(bar.High);
     LowerLow(bar.Low);
     CountVolume(bar.Volume);
-    period_ = Period();
+    // Field by field: a copy of the whole waits for the small writes before it.
+    period_.Open = period_.High = period_.Close = period_.LastGoodClose = 0;
+    period_.Low = kNoLow;
+    period_.Volume = 0;
+    period_.Source = 0;
+    period_.HasData = false;
   }
 
   void CountVolume(std::int32_t volume) {
