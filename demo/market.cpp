@@ -74,7 +74,7 @@ struct TierFigures {
   double low, high;                   // prices that the share keeps to, roughly
 };
 constexpr TierFigures kTiers[] = {
-    {0.010, 1.00, 4.0e7, 0, 4.0, 48.0},
+    {0.010, 1.00, 4.0e7, 0, 4.0, 70.0},
     {0.015, 0.90, 3.0e6, 0.001, 0.8, 20.0},
     {0.023, 0.80, 3.0e5, 0.02, 0.12, 4.0},
     {0.038, 0.70, 4.0e4, 0.10, 0.008, 0.20},
@@ -161,7 +161,7 @@ Factors MakeFactors(const Days& days, std::uint64_t seed) {
     }
     // Long histories neither vanish nor reach the sky.
     trend *= 1.00025;
-    const double pull = Hold(0.0004 * (trend / level - 1), -0.0005, 0.0005);
+    const double pull = Hold(0.001 * (trend / level - 1), -0.0012, 0.0012);
     const double noise = cluster.Next(kRegimes[mood].volatility, random);
     const double move = Hold(kRegimes[mood].drift + pull + noise, -0.12, 0.10);
     level *= 1 + move;
@@ -170,14 +170,16 @@ Factors MakeFactors(const Days& days, std::uint64_t seed) {
   for (int s = 0; s < kSectors; ++s) {
     Random own(seed, 10 + std::uint64_t(s));
     Clustered clusters;
-    double drift = 0;
+    double drift = 0, relative = 1;
     int stay = 0;
     for (int day = 0; day < days.count(); ++day) {
       if (stay-- <= 0) {
         stay = 40 + own.Below(160);
         drift = own.Noise() * 0.0004;
       }
-      factors.sector[size_t(s)].push_back(drift + clusters.Next(0.006, own));
+      const double move = drift + 0.002 * (1 / relative - 1) + clusters.Next(0.006, own);
+      relative *= 1 + move;
+      factors.sector[size_t(s)].push_back(move);
     }
   }
   return factors;
@@ -213,7 +215,7 @@ ShareProfile MakeProfile(int index, int shares, const Days& days, Random& random
 
   // Most begin in the lower part of their range.
   const double place = random.Unit();
-  share.startPrice = figures.low + (figures.high - figures.low) * (0.1 + 0.5 * place * place);
+  share.startPrice = figures.low + (figures.high - figures.low) * (0.05 + 0.4 * place * place);
   share.issued = figures.turnover * random.Between(150, 500) / share.startPrice;
   return share;
 }
