@@ -40,7 +40,7 @@ struct DownloadSettings {
 // Section Charts.
 struct ChartSettings {
   std::string Type;         // last ChartStyle, "unknown" when never kept
-  std::string Period;
+  std::string Period;       // the same
   std::int16_t Spacing = 0;
   std::int16_t Bands = 0;
   std::string AutoOsc;
@@ -152,8 +152,9 @@ bool SettingBool(const std::string& text, bool whenOther = false);  // "True" in
 // Reads the command-line words ("RM", "A", "N", "XT", "XS", in any case, blanks between).
 CommandWords ParseCommandWords(std::string_view commandLine);
 
-// Reads all keys into `settings`. Where System is "unknown" FindSystemDrive runs first.
-// False when the user gave up there, which ends the program.
+// Reads all keys into `settings`. Where System is "unknown" FindSystemDrive runs, last, since
+// it saves what was read. False when the user gave up there, which ends the program. Other
+// folders that were never kept are those of SetDefaultPaths on the drive of System.
 bool ReadPaths(SettingsFile& file, const Files& files, Dialogs& dialogs, Settings& settings);
 
 // Writes the folders, DataService, DLPath and the drive.

@@ -58,7 +58,7 @@ const char* ColourRoleName(int entry);
 
 // Sets 0 to 15 from the standard colours and the rest from the file of the variant ("Black",
 // "White", "Blue": Koraclr.BLK, .WHT, .BLU in `systemPath`), entries 0 to 48; where that file
-// is missing, the default roles.
+// is missing, the default roles. Entries 49 and 50 stay.
 void LoadColours(const Files& files, const std::string& systemPath, std::string_view variant,
                  ChartColours& colours);
 

@@ -19,7 +19,8 @@ using NameFile = RecordFile<NameRec>;
 // Names.dat of a data folder. It is opened for each operation and closed at once.
 std::string NameFilePath(const std::string& dataPath);
 
-// All records, read in one run; empty when the file is not there.
+// All records, read in one run; empty when the file is not there. Error 6, here and in every
+// look-up, when the file has more records than a 16-bit number can name.
 std::vector<NameRec> ReadNames(const Files& files, const std::string& dataPath);
 
 // The number of the first record whose six code bytes equal `paddedCode` (six characters,
@@ -27,7 +28,7 @@ std::vector<NameRec> ReadNames(const Files& files, const std::string& dataPath);
 std::int16_t FindCode(const NameFile& names, std::string_view paddedCode, NameRec& found);
 
 struct NameAndClass {
-  std::string Name;      // trimmed
+  std::string Name;      // trimmed, UTF-8
   std::string IndClass;  // trimmed
 };
 // For a title at chart time: the first record whose Code equals the given six bytes, compared
@@ -46,7 +47,8 @@ struct CurrentName {
 };
 
 // Pads and upper-cases CurrentCode, finds its record and sets CurrentDataFile to data folder +
-// code + ".WDT". Not found: the message "No File For That Name" and an empty CurrentDataFile.
+// code + ".WDT". Not found, or a code that can name no file (IsFileCode): the message "No File
+// For That Name" and an empty CurrentDataFile; the record last found stays.
 // Also returns whether it was found. Errors 53, 75, 76 when Names.dat can't be opened.
 bool LocateCurrentCode(const Files& files, const std::string& dataPath, Dialogs& dialogs,
                        CurrentName& current);
@@ -83,8 +85,8 @@ struct RowFault {
 std::optional<RowFault> CheckRows(std::span<NameRec> rows);
 
 // Saves the editor's rows: names.bak is taken from names.DAT, the file made anew with
-// NameStatus 0, rows with a blank code left out, then sorted by category. Messages as they
-// come; a failing write brings names.DAT back from names.bak. True when saved.
+// NameStatus 0 and MinMove 0.05, rows with a blank code left out, sorted by category. Messages
+// as they come; a failing write leaves the old names.DAT. True when saved.
 bool SaveNames(const Files& files, const std::string& dataPath, std::span<const NameRec> rows,
                Dialogs& dialogs);
 
