@@ -346,21 +346,19 @@ void MarketSums::AddDay(Sums& sums, int day, double units, const PriceRec& last,
 }
 
 void MarketSums::Add(const ShareProfile& share, const Series& series) {
+  // The prices are in the newest terms, so the shares on issue have to be.
+  double issued = share.issued;
+  for (const PriceRec& rec : series.records)
+    if (rec.AdjFactor != 0) issued /= double(rec.AdjFactor);
   for (size_t i = 1; i < series.records.size(); ++i) {
     const PriceRec& last = series.records[i - 1];
     const PriceRec& now = series.records[i];
     const int day = series.first + int(i);
-    AddDay(all_, day, share.issued, last, now);
-    AddDay(sectors_[size_t(share.sector)], day, share.issued, last, now);
+    AddDay(all_, day, issued, last, now);
+    AddDay(sectors_[size_t(share.sector)], day, issued, last, now);
     if (now.Close > last.Close) ++rises_[size_t(day)];
     if (now.Close < last.Close) ++falls_[size_t(day)];
   }
-}
-
-bool MarketSums::HasFullHistory(int sector) const {
-  const std::vector<double>& before = sectors_[size_t(sector)].before;
-  return before.size() > 1 && std::all_of(before.begin() + 1, before.end(),
-                                          [](double sum) { return sum > 0; });
 }
 
 Series MarketSums::Index(int sector, const Days& days) const {
@@ -383,8 +381,8 @@ Series MarketSums::MakeIndex(const Sums& sums, const Days& days) const {
     const double top = std::max(open, close), bottom = std::min(open, close);
     PriceRec rec = NewPriceRec(days.texts[d]);
     rec.Open = tenths(open);
-    rec.High = tenths(top + 0.4 * (sums.high[d] * scale - top));
-    rec.Low = tenths(bottom - 0.4 * (bottom - sums.low[d] * scale));
+    rec.High = tenths(top + 0.4 * std::max(0.0, sums.high[d] * scale - top));
+    rec.Low = tenths(bottom - 0.4 * std::max(0.0, bottom - sums.low[d] * scale));
     rec.Close = tenths(close);
     rec.Volume = ToVolume(sums.volume[d] / 1000);
     series.records.push_back(rec);
