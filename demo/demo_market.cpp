@@ -232,8 +232,9 @@ NameRec DemoWriter::ShareRecord(int index, const ShareProfile& share,
   const int upTo = std::min(series.last(), days_.history - 1) - series.first;
   float low = series.records[size_t(upTo)].Close, high = low;
   for (int i = std::max(0, upTo - 250); i <= upTo; ++i) {
-    low = std::min(low, series.records[size_t(i)].Close);
-    high = std::max(high, series.records[size_t(i)].Close);
+    const float close = series.records[size_t(i)].Close;
+    low = std::min(low, close);
+    high = std::max(high, close);
   }
   if (index % 5 == 1) {
     rec.Base = FromThousandths(ToThousandths(double(low) * 0.85));

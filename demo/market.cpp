@@ -118,9 +118,16 @@ Adjustment MakeAdjustment(Planned kind, int close, Random& random) {
 void Apply(const Adjustment& adjustment, std::vector<PriceRec>& records) {
   records[adjustment.record].AdjFactor = adjustment.factor;
   records[adjustment.record].AdjDesc.set(adjustment.text);
-  for (size_t i = 0; i <= adjustment.record; ++i)
-    for (float* price : {&records[i].Open, &records[i].High, &records[i].Low, &records[i].Close})
-      *price = float(Currency(double(*price) * double(adjustment.factor)).ToDouble());
+  const auto scaled = [&adjustment](float price) {
+    return float(Currency(double(price) * double(adjustment.factor)).ToDouble());
+  };
+  for (size_t i = 0; i <= adjustment.record; ++i) {
+    PriceRec& rec = records[i];
+    rec.Open = scaled(rec.Open);
+    rec.High = scaled(rec.High);
+    rec.Low = scaled(rec.Low);
+    rec.Close = scaled(rec.Close);
+  }
 }
 
 }  // namespace
