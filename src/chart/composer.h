@@ -1,6 +1,8 @@
 #pragma once
 
+#include <functional>
 #include <string>
+#include <vector>
 
 #include "chart/chart_request.h"
 #include "chart/chart_script.h"
@@ -12,6 +14,8 @@
 
 namespace kora {
 
+struct ChartCanvas;
+
 // The services and standing values that every chart is made with.
 struct ChartServices {
   const Files& files;
@@ -22,6 +26,8 @@ struct ChartServices {
   Surface& price;              // the price picture
   Surface* panel = nullptr;    // the oscillator picture below it; may be hidden
   ChartScript* script = nullptr;
+  // Drawn over the finished price chart, in this order: bands, multiple averages, trendlines.
+  std::vector<std::function<void(const ChartCanvas&)>> overlays = {};
 };
 
 // Turns one security and the chart options into a chart on `services.price` and, unless the

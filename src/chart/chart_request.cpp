@@ -1,0 +1,38 @@
+#include "chart/chart_request.h"
+
+namespace kora {
+
+ChartRequest RequestFromSettings(const Settings& settings) {
+  const ChartSettings& c = settings.charts;
+  ChartRequest request;
+  if (c.Type.size() == 1 && std::string_view("BCLP").find(c.Type[0]) != std::string_view::npos)
+    request.ChartStyle = c.Type[0];
+  if (c.Period == "A" || c.Period == "W" || c.Period == "M") request.ChartPeriod = c.Period;
+  request.BarSpacing = c.Spacing;
+  request.BlankSpace = c.BlankSpace;
+  request.WeekFactor = c.WeekFactor;
+  request.VolHeight = c.VolHeight;
+  request.CutVols = settings.osc.CutVols;
+  request.AutoScale = c.ScMethod;
+  request.LogBars = settings.osc.BCCalTp;
+  request.LogLines = settings.osc.LCalTp;
+  request.LogVolume = settings.osc.VCalTp;
+  request.GridLines = c.GridLines;
+  request.HalfGrid = c.HalfGrid;
+  request.MovingGrid = c.MovingGrid;
+  request.GridSpace = c.GridSpace;
+  request.Ma1On = c.AvOne;
+  request.Ma2On = c.AvTwo;
+  request.MaExp = c.AvCalc;
+  request.Ma1Days = c.Av1D;
+  request.Ma2Days = c.Av2D;
+  request.Ma1Weeks = c.Av1W;
+  request.Ma2Weeks = c.Av2W;
+  request.BandKind = c.Bands;
+  request.StopLossShown = c.StopLoss;
+  request.StopLossPct = c.StopLossPct;
+  request.ScriptPrintMode = settings.words.ScriptPrintMode;
+  return request;
+}
+
+}  // namespace kora

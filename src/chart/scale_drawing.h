@@ -1,0 +1,50 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "chart/chart_canvas.h"
+
+namespace kora {
+
+// Sets `chart.Volume` from the loaded bars: the volume at the top of the panel is a multiple of
+// the mean (VolHeight for bars and candles, 3 for lines), so that one large day does not flatten
+// the rest.
+//   arithmetic: y = VolBottom - (v - VolBase) / VolPerY
+//   log:        y = Int(VolLogFactor * (ln v - VolLogBase) + VolBottom)
+// VolLogBase is taken on a logarithmic price chart alone and otherwise stays as it was.
+void SetVolumeMap(const ChartRequest& request, bool lineChart, bool logarithmicPrices,
+                  Composition& chart);
+
+// Copies the volume figures and empties VolLabel, the unit of the volumes.
+void SetVolumeLabel(Composition& chart);
+
+// Frame, three dotted lines, "VOL" reading downward and the values of the volume panel.
+void DrawVolumePanel(const ChartCanvas& canvas);
+
+// Frame, the period and mode line (single charts), ticks, labels and horizontal grid.
+// `classText` is the industry class, "unknown" for none.
+void DrawScale(const ChartCanvas& canvas, bool lineChart, std::string_view classText);
+
+// Vertical grid lines every GridSpace bars.
+void DrawFixedGrid(const ChartCanvas& canvas);
+
+// The date axis below the plot, called at each bar with a new month key.
+class DateAxis {
+ public:
+  explicit DateAxis(const ChartCanvas& canvas) : canvas_(canvas) {}
+
+  // Takes a bar's date at `x`; marks it where its month key is above the last one seen.
+  void Bar(std::string_view yyyymmdd, double x);
+
+ private:
+  void NewMonth(std::string_view yyyymmdd, double x);
+
+  const ChartCanvas& canvas_;
+  std::string lastMonth_;  // "yyyymm"
+  std::string lastYear_;
+  int lastMark_ = 0;       // x in eighths where a month was last marked
+  bool monthSkipped_ = false;
+};
+
+}  // namespace kora
