@@ -84,6 +84,7 @@ QLabel* CPath::AddLabel(int index, const char* caption, int row) {
   value->setObjectName(QString("Label10(%1)").arg(index));
   value->setTextFormat(Qt::PlainText);
   value->setFrameStyle(QFrame::Panel | QFrame::Sunken);
+  value->setMargin(fontMetrics().height() / 6);
   grid->addWidget(new QLabel(caption, this), row, 0);
   grid->addWidget(value, row, 1);
   return value;

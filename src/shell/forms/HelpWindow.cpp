@@ -3,6 +3,7 @@
 #include <QAction>
 #include <QDir>
 #include <QFileInfo>
+#include <QScreen>
 #include <QTextBrowser>
 #include <QToolBar>
 #include <QUrl>
@@ -46,7 +47,8 @@ HelpWindow::HelpWindow(const QString& page) {
   forward->setEnabled(false);
   connect(browser, &QTextBrowser::backwardAvailable, back, &QAction::setEnabled);
   connect(browser, &QTextBrowser::forwardAvailable, forward, &QAction::setEnabled);
-  resize(fontMetrics().averageCharWidth() * 100, fontMetrics().height() * 36);
+  const QSize wanted(fontMetrics().averageCharWidth() * 100, fontMetrics().height() * 36);
+  resize(wanted.boundedTo(screen()->availableGeometry().size() * 0.9));
 }
 
 }  // namespace kora

@@ -12,17 +12,17 @@
 namespace kora {
 namespace {
 
-// A few candles, so that the splash says what the program is for.
-QPixmap Emblem(const QFontMetrics& metrics, double dpr) {
-  const int unit = metrics.height() / 2;
-  QPixmap pixmap(QSize(unit * 24, unit * 9) * dpr);
+// Candles on a black ground, 9 units high, so that the sign says what the program is for.
+QPixmap Emblem(int unit, int candles, double dpr) {
+  QPixmap pixmap(QSize(unit * (candles * 2 + 2), unit * 9) * dpr);
   pixmap.setDevicePixelRatio(dpr);
   pixmap.fill(Qt::black);
   QPainter painter(&pixmap);
   painter.scale(unit, unit);
   const double closes[] = {6.2, 5.6, 6.6, 5.2, 4.4, 5.0, 4.0, 3.2, 3.9, 2.8, 2.0};
-  for (int i = 0; i < 10; ++i) {
-    const double x = 2 + i * 2, from = closes[i], to = closes[i + 1];
+  for (int i = 0; i < candles; ++i) {
+    const int last = 10 - candles + i;
+    const double x = 1.5 + i * 2, from = closes[last], to = closes[last + 1];
     const QColor colour = to < from ? QColor(255, 255, 255) : QColor(192, 0, 0);
     painter.fillRect(QRectF(x + 0.45, std::min(from, to) - 0.7, 0.1, std::abs(to - from) + 1.4),
                      colour);
@@ -45,6 +45,8 @@ Logo::Logo(Session& session, std::string commandLine)
   colours.setColor(QPalette::WindowText, Qt::white);
   setPalette(colours);
 
+  QApplication::setWindowIcon(Emblem(7, 4, 1));
+
   auto* column = new QVBoxLayout(this);
   auto* title = new QLabel("KORA Charting 7F", this);
   title->setObjectName("Label1");
@@ -54,7 +56,7 @@ Logo::Logo(Session& session, std::string commandLine)
   title->setFont(large);
   title->setAlignment(Qt::AlignCenter);
   auto* emblem = new QLabel(this);
-  emblem->setPixmap(Emblem(fontMetrics(), devicePixelRatioF()));
+  emblem->setPixmap(Emblem(fontMetrics().height() / 2, 10, devicePixelRatioF()));
   emblem->setAlignment(Qt::AlignCenter);
   column->addWidget(title);
   column->addWidget(emblem);

@@ -9,6 +9,7 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QScreen>
+#include <QStyle>
 #include <QUrl>
 
 #include "base/numbers.h"
@@ -143,7 +144,8 @@ void Main::TakeSize() {
   const QRect room = screen()->availableGeometry();
   const QSize wanted(int(size.width * growW / kTwipsPerPixel),
                      int(size.height * growH / kTwipsPerPixel));
-  resize(wanted.boundedTo(room.size()));
+  const int frame = style()->pixelMetric(QStyle::PM_TitleBarHeight);
+  resize(wanted.boundedTo(room.size() - QSize(0, frame)));
   const FormPlace place = CentreForm(room.width(), room.height(), width(), height());
   move(room.topLeft() + QPoint(std::max(place.left, 0), std::max(place.top, 0)));
 }
