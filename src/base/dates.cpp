@@ -122,8 +122,9 @@ CalendarDate DateOfDayNumber(std::int32_t days) {
 }
 
 CalendarDate AddMonths(const CalendarDate& d, int months) {
-  const int total = d.year * 12 + d.month - 1 + months;
-  CalendarDate out{total / 12, total % 12 + 1, d.day};
+  const std::int64_t total = std::int64_t(d.year) * 12 + d.month - 1 + months;
+  const std::int64_t year = total >= 0 ? total / 12 : (total - 11) / 12;
+  CalendarDate out{int(year), int(total - year * 12) + 1, d.day};
   const int last = DaysIn(out.year, out.month);
   if (out.day > last) out.day = last;
   return out;

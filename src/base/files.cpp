@@ -7,8 +7,13 @@
 
 namespace kora {
 
+// What a folder held when it was read. A change shows in the folder's time, but the host's clock
+// is coarse: a change right after the reading can leave the time as it was.
 struct Files::Folder {
   std::int64_t modified = -1;
+  bool sure = false;   // read when the time had settled: every later change shows
+  bool own = false;    // the last change was the program's own, and is entered here
+  bool twins = false;  // there are names that differ in case alone
   // Lower-case name to the name on the host; where two differ in case alone, the first by bytes.
   std::unordered_map<std::string, std::string> entries;
 };
@@ -57,8 +62,13 @@ DosParts SplitDrive(std::string_view path) {
 // Splits "c:\a\b.txt" into "c:\a\" and "b.txt".
 std::pair<std::string_view, std::string_view> SplitName(std::string_view path) {
   size_t end = path.size();
-  while (end > 0 && !IsSeparator(path[end - 1]) && path[end - 1] != ':') --end;
+  while (end > 0 && !IsSeparator(path[end - 1]) && !(end == 2 && path[1] == ':')) --end;
   return {path.substr(0, end), path.substr(end)};
+}
+
+// Drive C: has the home under this name.
+bool IsWindows(const DosParts& parts, std::string_view name) {
+  return parts.drive == 'c' && EqualNoCase(name, "windows");
 }
 
 std::string FolderOf(const std::string& host) {
@@ -68,7 +78,9 @@ std::string FolderOf(const std::string& host) {
 }
 
 std::string Join(const std::string& folder, std::string_view name) {
-  std::string out = folder;
+  std::string out;
+  out.reserve(folder.size() + 1 + name.size());
+  out += folder;
   if (out.empty() || out.back() != '/') out += '/';
   out += name;
   return out;
@@ -78,6 +90,7 @@ std::string Join(const std::string& folder, std::string_view name) {
 
 Files::Files(std::string home, Io& io) : home_(std::move(home)), io_(io) {
   while (home_.size() > 1 && home_.back() == '/') home_.pop_back();
+  if (home_.empty()) home_ = ".";  // never the root of the host
 }
 
 Files::~Files() = default;
@@ -87,15 +100,11 @@ std::int64_t Files::Modified(const std::string& host) const {
   return status.exists && status.folder ? status.modified : -1;
 }
 
-Files::Folder* Files::FolderFor(const std::string& host) const {
-  const std::int64_t modified = Modified(host);
-  if (modified < 0) {
-    listings_.erase(host);
-    return nullptr;
-  }
+Files::Folder* Files::ReadFolder(const std::string& host, std::int64_t modified) const {
   std::unique_ptr<Folder>& folder = listings_[host];
-  if (folder && folder->modified == modified) return folder.get();
   folder = std::make_unique<Folder>();
+  folder->modified = modified;
+  folder->sure = TimeIsSettled(modified);
   std::vector<std::string> names;
   try {
     names = io_.List(host);
@@ -106,43 +115,67 @@ Files::Folder* Files::FolderFor(const std::string& host) const {
   std::sort(names.begin(), names.end());
   for (std::string& name : names) {
     std::string key = LCase(name);
-    folder->entries.emplace(std::move(key), std::move(name));
+    if (!folder->entries.emplace(std::move(key), std::move(name)).second) folder->twins = true;
   }
-  folder->modified = modified;
   return folder.get();
 }
 
-const std::string* Files::FindEntry(const std::string& hostFolder, std::string_view name) const {
+Files::Folder* Files::FolderFor(const std::string& host) const {
+  const std::int64_t modified = Modified(host);
+  const auto it = listings_.find(host);
+  if (modified < 0) {
+    if (it != listings_.end()) listings_.erase(it);
+    return nullptr;
+  }
+  if (it != listings_.end() && it->second->modified == modified) return it->second.get();
+  return ReadFolder(host, modified);
+}
+
+const std::string* Files::FindEntry(const std::string& hostFolder, std::string_view name,
+                                    bool making) const {
   Folder* folder = FolderFor(hostFolder);
   if (!folder) return nullptr;
-  const auto it = folder->entries.find(LCase(name));
+  const std::string key = LCase(name);
+  auto it = folder->entries.find(key);
+  const bool found = it != folder->entries.end();
+  // Who looks where to make a file may rely on the program's own notes, or making thousands
+  // would read the folder thousands of times. Who looks for a file must not miss it.
+  if (!folder->sure && (found ? !io_.Status(Join(hostFolder, it->second)).exists
+                              : !(making && folder->own))) {
+    folder = ReadFolder(hostFolder, Modified(hostFolder));
+    if (!folder) return nullptr;
+    it = folder->entries.find(key);
+  }
   return it == folder->entries.end() ? nullptr : &it->second;
 }
 
-// The program's own changes are entered into a listing that was true before them, so that
-// making thousands of files does not read the folder thousands of times.
+// The program's own changes are entered into a listing that was true before them.
 void Files::Note(const std::string& host, bool added, std::int64_t before) const {
   const std::string hostFolder = FolderOf(host);
   const auto it = listings_.find(hostFolder);
   if (it == listings_.end()) return;
-  if (it->second->modified != before) {
+  Folder& folder = *it->second;
+  const std::string name = host.substr(host.rfind('/') + 1);
+  // A name taken away may leave its twin behind, which the listing does not hold.
+  if (folder.modified != before || (!added && folder.twins)) {
     listings_.erase(it);
     return;
   }
-  const std::string name = host.substr(host.rfind('/') + 1);
   if (added) {
-    it->second->entries.emplace(LCase(name), name);
+    const auto [entry, fresh] = folder.entries.emplace(LCase(name), name);
+    if (!fresh && entry->second != name) folder.twins = true;
   } else {
-    const auto entry = it->second->entries.find(LCase(name));
-    if (entry != it->second->entries.end() && entry->second == name)
-      it->second->entries.erase(entry);
+    folder.entries.erase(LCase(name));
   }
-  it->second->modified = Modified(hostFolder);
+  const std::int64_t after = Modified(hostFolder);
+  if (after == before && folder.sure) return;  // a file that was there: nothing changed
+  folder.modified = after;
+  folder.sure = false;
+  folder.own = true;
 }
 
 std::string Files::ResolveFolder(std::string_view dosFolder) const {
-  const std::string key(dosFolder);
-  const auto known = folders_.find(key);
+  const auto known = folders_.find(dosFolder);
   if (known != folders_.end()) return known->second;
 
   std::string host;
@@ -153,32 +186,40 @@ std::string Files::ResolveFolder(std::string_view dosFolder) const {
     host = Join(home_, std::string("drive_") + parts.drive);
   }
   std::vector<std::string_view> names = PathNames(parts.rest);
-  if (parts.drive == 'c' && !names.empty() && EqualNoCase(names.front(), "windows")) {
+  if (!names.empty() && IsWindows(parts, names.front())) {
     host = home_;
     names.erase(names.begin());
   }
-  bool all = true;
   for (const std::string_view name : names) {
     std::string next = Join(host, name);
     if (!io_.Status(next).exists) {
-      if (const std::string* entry = FindEntry(host, name)) next = Join(host, *entry);
-      else all = false;
+      if (const std::string* entry = FindEntry(host, name, false)) next = Join(host, *entry);
     }
-    host = next;
+    host = std::move(next);
   }
   // A folder that is not there yet may come in another case.
-  if (all) folders_.emplace(key, host);
+  if (Modified(host) >= 0) folders_.emplace(dosFolder, host);
   return host;
 }
 
-std::string Files::HostPath(std::string_view path) const {
-  SplitDrive(path);
+std::string Files::Locate(std::string_view path, bool making) const {
+  const DosParts parts = SplitDrive(path);
   const auto [folder, name] = SplitName(path);
-  if (name.empty() || name == "." || name == "..") return ResolveFolder(path);
-  const std::string hostFolder = ResolveFolder(folder);
+  if (name.empty() || name == "." || name == ".." || IsWindows(parts, name))
+    return ResolveFolder(path);
+  std::string hostFolder = ResolveFolder(folder);
   std::string host = Join(hostFolder, name);
   if (io_.Status(host).exists) return host;
-  if (const std::string* entry = FindEntry(hostFolder, name)) return Join(hostFolder, *entry);
+  if (Modified(hostFolder) < 0) {
+    // The folder known under this path is gone; another may stand in its place.
+    const auto known = folders_.find(folder);
+    if (known == folders_.end()) return host;
+    folders_.erase(known);
+    hostFolder = ResolveFolder(folder);
+    host = Join(hostFolder, name);
+    if (io_.Status(host).exists) return host;
+  }
+  if (const std::string* entry = FindEntry(hostFolder, name, making)) return Join(hostFolder, *entry);
   return host;
 }
 
@@ -211,20 +252,20 @@ bool Files::IsFolder(std::string_view path) const {
 }
 
 std::unique_ptr<HostFile> Files::Open(std::string_view path, OpenMode mode) const {
-  SplitDrive(path);
   const auto [folder, name] = SplitName(path);
   if (name.empty()) throw RunTimeError(kBadFileName);
   if (mode == OpenMode::kRead || mode == OpenMode::kReadWrite) {
-    const std::string hostFolder = ResolveFolder(folder);
-    try {
-      return io_.Open(Join(hostFolder, name), mode);
-    } catch (const RunTimeError& e) {
-      if (e.number() != kFileNotFound && e.number() != kPathNotFound) throw;
+    if (const auto known = folders_.find(folder); known != folders_.end()) {
+      if (name.find('\0') != std::string_view::npos) throw RunTimeError(kBadFileName);
+      try {
+        return io_.Open(Join(known->second, name), mode);
+      } catch (const RunTimeError& e) {
+        if (e.number() != kFileNotFound && e.number() != kPathNotFound) throw;
+      }
     }
-    folders_.erase(std::string(folder));  // the folder may have been renamed meanwhile
-    return io_.Open(HostPath(path), mode);
+    return io_.Open(Locate(path, false), mode);
   }
-  const std::string host = HostPath(path);
+  const std::string host = Locate(path, true);
   const std::int64_t before = Modified(FolderOf(host));
   auto file = io_.Open(host, mode);
   Note(host, true, before);
@@ -241,13 +282,16 @@ std::vector<std::string> Files::List(std::string_view folder) const {
 }
 
 void Files::MakeFolder(std::string_view path) const {
-  const std::string host = HostPath(path);
+  const std::string host = Locate(path, true);
   for (size_t i = 1; i <= host.size(); ++i) {
     if (i < host.size() && host[i] != '/') continue;
     const std::string part = host.substr(0, i);
     const HostStatus status = io_.Status(part);
     if (status.exists && !status.folder) throw RunTimeError(kPathAccess);
-    if (!status.exists) io_.MakeFolder(part);
+    if (status.exists) continue;
+    const std::int64_t before = Modified(FolderOf(part));
+    io_.MakeFolder(part);
+    Note(part, true, before);
   }
 }
 
@@ -260,10 +304,20 @@ void Files::Remove(std::string_view path) const {
 
 void Files::Rename(std::string_view from, std::string_view to) const {
   const std::string hostFrom = HostPath(from);
-  const std::string hostTo = HostPath(to);
+  std::string hostTo = Locate(to, true);
+  const std::string folderFrom = FolderOf(hostFrom), folderTo = FolderOf(hostTo);
+  const std::string_view name = SplitName(to).second;
+  if (hostTo == hostFrom && !name.empty() && name != "." && name != "..")
+    hostTo = Join(folderTo, name);
+  const std::int64_t beforeFrom = Modified(folderFrom), beforeTo = Modified(folderTo);
   io_.Rename(hostFrom, hostTo);
-  listings_.erase(FolderOf(hostFrom));
-  listings_.erase(FolderOf(hostTo));
+  if (io_.Status(hostTo).folder) {
+    folders_.clear();
+    listings_.clear();
+    return;
+  }
+  Note(hostFrom, false, beforeFrom);
+  Note(hostTo, true, folderFrom == folderTo ? Modified(folderTo) : beforeTo);
 }
 
 std::string Files::ReadAll(std::string_view path, std::uint64_t limit) const {
@@ -277,7 +331,7 @@ std::string Files::ReadAll(std::string_view path, std::uint64_t limit) const {
 }
 
 void Files::WriteAll(std::string_view path, std::string_view bytes) const {
-  const std::string host = HostPath(path);
+  const std::string host = Locate(path, true);
   const std::string temporary = host + ".tmp~";
   const std::int64_t before = Modified(FolderOf(host));
   try {
@@ -315,7 +369,7 @@ bool IsFileCode(std::string_view code) {
     if (std::string_view("\\/:*?\"<>|,;=").find(c) != std::string_view::npos) return false;
   }
   const std::string stem = UCase(code.substr(0, code.find('.')));
-  for (const char* device : {"CON", "PRN", "AUX", "NUL"})
+  for (const char* device : {"CON", "PRN", "AUX", "NUL", "CONIN$", "CLOCK$"})
     if (stem == device) return false;
   if (stem.size() == 4 && (stem.rfind("COM", 0) == 0 || stem.rfind("LPT", 0) == 0) &&
       stem[3] >= '1' && stem[3] <= '9')

@@ -19,7 +19,7 @@ namespace kora {
 // drive with "..".
 //
 // Opening asks the host for the exact name first and looks through the folder only when that
-// fails; folders are read once and read again only when they changed.
+// fails; folders are read once and read again only when they may have changed.
 class Files {
  public:
   // `home` is a host folder; it need not exist yet.
@@ -34,8 +34,8 @@ class Files {
   // The host path of a DOS path: of the entry that is there in any case, or else where it
   // would be made. A path with no drive is of drive C:. Error 52 for a path with an empty
   // name, a NUL or a drive that is no letter.
-  std::string HostPath(std::string_view path) const;
-  // The DOS path that names a host path: on Z:, or on C: within the home's drive.
+  std::string HostPath(std::string_view path) const { return Locate(path, false); }
+  // The DOS path that names an absolute host path: on C: within the home's drive, else on Z:.
   std::string DosPath(std::string_view hostPath) const;
 
   // True when the path exists, file or folder.
@@ -47,6 +47,7 @@ class Files {
   // Makes the folder and those above it; nothing when it is there.
   void MakeFolder(std::string_view path) const;
   void Remove(std::string_view path) const;
+  // Replaces `to` where it exists; a name that differs in case alone changes its case.
   void Rename(std::string_view from, std::string_view to) const;
 
   // The whole file. Error 7 when larger than `limit` bytes.
@@ -57,15 +58,24 @@ class Files {
 
  private:
   struct Folder;
+  // Finds by text without making a string of it.
+  struct TextHash : std::hash<std::string_view> {
+    using is_transparent = void;
+  };
+
+  std::string Locate(std::string_view path, bool making) const;
+  Folder* ReadFolder(const std::string& host, std::int64_t modified) const;
   Folder* FolderFor(const std::string& host) const;
-  const std::string* FindEntry(const std::string& hostFolder, std::string_view name) const;
+  const std::string* FindEntry(const std::string& hostFolder, std::string_view name,
+                               bool making) const;
   std::string ResolveFolder(std::string_view dosFolder) const;
   void Note(const std::string& host, bool added, std::int64_t before) const;
   std::int64_t Modified(const std::string& host) const;
 
   std::string home_;
   Io& io_;
-  mutable std::unordered_map<std::string, std::string> folders_;  // DOS folder -> host folder
+  // DOS folder -> host folder, of folders that were there when they were looked for.
+  mutable std::unordered_map<std::string, std::string, TextHash, std::equal_to<>> folders_;
   mutable std::unordered_map<std::string, std::unique_ptr<Folder>> listings_;
 };
 

@@ -52,6 +52,10 @@ class Io {
   virtual void Rename(const std::string& from, const std::string& to) = 0;
 };
 
+// False while `modified` lies so little back that a further change might carry the same time:
+// clocks of file systems tick in up to two seconds.
+bool TimeIsSettled(std::int64_t modified);
+
 // The machine's own file system.
 Io& MachineIo();
 

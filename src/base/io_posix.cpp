@@ -1,4 +1,5 @@
 #include <cerrno>
+#include <chrono>
 #include <cstring>
 #include <dirent.h>
 #include <fcntl.h>
@@ -48,7 +49,7 @@ bool FolderExists(const std::string& path) {
 
 class PosixFile : public HostFile {
  public:
-  PosixFile(int fd, std::string path) : fd_(fd), path_(std::move(path)) {}
+  explicit PosixFile(int fd) : fd_(fd) {}
   ~PosixFile() override { ::close(fd_); }
 
   size_t ReadAt(std::uint64_t offset, void* data, size_t size) override {
@@ -57,7 +58,7 @@ class PosixFile : public HostFile {
       const ssize_t n =
           ::pread(fd_, static_cast<char*>(data) + done, size - done, off_t(offset + done));
       if (n < 0 && errno == EINTR) continue;
-      if (n < 0) Fail(errno, path_);
+      if (n < 0) Fail(errno, {});
       if (n == 0) break;
       done += size_t(n);
     }
@@ -70,29 +71,29 @@ class PosixFile : public HostFile {
       const ssize_t n =
           ::pwrite(fd_, static_cast<const char*>(data) + done, size - done, off_t(offset + done));
       if (n < 0 && errno == EINTR) continue;
-      if (n < 0) Fail(errno, path_);
+      if (n <= 0) Fail(n < 0 ? errno : ENOSPC, {});
       done += size_t(n);
     }
   }
 
   std::uint64_t Size() override {
     struct stat st;
-    if (::fstat(fd_, &st) != 0) Fail(errno, path_);
-    if (S_ISDIR(st.st_mode)) Fail(EISDIR, path_);
+    if (::fstat(fd_, &st) != 0) Fail(errno, {});
+    // A folder, pipe or socket in the place of a file has no bytes to count.
+    if (!S_ISREG(st.st_mode) && !S_ISCHR(st.st_mode)) Fail(EISDIR, {});
     return std::uint64_t(st.st_size);
   }
 
   void Truncate(std::uint64_t size) override {
-    if (::ftruncate(fd_, off_t(size)) != 0) Fail(errno, path_);
+    if (::ftruncate(fd_, off_t(size)) != 0) Fail(errno, {});
   }
 
   void Flush() override {
-    if (::fsync(fd_) != 0 && errno != EINVAL) Fail(errno, path_);
+    if (::fsync(fd_) != 0 && errno != EINVAL) Fail(errno, {});
   }
 
  private:
   int fd_;
-  std::string path_;
 };
 
 class PosixIo : public Io {
@@ -110,7 +111,7 @@ class PosixIo : public Io {
     do fd = ::open(path.c_str(), flags | O_NONBLOCK, 0666);
     while (fd < 0 && errno == EINTR);
     if (fd < 0) Fail(errno, path);
-    return std::make_unique<PosixFile>(fd, path);
+    return std::make_unique<PosixFile>(fd);
   }
 
   HostStatus Status(const std::string& path) override {
@@ -149,11 +150,20 @@ class PosixIo : public Io {
   }
 
   void Rename(const std::string& from, const std::string& to) override {
-    if (::rename(from.c_str(), to.c_str()) != 0) Fail(errno, from);
+    if (::rename(from.c_str(), to.c_str()) == 0) return;
+    const int error = errno;
+    struct stat st;
+    Fail(error, ::lstat(from.c_str(), &st) == 0 ? to : from);
   }
 };
 
 }  // namespace
+
+bool TimeIsSettled(std::int64_t modified) {
+  using namespace std::chrono;
+  const auto now = duration_cast<nanoseconds>(system_clock::now().time_since_epoch()).count();
+  return modified < now - 2500000000;
+}
 
 Io& MachineIo() {
   static PosixIo io;

@@ -114,6 +114,14 @@ double Divide(double a, double b) {
   return a / b;
 }
 
+std::optional<float> ParseFloat(std::string_view text) {
+  float value = 0;
+  const char* end = text.data() + text.size();
+  const auto r = std::from_chars(text.data(), end, value);
+  if (r.ec != std::errc() || r.ptr != end || !std::isfinite(value)) return std::nullopt;
+  return value;
+}
+
 double Val(std::string_view text) {
   size_t i = 0;
   while (i < text.size() && (text[i] == ' ' || text[i] == '\t')) ++i;
@@ -126,7 +134,8 @@ double Val(std::string_view text) {
     while (i < text.size() && IsDigit(text[i])) ++i;
   }
   // from_chars knows no leading plus.
-  const size_t first = text[start < text.size() ? start : 0] == '+' ? digits : start;
+  if (digits == i) return 0;
+  const size_t first = text[start] == '+' ? digits : start;
   double value = 0;
   const auto result =
       std::from_chars(text.data() + first, text.data() + i, value, std::chars_format::fixed);

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -30,6 +31,10 @@ double Divide(double a, double b);
 // The leading numeric part of a text: blanks, a sign, digits and one point; 0 where there is
 // none. Stops at the first other character, so that "12abc" is 12 and "1E5" is 1.
 double Val(std::string_view text);
+
+// The whole text as a finite number, nearest 32-bit float; nothing where it is anything else
+// or leaves the range. For text that must be a number, where Val would make it 0.
+std::optional<float> ParseFloat(std::string_view text);
 
 // The shortest decimal form that reads back to the same value; never with an exponent, never
 // with a leading blank. A NaN is "nan", an infinity "inf" or "-inf".

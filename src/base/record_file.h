@@ -49,7 +49,9 @@ class RecordFile {
       throw RunTimeError(kBadRecordNumber);
   }
 
+  // Error 7 when the file is larger than any that the program writes.
   std::vector<T> ReadAll() const {
+    if (std::uint64_t(count_) * sizeof(T) > kLargestRead) throw RunTimeError(kOutOfMemory);
     std::vector<T> out(static_cast<size_t>(count_));
     ReadRun(1, out);
     return out;
@@ -77,6 +79,7 @@ class RecordFile {
   void Flush() { file_->Flush(); }
 
  private:
+  static constexpr std::uint64_t kLargestRead = 256u << 20;
   static std::uint64_t Offset(std::int32_t n) { return std::uint64_t(n - 1) * sizeof(T); }
 
   std::unique_ptr<HostFile> file_;

@@ -113,12 +113,14 @@ std::string ToAnsi(std::string_view text) {
     }
     std::uint32_t code = c & (0x3Fu >> more);
     bool good = true;
+    // The least character of each length: a shorter one in a longer form is bad.
+    constexpr std::uint32_t kLeast[] = {0, 0x80, 0x800, 0x10000};
     for (int k = 1; k <= more; ++k) {
       const auto b = static_cast<unsigned char>(text[i + size_t(k)]);
       good = good && (b & 0xC0) == 0x80;
       code = (code << 6) | (b & 0x3Fu);
     }
-    if (!good) {
+    if (!good || code < kLeast[more]) {
       out += '?';
       ++i;
       continue;

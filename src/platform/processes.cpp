@@ -1,5 +1,7 @@
 #include "platform/processes.h"
 
+#include <filesystem>
+
 #include "base/runtime_error.h"
 
 #ifdef _WIN32
@@ -21,12 +23,13 @@ class HostProcesses : public Processes {
   int RunAndWait(const std::string& program, const std::vector<std::string>& arguments,
                  const std::function<void()>& idle) override {
     std::string line = "\"" + program + "\"";
+    const std::string folder = std::filesystem::path(program).parent_path().string();
     for (const std::string& a : arguments) line += " \"" + a + "\"";
     STARTUPINFOA start{};
     start.cb = sizeof start;
     PROCESS_INFORMATION process{};
-    if (!CreateProcessA(nullptr, line.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &start,
-                        &process))
+    if (!CreateProcessA(nullptr, line.data(), nullptr, nullptr, FALSE, 0, nullptr,
+                        folder.empty() ? nullptr : folder.c_str(), &start, &process))
       throw RunTimeError(kFileNotFound);
     while (WaitForSingleObject(process.hProcess, 20) == WAIT_TIMEOUT)
       if (idle) idle();
@@ -39,13 +42,21 @@ class HostProcesses : public Processes {
 #else
   int RunAndWait(const std::string& program, const std::vector<std::string>& arguments,
                  const std::function<void()>& idle) override {
+    std::error_code error;
+    const std::filesystem::path path = std::filesystem::absolute(program, error);
+    if (error || program.empty()) throw RunTimeError(kFileNotFound);
     std::vector<char*> argv;
-    argv.push_back(const_cast<char*>(program.c_str()));
+    argv.push_back(const_cast<char*>(path.c_str()));
     for (const std::string& a : arguments) argv.push_back(const_cast<char*>(a.c_str()));
     argv.push_back(nullptr);
     pid_t pid = 0;
-    if (::posix_spawn(&pid, program.c_str(), nullptr, nullptr, argv.data(), environ) != 0)
-      throw RunTimeError(kFileNotFound);
+    posix_spawn_file_actions_t actions;
+    if (::posix_spawn_file_actions_init(&actions) != 0) throw RunTimeError(kOutOfMemory);
+    int failed = ::posix_spawn_file_actions_addchdir_np(&actions, path.parent_path().c_str());
+    if (failed == 0)
+      failed = ::posix_spawn(&pid, path.c_str(), &actions, nullptr, argv.data(), environ);
+    ::posix_spawn_file_actions_destroy(&actions);
+    if (failed != 0) throw RunTimeError(kFileNotFound);
     int status = 0;
     for (;;) {
       const pid_t got = ::waitpid(pid, &status, idle ? WNOHANG : 0);

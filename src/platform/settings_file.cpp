@@ -15,12 +15,19 @@ std::string MapKey(std::string_view section, std::string_view key) {
   return LCase(Trim(section)) + "\n" + LCase(Trim(key));
 }
 
-// A value must stay on its line.
-std::string OneLine(std::string_view value) {
-  std::string out(Trim(value));
+// In the file's own alphabet, and on one line.
+std::string OneLine(std::string_view text) {
+  std::string out = ToAnsi(Trim(text));
   for (char& c : out)
     if (c == '\r' || c == '\n' || c == '\0') c = ' ';
   return std::string(Trim(out));
+}
+
+// Whether a section or key reads back as it is written; `breaks` are the characters that would
+// end it or make something else of it.
+bool IsName(std::string_view name, std::string_view breaks) {
+  return !name.empty() && name.find_first_of(breaks) == std::string_view::npos &&
+         name.find_first_of(std::string_view("\r\n\0", 3)) == std::string_view::npos;
 }
 
 }  // namespace
@@ -31,26 +38,30 @@ SettingsFile::SettingsFile(const Files& files, std::string path)
 bool SettingsFile::Exists() const { return files_.CheckFile(path_); }
 
 void SettingsFile::Load() const {
-  if (batch_ > 0 && loaded_) return;
-  std::int64_t stamp = -1;
+  if (dirty_) return;  // a batch goes on with what it gathered
+  HostStatus status;
   try {
-    const HostStatus status = files_.io().Status(files_.HostPath(path_));
-    if (status.exists && !status.folder) stamp = status.modified ^ std::int64_t(status.size << 40);
+    status = files_.io().Status(files_.HostPath(path_));
   } catch (const RunTimeError&) {
-    stamp = -1;
+    // A path that can't be is no file.
   }
-  if (loaded_ && stamp == stamp_) return;
+  if (loaded_ && settled_ && status.exists == status_.exists && status.folder == status_.folder &&
+      status.size == status_.size && status.modified == status_.modified)
+    return;
   loaded_ = true;
-  stamp_ = stamp;
+  status_ = status;
+  settled_ = !status.exists || TimeIsSettled(status.modified);
+  readable_ = true;
   lines_.clear();
   index_.clear();
   sections_.clear();
-  if (stamp == -1) return;
+  if (!status.exists) return;
   std::string text;
   try {
-    text = FromAnsi(files_.ReadAll(path_, kLargestFile));
+    text = files_.ReadAll(path_, kLargestFile);
   } catch (const RunTimeError&) {
-    return;  // what can't be read has no keys
+    readable_ = false;  // it has no keys, and must not be replaced by the few that are written
+    return;
   }
   LineReader reader(text);
   std::string_view line;
@@ -71,7 +82,7 @@ void SettingsFile::Load() const {
 }
 
 std::string SettingsFile::GetSetting(std::string_view section, std::string_view key) const {
-  const std::string mapKey = MapKey(section, key);
+  const std::string mapKey = MapKey(ToAnsi(section), ToAnsi(key));
   std::string_view value;
   if (const auto o = overrides_.find(mapKey); o != overrides_.end()) {
     value = o->second;
@@ -79,36 +90,33 @@ std::string SettingsFile::GetSetting(std::string_view section, std::string_view 
     Load();
     const auto it = index_.find(mapKey);
     if (it == index_.end()) return std::string(kUnknown);
-    const std::string& line = lines_[it->second];
-    value = Trim(std::string_view(line).substr(line.find('=') + 1));
+    const std::string_view line = lines_[it->second];
+    value = Trim(line.substr(line.find('=') + 1));
   }
-  // Cut by characters, never within one.
-  size_t bytes = 0;
-  for (size_t n = 0; bytes < value.size() && n < kLongestValue; ++n) {
-    ++bytes;
-    while (bytes < value.size() && (static_cast<unsigned char>(value[bytes]) & 0xC0) == 0x80)
-      ++bytes;
-  }
-  value = Trim(value.substr(0, bytes));
-  return value.empty() ? std::string(kUnknown) : std::string(value);
+  value = Trim(value.substr(0, kLongestValue));
+  return value.empty() ? std::string(kUnknown) : FromAnsi(value);
 }
 
 bool SettingsFile::PutSetting(std::string_view section, std::string_view key,
                               std::string_view value) {
+  const std::string sectionName = ToAnsi(Trim(section)), keyName = ToAnsi(Trim(key));
+  if (!IsName(sectionName, "]") || !IsName(keyName, "=") || keyName[0] == '[' || keyName[0] == ';')
+    return false;
   Load();
-  const std::string mapKey = MapKey(section, key);
-  const std::string line = std::string(Trim(key)) + "=" + OneLine(value);
+  if (!readable_) return false;
+  const std::string mapKey = MapKey(sectionName, keyName);
+  const std::string line = keyName + "=" + OneLine(value);
   if (const auto it = index_.find(mapKey); it != index_.end()) {
     if (lines_[it->second] == line) return true;
     lines_[it->second] = line;
   } else {
-    const std::string name = LCase(Trim(section));
+    const std::string name = LCase(sectionName);
     size_t at;
     if (const auto s = sections_.find(name); s != sections_.end()) {
       at = s->second + 1;
     } else {
       if (!lines_.empty() && !lines_.back().empty()) lines_.emplace_back();
-      lines_.push_back("[" + std::string(Trim(section)) + "]");
+      lines_.push_back("[" + sectionName + "]");
       at = lines_.size();
     }
     lines_.insert(lines_.begin() + std::ptrdiff_t(at), line);
@@ -125,24 +133,22 @@ bool SettingsFile::PutSetting(std::string_view section, std::string_view key,
 
 void SettingsFile::Override(std::string_view section, std::string_view key,
                             std::string_view value) {
-  overrides_[MapKey(section, key)] = OneLine(value);
+  overrides_[MapKey(ToAnsi(section), ToAnsi(key))] = OneLine(value);
 }
 
 bool SettingsFile::Save() {
   dirty_ = false;
+  loaded_ = false;  // the next look reads what is there, whether this succeeds or not
   std::string text;
   for (const std::string& line : lines_) {
     text += line;
     text += "\r\n";
   }
   try {
-    files_.WriteAll(path_, ToAnsi(text));
+    files_.WriteAll(path_, text);
   } catch (const RunTimeError&) {
-    loaded_ = false;  // the file is as it was, and so are the values
     return false;
   }
-  stamp_ = -2;  // read anew at the next look
-  loaded_ = false;
   return true;
 }
 

@@ -18,8 +18,8 @@ inline constexpr std::string_view kUnknown = "unknown";
 //   Key=value
 //
 // Sections and keys match in any case. Values are text of at most 60 characters on reading;
-// what is longer is cut. A file that is missing, or is no text, has no keys. Lines that are
-// neither a section nor a key are kept as they are when a key is written.
+// what is longer is cut. A file that is missing, or can't be read, has no keys. Lines that are
+// neither a section nor a key are kept as they are, byte for byte, when a key is written.
 class SettingsFile {
  public:
   // `path` is a DOS path. Nothing is read yet.
@@ -30,8 +30,10 @@ class SettingsFile {
 
   // The value, trimmed, or "unknown" when the key is missing or empty.
   std::string GetSetting(std::string_view section, std::string_view key) const;
-  // Writes the value, trimmed, at once; the file is replaced as a whole. False when it can't
-  // be written, which callers pass over unless they say otherwise.
+  // Writes the value, trimmed, at once; the file is replaced as a whole. A line end within the
+  // value becomes a blank. False when it can't be written, which callers pass over unless they
+  // say otherwise: the host refuses, the file that is there can't be read (the rest of it would
+  // be lost), or the section or key would not read back as it is ("a=b", "[x", an empty one).
   bool PutSetting(std::string_view section, std::string_view key, std::string_view value);
 
   // A value for this run only: read in place of the file's, never written.
@@ -59,8 +61,10 @@ class SettingsFile {
   int batch_ = 0;
   bool dirty_ = false;
   mutable bool loaded_ = false;
-  mutable std::int64_t stamp_ = -2;
-  mutable std::vector<std::string> lines_;
+  mutable bool readable_ = true;
+  mutable bool settled_ = false;   // a further change of the file would show in status_
+  mutable HostStatus status_;      // of the file as it was read
+  mutable std::vector<std::string> lines_;  // ANSI
   mutable std::map<std::string, size_t> index_;    // "section\nkey" -> line
   mutable std::map<std::string, size_t> sections_;  // section -> its last line
 };

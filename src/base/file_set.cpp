@@ -1,0 +1,85 @@
+#include "base/file_set.h"
+
+#include "base/runtime_error.h"
+
+namespace kora {
+namespace {
+
+constexpr const char* kTemporary = ".tmp~";
+
+void WriteFlushed(Io& io, const std::string& host, std::string_view bytes) {
+  const auto file = io.Open(host, OpenMode::kReplace);
+  file->WriteAt(0, bytes.data(), bytes.size());
+  file->Flush();
+}
+
+std::string ReadWhole(HostFile& file) {
+  std::string bytes(size_t(file.Size()), '\0');
+  bytes.resize(file.ReadAt(0, bytes.data(), bytes.size()));
+  return bytes;
+}
+
+// For clean-ups after a failure, which is the one to tell.
+void RemoveQuietly(Io& io, const std::string& host) noexcept {
+  try {
+    if (io.Status(host).exists) io.Remove(host);
+  } catch (const RunTimeError&) {
+  }
+}
+
+}  // namespace
+
+FileSet::~FileSet() { Discard(); }
+
+void FileSet::Add(std::string_view path, std::string_view bytes) {
+  Item item;
+  item.host = files_.HostPath(path);
+  const HostStatus status = files_.io().Status(item.host);
+  if (status.folder) throw RunTimeError(kPathAccess, "Is a directory");
+  item.existed = status.exists;
+  item.temporary = item.host + kTemporary;
+  items_.push_back(item);
+  WriteFlushed(files_.io(), item.temporary, bytes);
+}
+
+void FileSet::Commit() {
+  Io& io = files_.io();
+  try {
+    for (Item& item : items_) {
+      if (item.existed) item.before = ReadWhole(*io.Open(item.host, OpenMode::kRead));
+      io.Rename(item.temporary, item.host);
+      item.placed = true;
+    }
+  } catch (const RunTimeError&) {
+    Restore();
+    Discard();
+    throw;
+  }
+  items_.clear();
+}
+
+void FileSet::Discard() noexcept {
+  for (const Item& item : items_)
+    if (!item.placed) RemoveQuietly(files_.io(), item.temporary);
+  items_.clear();
+}
+
+void FileSet::Restore() noexcept {
+  Io& io = files_.io();
+  for (const Item& item : items_) {
+    if (!item.placed) continue;
+    if (!item.existed) {
+      RemoveQuietly(io, item.host);
+      continue;
+    }
+    try {
+      WriteFlushed(io, item.temporary, item.before);
+      io.Rename(item.temporary, item.host);
+    } catch (const RunTimeError&) {
+      // The new file stays: it is whole, and better than none.
+      RemoveQuietly(io, item.temporary);
+    }
+  }
+}
+
+}  // namespace kora

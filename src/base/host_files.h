@@ -1,0 +1,21 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+#include "base/io.h"
+
+// Files that the user names by a path of the machine, outside the home.
+
+namespace kora {
+
+// The whole file. Error 7 when larger than `limit` bytes, 75 for a folder or what else is no
+// plain file.
+std::string ReadHostFile(Io& io, const std::string& path, std::uint64_t limit);
+
+// Replaces the file as a whole, by way of a temporary file beside it, or leaves it as it was.
+// A link stays a link to the file that is replaced. Error 75 for what is no plain file.
+void WriteHostFile(Io& io, const std::string& path, std::string_view bytes);
+
+}  // namespace kora

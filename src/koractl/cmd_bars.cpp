@@ -1,0 +1,80 @@
+#include <memory>
+
+#include "base/numbers.h"
+#include "base/runtime_error.h"
+#include "koractl/options.h"
+#include "koractl/run.h"
+#include "koractl/table.h"
+#include "store/chart_bars.h"
+
+namespace kora {
+namespace {
+
+struct BarsOptions {
+  std::string code;
+  std::string period = "A";
+  std::string volume = "on";
+  std::optional<std::int32_t> first, last;
+};
+
+void LoadSlice(Run& run, const BarsOptions& options, ChartBars& bars) {
+  const PriceFile file(run.session.files, run.session.current.CurrentDataFile);
+  const std::string name = run.DataFileName();
+  if (file.count() == 0) run.Abandon("No Data for " + name, "Chart Display");
+  const std::int32_t first = options.first.value_or(1);
+  const std::int32_t last = options.last.value_or(file.count());
+  if (first < 1 || first > last || last > file.count())
+    run.Abandon("There are no records " + Str(first) + " to " + Str(last) + " in " + name +
+                    ", which has " + Str(file.count()),
+                "Chart Display");
+  bars.FirstDataRec = CInt(first);
+  bars.LastDataRec = CInt(last);
+  LoadChartBars(file, options.period, options.volume == "on", run.session.current.Rec.RecType,
+                bars);
+}
+
+int Bars(const CommandLine& line, const BarsOptions& options) {
+  Run run(line);
+  run.Open();
+  run.Locate(options.code);
+  ChartBars bars;
+  try {
+    LoadSlice(run, options, bars);
+  } catch (const RunTimeError& e) {
+    run.AbandonFile(e, run.DataFileName(), bars.CurrentDataRec);
+  }
+  Table table("Bar Date Open High Low Close Volume SourceRec");
+  for (std::int32_t i = 0; i <= bars.BarCount; ++i) {
+    const ChartBar& bar = bars[size_t(i)];
+    table.Number(i).Text(bar.date()).Number(bar.Open).Number(bar.High).Number(bar.Low);
+    table.Number(bar.Close).Number(bar.Volume).Number(bar.SourceRec).EndRow();
+  }
+  const auto figure = [](const char* name, auto value) {
+    return std::string(" ") + name + "=" + Str(value);
+  };
+  table.Note((figure("BarCount", std::int32_t(bars.BarCount)) +
+              figure("FirstDataRec", std::int32_t(bars.FirstDataRec)) +
+              figure("LastDataRec", std::int32_t(bars.LastDataRec)) +
+              figure("ChartHigh", bars.ChartHigh) + figure("ChartLow", bars.ChartLow) +
+              figure("VolMax", bars.VolMax) + figure("VolMin", bars.VolMin) +
+              figure("VolAvg", bars.VolAvg) +
+              " VolumeShown=" + (bars.VolumeShown ? "True" : "False"))
+                 .substr(1));
+  table.Print();
+  return kDone;
+}
+
+}  // namespace
+
+void AddBars(CLI::App& app, CommandLine& line) {
+  const auto options = std::make_shared<BarsOptions>();
+  CLI::App* command = app.add_subcommand("bars", "Show the bars of a slice of a price file");
+  command->add_option("CODE", options->code, "Code of the security, in any case")->required();
+  AddPeriod(*command, options->period);
+  command->add_option("--first", options->first, "First record (default: 1)");
+  command->add_option("--last", options->last, "Last record (default: the last of the file)");
+  AddVolume(*command, options->volume);
+  command->callback([&line, options] { line.run = [&line, options] { return Bars(line, *options); }; });
+}
+
+}  // namespace kora

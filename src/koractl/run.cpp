@@ -1,0 +1,82 @@
+#include "koractl/run.h"
+
+#include <filesystem>
+
+#include "base/numbers.h"
+#include "base/runtime_error.h"
+#include "base/text.h"
+
+namespace kora {
+namespace {
+
+std::string HomeOf(const CommandLine& line) {
+  const std::string home = line.home.empty() ? DefaultHome() : line.home;
+  std::error_code error;
+  const auto path = std::filesystem::absolute(home, error);
+  return error ? home : path.lexically_normal().string();
+}
+
+}  // namespace
+
+Run::Run(const CommandLine& line) : dialogs(line.answer), session(HomeOf(line), dialogs) {
+  for (const std::string& text : line.sets) {
+    const size_t dot = text.find('.');
+    const size_t equals = text.find('=');
+    if (dot == std::string::npos || equals == std::string::npos || dot == 0 || equals < dot + 2)
+      throw UsageError("--set: \"" + text + "\" is no SECTION.KEY=VALUE");
+    session.ini.Override(text.substr(0, dot), text.substr(dot + 1, equals - dot - 1),
+                         text.substr(equals + 1));
+  }
+}
+
+void Run::Abandon(std::string_view text, std::string_view title) {
+  dialogs.Message(text, title);
+  throw Abandoned();
+}
+
+void Run::Open(const std::string& words) {
+  const Files& files = session.files;
+  if (!files.CheckFile(session.ini.path()) || files.IsFolder(session.ini.path()))
+    Abandon("There is no Kora.ini in " + files.home() +
+                ". Make an installation there with the command init or demo.",
+            "KORA");
+  if (!ReadAllSettings(session, words, false)) throw Abandoned();
+}
+
+void Run::Locate(const std::string& code) {
+  session.current.CurrentCode = Trim(code);
+  try {
+    if (!LocateCurrentCode(session.files, dataPath(), dialogs, session.current)) throw Abandoned();
+  } catch (const RunTimeError& e) {
+    AbandonFile(e, "Names.dat");
+  }
+}
+
+std::string Run::DataFileName() const {
+  return CodeFileName(session.current.Rec.Code.trimmed(), ".WDT");
+}
+
+void Run::AbandonFile(const RunTimeError& error, std::string_view file, std::int32_t record) {
+  std::string text;
+  switch (error.number()) {
+    case kBadCall:
+    case kOverflow:
+      text = "There is a problem with the data for " + std::string(file);
+      if (record != 0) text += "\n at Rec Number (" + Str(record) + ") ";
+      text += "\nUse View/Modify Data procedure to correct.";
+      break;
+    case kBadFileName:
+    case kFileNotFound:
+    case kBadRecordNumber:
+    case kPathAccess:
+    case kPathNotFound:
+      text = "There is a problem with " + std::string(file) + " Cannot find or open";
+      break;
+    default:
+      text = "There is an unexpected error No. " + Str(std::int32_t(error.number())) + "\n" +
+             error.what();
+  }
+  Abandon(text, "KORA");
+}
+
+}  // namespace kora

@@ -1,0 +1,40 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "koractl/command.h"
+#include "platform/headless/console_dialogs.h"
+#include "shell/session.h"
+#include "store/price_rec.h"
+
+namespace kora {
+
+// One run on the home of the command line.
+struct Run {
+  // Nothing is read yet. Usage errors for an override that is no SECTION.KEY=VALUE.
+  explicit Run(const CommandLine& line);
+
+  ConsoleDialogs dialogs;
+  Session session;
+
+  // Shows the message and ends the operation.
+  [[noreturn]] void Abandon(std::string_view text, std::string_view title);
+
+  // Reads the settings. A home without a settings file ends the operation. `words` are
+  // command-line words of the program.
+  void Open(const std::string& words = "");
+
+  const std::string& dataPath() const { return session.settings.paths.CurrentDataPath; }
+
+  // Finds the security, in any case, or ends the operation: session.current is set.
+  void Locate(const std::string& code);
+  // "BHP.WDT" of the security found.
+  std::string DataFileName() const;
+  // Ends the operation in the words that a chart has for a failure with its price file.
+  // `record`: the record being read, 0 none.
+  [[noreturn]] void AbandonFile(const RunTimeError& error, std::string_view file,
+                                std::int32_t record = 0);
+};
+
+}  // namespace kora
