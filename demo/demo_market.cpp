@@ -99,7 +99,7 @@ class DemoWriter {
         counts_(options.securities),
         days_(options.years, kWaitingDays),
         progress_(dialogs.StartProgress("Demo market")) {
-    SetDefaultPaths(paths_, "C:");
+    SetDefaultPaths(paths_, "c:");
   }
 
   bool Run(SettingsFile& ini, SettingsFile& user);
@@ -451,7 +451,7 @@ bool DemoWriter::Run(SettingsFile& ini, SettingsFile& user) {
 // A home with a market of its own is never written over.
 void RefuseUsedHome(const Files& files, const SettingsFile& ini) {
   Paths paths;
-  SetDefaultPaths(paths, "C:");
+  SetDefaultPaths(paths, "c:");
   bool used = ini.Exists() || files.CheckFile(NameFilePath(paths.CurrentDataPath));
   if (!used && files.IsFolder(paths.CurrentDataPath))
     for (const std::string& name : files.List(paths.CurrentDataPath))
