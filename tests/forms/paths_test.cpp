@@ -266,8 +266,8 @@ TEST_F(LocateTest, EnterGoesIntoTheFolderAndSaveTakesIt) {
   EXPECT_EQ(Find<QLabel>(form.get(), "Label3(0)")->text(), "c:\\korawin\\data\\");
   EXPECT_TRUE(form->isVisible()) << "Enter in the list does not save";
   QTest::keyClick(form.get(), Qt::Key_S, Qt::AltModifier);
+  EXPECT_TRUE(WaitFor([&] { return !form->isVisible(); }));  // the button shows its press first
   EXPECT_EQ(result, "c:\\korawin\\data\\");
-  EXPECT_FALSE(form->isVisible());
 }
 
 TEST_F(LocateTest, EscapeTakesNothing) {
