@@ -174,7 +174,7 @@ std::string ReadDate(std::string_view text, ImportDates form) {
     if (dashed)
       date = ParseFileDate(std::string(text.substr(0, 4)) + std::string(text.substr(5, 2)) +
                            std::string(text.substr(8, 2)));
-  } else if (text.size() > 5 && text[text.size() - 5] == '/') {  // four digits of the year
+  } else if (text.rfind('/') + 5 == text.size()) {  // four digits of the year
     date = ParseUserDate(text);
   }
   if (!date) throw BadRow("the Date " + Shown(text) + " is no date in the form " + wanted);
