@@ -7,11 +7,13 @@
 #include "store/name_rec.h"
 #include "tests/support/error_of.h"
 #include "tests/support/failing_io.h"
+#include "tests/support/mutate.h"
 #include "tests/support/temp_home.h"
 
 using namespace kora;
 using kora::test::ErrorOf;
 using kora::test::FailingIo;
+using kora::test::Mutator;
 using kora::test::TempHome;
 
 namespace {
@@ -245,6 +247,23 @@ TEST(ChartListTest, CheckWithoutANameFileLeavesEveryList) {
   f.Put("SubListA.Dat", Record(9, "AAA"));
   EXPECT_EQ(ErrorOf([&] { CheckAllLists(f.home.files(), f.dataPath); }), kFileNotFound);
   EXPECT_EQ(f.Get("SubListA.Dat"), Record(9, "AAA"));
+}
+
+TEST(ChartListTest, DamagedListsAreMendedByACheck) {
+  ListFixture f;
+  f.Names({"AAA", "BHP", "WOW"});
+  const std::string good = Record(1, "AAA") + Record(2, "BHP") + Record(3, "WOW");
+  Mutator(9).Run({good, good + good, Record(-1, "AAA"), ""}, 150, [&](const std::string& bytes) {
+    f.Put("SubListA.Dat", bytes);
+    ASSERT_EQ(f.Read(2).size(), bytes.size() / 8);
+    CheckAllLists(f.home.files(), f.dataPath);
+    for (const ListRec& rec : f.Read(2)) {
+      ASSERT_GE(rec.ListRecNo, 1);
+      ASSERT_LE(rec.ListRecNo, 3);
+      const std::string_view codes[] = {"AAA   ", "BHP   ", "WOW   "};
+      ASSERT_EQ(rec.ListCode.raw(), codes[rec.ListRecNo - 1]);
+    }
+  });
 }
 
 TEST(ChartListTest, CodesAreAddedOnceInUpperCase) {
