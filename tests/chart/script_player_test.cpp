@@ -61,8 +61,8 @@ std::string AsPlayed(const std::string& op) {
   };
   change("^line dot (\\d+),50,\\1,429 35$", "line dot $1,45,$1,434 35");
   change("^line solid 42,(\\d+),37,\\1 16$", "line solid 42,$1,35,$1 16");
-  change("^text 8 44,27 DAILY - ARITHMETIC - 27$", "text 8 44,33 DAILY-ARITHMETIC- 27");
-  change("^text 8 b ", "text 8 ");
+  change("^text 8.25 44,27 DAILY - ARITHMETIC - 27$", "text 8.25 44,33 DAILY-ARITHMETIC- 27");
+  change("^text 8.25 b ", "text 8.25 ");
   return out;
 }
 

@@ -119,7 +119,7 @@ class ChartGoldenTest : public testing::TestWithParam<GoldenChart> {
     paths.CurrentDataPath = "c:\\korawin\\data\\";
     FontSettings fonts;
     fonts.TitleSize = 9.75;
-    fonts.Font2Size = 8.25;
+    fonts.Font2Size = 6;
     ChartColours colours;
     LoadColours(market_->home().files(), paths.SystemPath, "Black", colours);
     Composition chart;
