@@ -63,9 +63,11 @@ Logo::Logo(Session& session, std::string commandLine)
   const int margin = fontMetrics().height() * 2;
   column->setContentsMargins(margin, margin, margin, margin);
 
-  timer2_.setSingleShot(true);
-  timer2_.setInterval(600);
-  timer2_.callOnTimeout(this, [this] { Timer(); });
+  timer2_ = new QTimer(this);
+  timer2_->setObjectName("Timer2");
+  timer2_->setSingleShot(true);
+  timer2_->setInterval(600);
+  timer2_->callOnTimeout(this, [this] { Timer(); });
 }
 
 void Logo::ScaleToScreen() {
@@ -98,7 +100,7 @@ bool Logo::Start(bool previous) {
     return false;
   }
   session_.dialogs.Yield();
-  timer2_.start();
+  timer2_->start();
   return true;
 }
 
