@@ -340,6 +340,33 @@ TEST(ShowSavedChartTest, FileOfFiftyMegabytesIsRefusedUnread) {
   EXPECT_EQ(f.surface.ops, (Ops{"cls"}));
 }
 
+TEST(ScriptPlayerTest, MoreDrawingThanAnyChartNeedsEndsThePlay) {
+  const auto repeat = [](const std::string& line, int times) {
+    std::string out;
+    while (times-- > 0) out += line;
+    return out;
+  };
+  PlayerFixture f;
+  // A whole surface is 638 * 452 / 40 = 7,209 and ten more; 200 million hold 27,703 of them.
+  const std::string fill = "F,-5000,0,5000,452,1\r\n";
+  EXPECT_TRUE(f.Play(repeat(fill, 27703)));
+  EXPECT_FALSE(f.Play(repeat(fill, 27704)));
+  EXPECT_EQ(f.surface.ops.size(), 27703u);
+  // Dashes over width and height are 4 * 1,090 and ten.
+  const std::string dash = "D,-2000000000,0,2000000000,452,1\r\n";
+  EXPECT_TRUE(f.Play(repeat(dash, 45766)));
+  EXPECT_FALSE(f.Play(repeat(dash, 45767)));
+  EXPECT_FALSE(f.Play(repeat("T,8,1,2," + std::string(4000, 'a') + ",1\r\n", 1300)));
+}
+
+TEST(ScriptPlayerTest, ScriptOfManyFontSizesEndsThere) {
+  PlayerFixture f;
+  std::string script;
+  for (int i = 0; i < 33; ++i) script += "T," + std::to_string(8 + i) + ",1,2,A,5\r\n";
+  EXPECT_FALSE(f.Play(script));
+  EXPECT_EQ(f.surface.ops.size(), 32u);
+}
+
 TEST(ShowSavedChartTest, FolderInPlaceOfAFileGivesTheFormatMessage) {
   SavedFixture f;
   f.home.Put("drive_c/saved.cht/inside", "L,1,2,3,4,5\r\n");
