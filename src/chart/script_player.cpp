@@ -15,14 +15,14 @@
 namespace kora {
 namespace {
 
-// The longest a chart of all panels over 32,767 records gets, with room to spare.
+// Far above any chart of ours; what is larger is not worth reading.
 constexpr std::uint64_t kLargestSavedChart = 16u << 20;
 constexpr double kLargestFont = 500;
 constexpr size_t kMostFontSizes = 32;  // a chart has a handful
 
 // What one play may draw, in units of a solid line's length, about ten nanoseconds each on a
-// picture in memory. The longest of charts needs a twentieth of it; a hostile script would keep
-// the window busy for minutes.
+// picture in memory: far more than a chart needs, where a hostile script would keep the window
+// busy for minutes.
 constexpr double kMostWork = 2e8;
 constexpr double kWorkOfCommand = 10, kWorkOfText = 500, kWorkOfCharacter = 40;
 constexpr double kDashedFactor = 4, kFilledUnitsPerWork = 40;
