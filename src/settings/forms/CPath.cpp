@@ -126,7 +126,7 @@ bool CPath::eventFilter(QObject* object, QEvent* event) {
     field->setPalette(colours);
   } else if (field && event->type() == QEvent::FocusOut) {
     field->setPalette(QPalette());
-    field->setText(QString::fromStdString(WithBackslash(field->text().toStdString())));
+    field->setText(QString::fromStdString(Entered(field->text())));
   }
   return QDialog::eventFilter(object, event);
 }

@@ -1,8 +1,8 @@
 #include "settings/forms/Locate.h"
 
 #include <QComboBox>
-#include <QDialogButtonBox>
 #include <QGridLayout>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QListWidget>
 #include <QPushButton>
@@ -70,8 +70,9 @@ Locate::Locate(const Files& files, Dialogs& dialogs, const LocateCase& what,
 
   connect(drive1_, &QComboBox::textActivated, this,
           [this](const QString& drive) { ShowFolder(drive.toStdString() + "\\"); });
-  connect(dir1_, &QListWidget::itemActivated, this,
+  connect(dir1_, &QListWidget::itemDoubleClicked, this,
           [this](QListWidgetItem* item) { Enter(item->text()); });
+  dir1_->installEventFilter(this);
   connect(save, &QPushButton::clicked, this, [this] { Save(); });
   connect(close, &QPushButton::clicked, this, &QDialog::reject);
 }
@@ -91,6 +92,18 @@ void Locate::ShowFolder(const std::string& folder) {
 
 void Locate::Enter(const QString& name) {
   ShowFolder(name == ".." ? ParentFolder(folder_) : folder_ + name.toStdString() + "\\");
+}
+
+// Enter in the list goes into the folder and does not press the default button.
+bool Locate::eventFilter(QObject* object, QEvent* event) {
+  if (object == dir1_ && event->type() == QEvent::KeyPress && dir1_->currentItem()) {
+    const int key = static_cast<QKeyEvent*>(event)->key();
+    if (key == Qt::Key_Return || key == Qt::Key_Enter) {
+      Enter(dir1_->currentItem()->text());
+      return true;
+    }
+  }
+  return QDialog::eventFilter(object, event);
 }
 
 void Locate::Save() {

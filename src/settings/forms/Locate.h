@@ -19,6 +19,9 @@ class Locate : public QDialog {
   Locate(const Files& files, Dialogs& dialogs, const LocateCase& what,
          std::function<void(const std::string&)> saved, QWidget* parent);
 
+ protected:
+  bool eventFilter(QObject* object, QEvent* event) override;
+
  private:
   void ShowFolder(const std::string& folder);
   void Enter(const QString& name);

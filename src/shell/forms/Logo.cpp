@@ -6,6 +6,7 @@
 #include <QScreen>
 #include <QVBoxLayout>
 
+#include "base/runtime_error.h"
 #include "shell/main_menu.h"
 #include "shell/waiting_downloads.h"
 
@@ -63,9 +64,11 @@ Logo::Logo(Session& session, std::string commandLine)
   const int margin = fontMetrics().height() * 2;
   column->setContentsMargins(margin, margin, margin, margin);
 
-  timer2_.setSingleShot(true);
-  timer2_.setInterval(600);
-  timer2_.callOnTimeout(this, [this] { Timer(); });
+  timer2_ = new QTimer(this);
+  timer2_->setObjectName("Timer2");
+  timer2_->setSingleShot(true);
+  timer2_->setInterval(600);
+  timer2_->callOnTimeout(this, [this] { Timer(); });
 }
 
 void Logo::ScaleToScreen() {
@@ -92,13 +95,19 @@ bool Logo::Start(bool previous) {
   session_.dialogs.Yield();
 
   ScaleToScreen();
-  if (!ReadAllSettings(session_, commandLine_, true)) {
-    session_.dialogs.SetBusy(false);
-    close();
-    return false;
+  try {
+    if (!ReadAllSettings(session_, commandLine_, true)) {
+      session_.dialogs.SetBusy(false);
+      close();
+      return false;
+    }
+  } catch (const RunTimeError& e) {
+    // With a folder that can't be one the program stands all the same, so that it can be mended.
+    session_.dialogs.Message(std::string(e.what()) + "  " + session_.settings.paths.SystemPath,
+                             "KORA Charting 7F");
   }
   session_.dialogs.Yield();
-  timer2_.start();
+  timer2_->start();
   return true;
 }
 
@@ -111,7 +120,7 @@ void Logo::Timer() {
   raise();
   if (session_.settings.PathsMissing) {
     hide();
-    main_->OpenPaths();
+    if (!main_->OpenPaths()) return;
   }
   if (Update && AskForWaitingDownloads(session_.files, session_.settings.download,
                                        session_.dialogs))

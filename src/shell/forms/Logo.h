@@ -32,7 +32,7 @@ class Logo : public QWidget {
 
   Session& session_;
   std::string commandLine_;
-  QTimer timer2_;
+  QTimer* timer2_;
   std::unique_ptr<Main> main_;
 };
 
