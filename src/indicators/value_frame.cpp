@@ -1,5 +1,8 @@
 #include "indicators/value_frame.h"
 
+#include <cmath>
+
+#include "base/runtime_error.h"
 #include "indicators/osc_series.h"
 
 namespace kora {
@@ -8,7 +11,9 @@ ValueFrame::ValueFrame(const OscPanel& panel, double highest, double lowest) : l
   const double margin = ((panel.PanelBottom - panel.PanelTop) / 100.0) * 10.0;
   base_ = panel.PanelBottom - margin;
   const std::int16_t height = CInt(base_ - (panel.PanelTop + margin));
-  scale_ = ScaleOf(lowest < 0 ? highest - lowest : highest, height);
+  const double range = lowest < 0 ? highest - lowest : highest;
+  if (!std::isfinite(range)) throw RunTimeError(kOverflow);
+  scale_ = ScaleOf(range, height);
 }
 
 std::int16_t ValueFrame::Y(double value) const { return CInt(base_ - (value - lowest_) / scale_); }

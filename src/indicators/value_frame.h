@@ -13,6 +13,7 @@ namespace kora {
 // from zero to its highest, with lowest as the offset only.
 class ValueFrame {
  public:
+  // Error 6 for a range without bounds.
   ValueFrame(const OscPanel& panel, double highest, double lowest);
 
   // There is nothing to scale: the panel ends at its frame.
