@@ -311,6 +311,44 @@ TEST(ListingTest, ExactNameAsksTheHostForNothingButTheFile) {
   EXPECT_EQ(io.lists, 0);
 }
 
+TEST(ListingTest, FilesInAnotherCaseCostOneLookAtTheFolderEach) {
+  CountingIo io;
+  TempHome home(io);
+  for (int i = 0; i < 10; ++i) home.Put("drive_c/c" + std::to_string(i) + ".wdt", std::to_string(i));
+  SetModified(home.path() + "/drive_c", LongAgo());
+  EXPECT_EQ(home.files().ReadAll("c:\\C0.WDT"), "0");
+  io.stats = io.opens = 0;
+  for (int i = 1; i < 10; ++i)
+    EXPECT_EQ(home.files().ReadAll("c:\\C" + std::to_string(i) + ".WDT"), std::to_string(i));
+  EXPECT_EQ(io.opens, 9);
+  EXPECT_EQ(io.stats, 9);
+  EXPECT_EQ(io.lists, 1);
+}
+
+TEST(ListingTest, ExactNameThatAppearsBesideTheOtherCaseWins) {
+  TempHome home;
+  for (const char* name : {"a.wdt", "b.wdt"}) home.Put(std::string("drive_c/") + name, "lower");
+  SetModified(home.path() + "/drive_c", LongAgo());
+  EXPECT_EQ(home.files().ReadAll("c:\\A.WDT"), "lower");
+  EXPECT_EQ(home.files().ReadAll("c:\\B.WDT"), "lower");
+  home.Put("drive_c/A.WDT", "upper");
+  EXPECT_EQ(home.files().ReadAll("c:\\A.WDT"), "upper");
+  EXPECT_EQ(home.files().ReadAll("c:\\B.WDT"), "lower");
+  EXPECT_EQ(home.files().ReadAll("c:\\a.wdt"), "lower");
+}
+
+TEST(ListingTest, FileInAnotherCaseThatWentAwayIsError53) {
+  TempHome home;
+  home.Put("drive_c/a.wdt", "1");
+  home.Put("drive_c/b.wdt", "1");
+  SetModified(home.path() + "/drive_c", LongAgo());
+  EXPECT_EQ(home.files().ReadAll("c:\\A.WDT"), "1");
+  fs::rename(home.path() + "/drive_c/b.wdt", home.path() + "/drive_c/B.wdt");
+  EXPECT_EQ(home.files().ReadAll("c:\\B.WDT"), "1");
+  fs::remove(home.path() + "/drive_c/B.wdt");
+  EXPECT_EQ(ErrorOf([&] { home.files().ReadAll("c:\\B.WDT"); }), 53);
+}
+
 TEST(ListingTest, FolderReplacedByOneInAnotherCaseIsFound) {
   TempHome home;
   home.Put("drive_c/data/a.txt", "1");
