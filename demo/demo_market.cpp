@@ -99,7 +99,7 @@ class DemoWriter {
         counts_(options.securities),
         days_(options.years, kWaitingDays),
         progress_(dialogs.StartProgress("Demo market")) {
-    SetDefaultPaths(paths_, "C:");
+    SetDefaultPaths(paths_, "c:");
   }
 
   bool Run(SettingsFile& ini, SettingsFile& user);
@@ -232,8 +232,9 @@ NameRec DemoWriter::ShareRecord(int index, const ShareProfile& share,
   const int upTo = std::min(series.last(), days_.history - 1) - series.first;
   float low = series.records[size_t(upTo)].Close, high = low;
   for (int i = std::max(0, upTo - 250); i <= upTo; ++i) {
-    low = std::min(low, series.records[size_t(i)].Close);
-    high = std::max(high, series.records[size_t(i)].Close);
+    const float close = series.records[size_t(i)].Close;
+    low = std::min(low, close);
+    high = std::max(high, close);
   }
   if (index % 5 == 1) {
     rec.Base = FromThousandths(ToThousandths(double(low) * 0.85));
@@ -451,7 +452,7 @@ bool DemoWriter::Run(SettingsFile& ini, SettingsFile& user) {
 // A home with a market of its own is never written over.
 void RefuseUsedHome(const Files& files, const SettingsFile& ini) {
   Paths paths;
-  SetDefaultPaths(paths, "C:");
+  SetDefaultPaths(paths, "c:");
   bool used = ini.Exists() || files.CheckFile(NameFilePath(paths.CurrentDataPath));
   if (!used && files.IsFolder(paths.CurrentDataPath))
     for (const std::string& name : files.List(paths.CurrentDataPath))

@@ -74,7 +74,7 @@ struct TierFigures {
   double low, high;                   // prices that the share keeps to, roughly
 };
 constexpr TierFigures kTiers[] = {
-    {0.010, 1.00, 4.0e7, 0, 4.0, 48.0},
+    {0.010, 1.00, 4.0e7, 0, 4.0, 70.0},
     {0.015, 0.90, 3.0e6, 0.001, 0.8, 20.0},
     {0.023, 0.80, 3.0e5, 0.02, 0.12, 4.0},
     {0.038, 0.70, 4.0e4, 0.10, 0.008, 0.20},
@@ -118,9 +118,16 @@ Adjustment MakeAdjustment(Planned kind, int close, Random& random) {
 void Apply(const Adjustment& adjustment, std::vector<PriceRec>& records) {
   records[adjustment.record].AdjFactor = adjustment.factor;
   records[adjustment.record].AdjDesc.set(adjustment.text);
-  for (size_t i = 0; i <= adjustment.record; ++i)
-    for (float* price : {&records[i].Open, &records[i].High, &records[i].Low, &records[i].Close})
-      *price = float(Currency(double(*price) * double(adjustment.factor)).ToDouble());
+  const auto scaled = [&adjustment](float price) {
+    return float(Currency(double(price) * double(adjustment.factor)).ToDouble());
+  };
+  for (size_t i = 0; i <= adjustment.record; ++i) {
+    PriceRec& rec = records[i];
+    rec.Open = scaled(rec.Open);
+    rec.High = scaled(rec.High);
+    rec.Low = scaled(rec.Low);
+    rec.Close = scaled(rec.Close);
+  }
 }
 
 }  // namespace
@@ -161,7 +168,7 @@ Factors MakeFactors(const Days& days, std::uint64_t seed) {
     }
     // Long histories neither vanish nor reach the sky.
     trend *= 1.00025;
-    const double pull = Hold(0.0004 * (trend / level - 1), -0.0005, 0.0005);
+    const double pull = Hold(0.001 * (trend / level - 1), -0.0012, 0.0012);
     const double noise = cluster.Next(kRegimes[mood].volatility, random);
     const double move = Hold(kRegimes[mood].drift + pull + noise, -0.12, 0.10);
     level *= 1 + move;
@@ -170,14 +177,16 @@ Factors MakeFactors(const Days& days, std::uint64_t seed) {
   for (int s = 0; s < kSectors; ++s) {
     Random own(seed, 10 + std::uint64_t(s));
     Clustered clusters;
-    double drift = 0;
+    double drift = 0, relative = 1;
     int stay = 0;
     for (int day = 0; day < days.count(); ++day) {
       if (stay-- <= 0) {
         stay = 40 + own.Below(160);
         drift = own.Noise() * 0.0004;
       }
-      factors.sector[size_t(s)].push_back(drift + clusters.Next(0.006, own));
+      const double move = drift + 0.002 * (1 / relative - 1) + clusters.Next(0.006, own);
+      relative *= 1 + move;
+      factors.sector[size_t(s)].push_back(move);
     }
   }
   return factors;
@@ -213,7 +222,7 @@ ShareProfile MakeProfile(int index, int shares, const Days& days, Random& random
 
   // Most begin in the lower part of their range.
   const double place = random.Unit();
-  share.startPrice = figures.low + (figures.high - figures.low) * (0.1 + 0.5 * place * place);
+  share.startPrice = figures.low + (figures.high - figures.low) * (0.05 + 0.4 * place * place);
   share.issued = figures.turnover * random.Between(150, 500) / share.startPrice;
   return share;
 }
@@ -344,21 +353,19 @@ void MarketSums::AddDay(Sums& sums, int day, double units, const PriceRec& last,
 }
 
 void MarketSums::Add(const ShareProfile& share, const Series& series) {
+  // The prices are in the newest terms, so the shares on issue have to be.
+  double issued = share.issued;
+  for (const PriceRec& rec : series.records)
+    if (rec.AdjFactor != 0) issued /= double(rec.AdjFactor);
   for (size_t i = 1; i < series.records.size(); ++i) {
     const PriceRec& last = series.records[i - 1];
     const PriceRec& now = series.records[i];
     const int day = series.first + int(i);
-    AddDay(all_, day, share.issued, last, now);
-    AddDay(sectors_[size_t(share.sector)], day, share.issued, last, now);
+    AddDay(all_, day, issued, last, now);
+    AddDay(sectors_[size_t(share.sector)], day, issued, last, now);
     if (now.Close > last.Close) ++rises_[size_t(day)];
     if (now.Close < last.Close) ++falls_[size_t(day)];
   }
-}
-
-bool MarketSums::HasFullHistory(int sector) const {
-  const std::vector<double>& before = sectors_[size_t(sector)].before;
-  return before.size() > 1 && std::all_of(before.begin() + 1, before.end(),
-                                          [](double sum) { return sum > 0; });
 }
 
 Series MarketSums::Index(int sector, const Days& days) const {
@@ -381,8 +388,8 @@ Series MarketSums::MakeIndex(const Sums& sums, const Days& days) const {
     const double top = std::max(open, close), bottom = std::min(open, close);
     PriceRec rec = NewPriceRec(days.texts[d]);
     rec.Open = tenths(open);
-    rec.High = tenths(top + 0.4 * (sums.high[d] * scale - top));
-    rec.Low = tenths(bottom - 0.4 * (bottom - sums.low[d] * scale));
+    rec.High = tenths(top + 0.4 * std::max(0.0, sums.high[d] * scale - top));
+    rec.Low = tenths(bottom - 0.4 * std::max(0.0, bottom - sums.low[d] * scale));
     rec.Close = tenths(close);
     rec.Volume = ToVolume(sums.volume[d] / 1000);
     series.records.push_back(rec);

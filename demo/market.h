@@ -52,7 +52,7 @@ struct ShareProfile {
   int last = 0;          // last day; before the market's last for a share no longer quoted
   Planned planned = Planned::kNone;
   double startPrice = 1;
-  double issued = 1e6;   // shares on issue
+  double issued = 1e6;   // shares on issue at the start
 };
 ShareProfile MakeProfile(int index, int shares, const Days& days, Random& random);
 Series SimulateShare(const ShareProfile& share, const Factors& factors, const Days& days,
@@ -64,10 +64,10 @@ class MarketSums {
   explicit MarketSums(int days);
   void Add(const ShareProfile& share, const Series& series);
 
-  // Of one sector, or of all shares where `sector` is -1.
+  // Of one sector, or of all shares where `sector` is -1; 1000 points on the first day. The
+  // sector must have had a share on every day.
   Series Index(int sector, const Days& days) const;
   Series AdvanceDecline(const Days& days) const;
-  bool HasFullHistory(int sector) const;
 
  private:
   struct Sums {

@@ -94,22 +94,26 @@ Namer::Company Namer::Next(int sector) {
 // The word's first letter, then letters that few real codes have, so that a code hardly ever
 // means something else to the reader.
 std::string Namer::CodeFor(const std::string& word) {
-  static constexpr std::string_view kMiddle = "QZJXVKYWUGBFHPCDMNLRSTOIEA";
-  constexpr size_t kRare = 6;
-  const size_t start = used_ % kRare;
-  const std::string letters = UCase(word);
-  const std::string lasts = letters.substr(2) + "ABCDEFGHIJKLMNOPQRSTUVWXYZ";
-  // Any first letter will do once the word's own are all taken.
-  for (const char first : letters.substr(0, 1) + "ABCDEFGHIJKLMNOPQRSTUVWXYZ") {
-    for (size_t m = 0; m < kMiddle.size(); ++m) {
-      const char middle = kMiddle[m < kRare ? (start + m) % kRare : m];
+  static constexpr std::string_view kRare = "QZXJVK";
+  static constexpr std::string_view kLetters = "ABCDEFGHIJKLMNOPQRSTUVWXYZ";
+  const auto take = [this](char first, std::string_view middles, std::string_view lasts) {
+    for (size_t m = 0; m < middles.size(); ++m) {
+      const char middle = middles[(used_ + m) % middles.size()];
       for (const char last : lasts) {
         const std::string code = {first, middle, last};
-        if (IsFileCode(code) && codes_.insert(code).second) return code;
+        if (middle != last && IsFileCode(code) && codes_.insert(code).second) return code;
       }
     }
-  }
-  return {};  // never: there are more codes than securities
+    return std::string();
+  };
+  const std::string letters = UCase(word);
+  std::string code = take(letters[0], kRare, kRare);
+  if (code.empty()) code = take(letters[0], kRare, letters.substr(2));
+  // A market of thousands takes what is left.
+  if (code.empty()) code = take(letters[0], kLetters, kLetters);
+  for (size_t i = 0; code.empty() && i < kLetters.size(); ++i)
+    code = take(kLetters[i], kLetters, kLetters);
+  return code;
 }
 
 }  // namespace kora::demo

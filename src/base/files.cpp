@@ -176,7 +176,7 @@ void Files::Note(const std::string& host, bool added, std::int64_t before) const
 
 std::string Files::ResolveFolder(std::string_view dosFolder) const {
   const auto known = folders_.find(dosFolder);
-  if (known != folders_.end()) return known->second;
+  if (known != folders_.end()) return known->second.host;
 
   std::string host;
   const DosParts parts = SplitDrive(dosFolder.empty() ? std::string_view("c:\\") : dosFolder);
@@ -198,7 +198,7 @@ std::string Files::ResolveFolder(std::string_view dosFolder) const {
     host = std::move(next);
   }
   // A folder that is not there yet may come in another case.
-  if (Modified(host) >= 0) folders_.emplace(dosFolder, host);
+  if (Modified(host) >= 0) folders_.emplace(dosFolder, Known{host});
   return host;
 }
 
@@ -251,19 +251,42 @@ bool Files::IsFolder(std::string_view path) const {
   }
 }
 
+// Nothing where the name has to be looked for.
+std::unique_ptr<HostFile> Files::OpenInKnown(Known& known, std::string_view name,
+                                             OpenMode mode) const {
+  if (name.find('\0') != std::string_view::npos) throw RunTimeError(kBadFileName);
+  std::string host = Join(known.host, name);
+  if (known.otherCase) {
+    // Where one file is in another case the next one is too: the listing is asked first. It
+    // can't be wrong about the exact name, which would win, when it is sure.
+    const Folder* folder = FolderFor(known.host);
+    if (folder && folder->sure && !folder->twins) {
+      const auto it = folder->entries.find(LCase(name));
+      if (it != folder->entries.end())
+        host.replace(host.size() - name.size(), name.size(), it->second);
+    }
+    known.otherCase = !host.ends_with(name);
+  }
+  try {
+    return io_.Open(host, mode);
+  } catch (const RunTimeError& e) {
+    if (e.number() != kFileNotFound && e.number() != kPathNotFound) throw;
+    return nullptr;
+  }
+}
+
 std::unique_ptr<HostFile> Files::Open(std::string_view path, OpenMode mode) const {
   const auto [folder, name] = SplitName(path);
   if (name.empty()) throw RunTimeError(kBadFileName);
   if (mode == OpenMode::kRead || mode == OpenMode::kReadWrite) {
     if (const auto known = folders_.find(folder); known != folders_.end()) {
-      if (name.find('\0') != std::string_view::npos) throw RunTimeError(kBadFileName);
-      try {
-        return io_.Open(Join(known->second, name), mode);
-      } catch (const RunTimeError& e) {
-        if (e.number() != kFileNotFound && e.number() != kPathNotFound) throw;
-      }
+      if (auto file = OpenInKnown(known->second, name, mode)) return file;
     }
-    return io_.Open(Locate(path, false), mode);
+    const std::string host = Locate(path, false);
+    auto file = io_.Open(host, mode);
+    if (const auto known = folders_.find(folder); known != folders_.end())
+      known->second.otherCase = !host.ends_with(name);
+    return file;
   }
   const std::string host = Locate(path, true);
   const std::int64_t before = Modified(FolderOf(host));

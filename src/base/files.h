@@ -63,7 +63,13 @@ class Files {
     using is_transparent = void;
   };
 
+  struct Known {
+    std::string host;
+    bool otherCase = false;  // the file last opened there is in another case than asked for
+  };
+
   std::string Locate(std::string_view path, bool making) const;
+  std::unique_ptr<HostFile> OpenInKnown(Known& known, std::string_view name, OpenMode mode) const;
   Folder* ReadFolder(const std::string& host, std::int64_t modified) const;
   Folder* FolderFor(const std::string& host) const;
   const std::string* FindEntry(const std::string& hostFolder, std::string_view name,
@@ -75,7 +81,7 @@ class Files {
   std::string home_;
   Io& io_;
   // DOS folder -> host folder, of folders that were there when they were looked for.
-  mutable std::unordered_map<std::string, std::string, TextHash, std::equal_to<>> folders_;
+  mutable std::unordered_map<std::string, Known, TextHash, std::equal_to<>> folders_;
   mutable std::unordered_map<std::string, std::unique_ptr<Folder>> listings_;
 };
 

@@ -190,7 +190,7 @@ void Composer::DrawTitle() {
   if (const std::string other = FromAnsi(name.OtherDetails.trimmed()); !other.empty()) {
     const double y = services_.price.CurrentY();
     const std::string text = std::string(15, ' ') + other;
-    pen_.Text('T', font, {ChartCanvas::kSmallText, 20, y, text, canvas_.colour(kChartTitle)});
+    canvas_.SmallText(20, y, text, canvas_.colour(kChartTitle));
   }
 }
 

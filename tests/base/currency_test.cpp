@@ -30,11 +30,11 @@ TEST(CurrencyTest, WholeNumbersAreExact) {
 }
 
 TEST(CurrencyTest, LeavingTheRangeIsError6) {
-  EXPECT_EQ(ErrorOf([] { Currency(922337203685477.0); }), 0);
-  EXPECT_EQ(ErrorOf([] { Currency(922337203685478.0); }), 6);
-  EXPECT_EQ(ErrorOf([] { Currency(-922337203685479.0); }), 6);
-  EXPECT_EQ(ErrorOf([] { Currency(std::nan("")); }), 6);
-  EXPECT_EQ(ErrorOf([] { Currency{HUGE_VAL}; }), 6);
+  EXPECT_EQ(ErrorOf([] { (void)Currency{922337203685477.0}; }), 0);
+  EXPECT_EQ(ErrorOf([] { (void)Currency{922337203685478.0}; }), 6);
+  EXPECT_EQ(ErrorOf([] { (void)Currency{-922337203685479.0}; }), 6);
+  EXPECT_EQ(ErrorOf([] { (void)Currency{std::nan("")}; }), 6);
+  EXPECT_EQ(ErrorOf([] { (void)Currency{HUGE_VAL}; }), 6);
 }
 
 TEST(CurrencyTest, SumOutOfRangeIsError6AndLeavesTheSum) {

@@ -85,7 +85,7 @@ TEST(DateFormsTest, ShortInputGivesShortParts) {
   EXPECT_EQ(DateToDisplay(""), "//");
   EXPECT_EQ(DateToDisplay("19990"), "/0/1999");
   EXPECT_EQ(DateToDisplay("1999013"), "3/01/1999");
-  EXPECT_EQ(DateToFile("1/2/99"), "91/");  // nothing from 7, "9" from 4, "1/" from 1
+  EXPECT_EQ(DateToFile("1/2/99"), "/91/");  // nothing from place 7, "/9" from 4, "1/" from 1
   EXPECT_EQ(DateToFile(""), "");
   EXPECT_EQ(DateToShort(""), "--");
   EXPECT_EQ(DateToShort("199"), "--9");

@@ -22,6 +22,14 @@ int ErrorOf(void (*work)()) {
 
 }  // namespace
 
+TEST(ParseFloatTest, TakesWholeNumbersTextsAlone) {
+  EXPECT_EQ(ParseFloat("2.1936"), 2.1936f);
+  EXPECT_EQ(ParseFloat("-5"), -5.0f);
+  EXPECT_EQ(ParseFloat("1e3"), 1000.0f);
+  for (const char* text : {"", " 1", "1 ", "1x", "x", "nan", "inf", "-inf", "1e39", "1e-60", "0x1", "1,5"})
+    EXPECT_FALSE(ParseFloat(text).has_value()) << text;
+}
+
 TEST(CIntTest, RoundsHalvesToEven) {
   EXPECT_EQ(CInt(0.5), 0);
   EXPECT_EQ(CInt(1.5), 2);

@@ -15,7 +15,9 @@ TEST(AnsiTest, EveryByteOfTheCodePageComesBack) {
     } else {
       EXPECT_EQ(ToAnsi(utf8), byte) << b;
     }
-    if (b < 0x80) EXPECT_EQ(utf8, byte) << b;
+    if (b < 0x80) {
+      EXPECT_EQ(utf8, byte) << b;
+    }
     // From A0 the code page is Latin-1: two bytes, C2 or C3 in front.
     if (b >= 0xA0) {
       const std::string two{char(b < 0xC0 ? 0xC2 : 0xC3), char(b < 0xC0 ? b : b - 0x40)};

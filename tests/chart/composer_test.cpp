@@ -53,7 +53,7 @@ TEST(ComposerTest, OrderOfThePartsOfAChart) {
                        "T,8.25,380,2,Last date",              // end texts
                        "T,8.25,380,20,Closing",
                        "Z,7,601,35,KORA,27",                  // stamp
-                       "L,42,151,44,151,20"};                 // first average
+                       "L,42,163,44,163,20"};                 // first average
   const Lines script = f.Script();
   size_t at = 0;
   for (const std::string& want : order) {

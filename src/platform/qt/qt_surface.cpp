@@ -15,6 +15,7 @@ namespace {
 
 constexpr double kUnitsPerInch = 96;
 constexpr size_t kTextsKept = 512;
+constexpr size_t kFacesKept = 64;  // a chart needs a handful; a hostile script names thousands
 constexpr double kMostPixels = 20000;
 
 bool Finite(double a, double b, double c, double d) {
@@ -100,6 +101,7 @@ QtSurface::Face& QtSurface::face() const {
   made->qtAscent = metrics.ascent();
   made->ascent = made->standard ? StandardAscent(font_) : metrics.ascent();
   made->height = made->standard ? StandardTextHeight(font_) : std::ceil(metrics.height());
+  if (faces_.size() >= kFacesKept) faces_.clear();
   faces_.push_back(std::move(made));
   return *(face_ = faces_.back().get());
 }

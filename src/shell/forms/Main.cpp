@@ -1,0 +1,272 @@
+#include "shell/forms/Main.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QCloseEvent>
+#include <QDesktopServices>
+#include <QMdiArea>
+#include <QMdiSubWindow>
+#include <QMenu>
+#include <QMenuBar>
+#include <QScreen>
+#include <QStyle>
+#include <QUrl>
+
+#include "base/numbers.h"
+#include "base/runtime_error.h"
+#include "shell/forms/AbtKora.h"
+#include "shell/forms/HelpWindow.h"
+#include "shell/main_menu.h"
+
+namespace kora {
+namespace {
+
+constexpr std::string_view kTitle = "KORA Charting 7F";
+constexpr int kTwipsPerPixel = 15;
+
+QString ToQt(std::string_view text) {
+  return QString::fromUtf8(text.data(), qsizetype(text.size()));
+}
+
+}  // namespace
+
+Main::Main(Session& session, std::string commandLine)
+    : session_(session), commandLine_(std::move(commandLine)), mdi_(new QMdiArea(this)) {
+  setObjectName("Main");
+  mdi_->setObjectName("MDI");
+  mdi_->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
+  mdi_->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
+  mdi_->viewport()->installEventFilter(this);
+  setCentralWidget(mdi_);
+  BuildMenu();
+  SetOpeners();
+  EnableMenus();
+  TakeSize();
+  SetTitle();
+}
+
+void Main::BuildMenu() {
+  std::map<std::string_view, QMenu*> menus;
+  const auto entries = MainMenu();
+  for (const MenuEntry& entry : entries) {
+    const bool isMenu = std::any_of(entries.begin(), entries.end(), [&](const MenuEntry& other) {
+      return other.parent == entry.name;
+    });
+    if (isMenu) {
+      QMenu* menu = entry.parent.empty() ? menuBar()->addMenu(ToQt(entry.caption))
+                                         : menus[entry.parent]->addMenu(ToQt(entry.caption));
+      menu->setObjectName(ToQt(entry.name));
+      menu->menuAction()->setObjectName(ToQt(entry.name));
+      menus[entry.name] = menu;
+      continue;
+    }
+    QAction* action = menus[entry.parent]->addAction(ToQt(entry.caption));
+    action->setObjectName(ToQt(entry.name));
+    action->setMenuRole(QAction::NoRole);
+    connect(action, &QAction::triggered, this,
+            [this, name = std::string(entry.name)] { Open(name); });
+  }
+  menus["mnuFile"]->insertSeparator(findChild<QAction*>("mnuExit"));
+}
+
+void Main::SetOpeners() {
+  SetOpener("mnuChartDisplay", [this] { OpenCharts(); });
+  SetOpener("mnuPaths", [this] { OpenPaths(); });
+  SetOpener("mnuExit", [this] { EndProgram(); });
+  SetOpener("mnuPntCol", [this] { AskPrinter(); });
+  SetOpener("mnuSnap", [this] { RunSibling("Quickpeek.EXE"); });
+  SetOpener("mnuMMAScan", [this] { RunSibling("Mmascan.EXE"); });
+  SetOpener("mnSHlp", [this] { OpenHelp(); });
+  SetOpener("mnuAboutKora", [this] {
+    auto* about = new AbtKora(this);
+    about->setAttribute(Qt::WA_DeleteOnClose);
+    about->open();
+  });
+}
+
+void Main::SetOpener(const std::string& entry, std::function<void()> open) {
+  openers_[entry] = std::move(open);
+  EnableMenus();
+}
+
+// The one place where what goes wrong in an entry's work is told.
+void Main::Open(const std::string& entry) {
+  const auto opener = openers_.find(entry);
+  if (opener == openers_.end() || !opener->second) return;
+  try {
+    opener->second();
+  } catch (const RunTimeError& e) {
+    session_.dialogs.Message(e.what(), kTitle);
+  }
+}
+
+void Main::DisableMenus() {
+  longTask_ = true;
+  for (const MenuEntry& entry : MainMenu())
+    if (DisabledByLongTask(entry.name))
+      findChild<QMenu*>(ToQt(entry.name))->menuAction()->setEnabled(false);
+}
+
+void Main::EnableMenus() {
+  longTask_ = false;
+  for (const MenuEntry& entry : MainMenu()) {
+    const EntryState state =
+        MenuEntryState(entry.name, session_.settings.download, session_.settings.words);
+    if (auto* menu = findChild<QMenu*>(ToQt(entry.name))) {
+      menu->menuAction()->setEnabled(state.enabled);
+      continue;
+    }
+    auto* action = findChild<QAction*>(ToQt(entry.name));
+    action->setVisible(state.visible);
+    action->setEnabled(state.enabled && openers_.count(std::string(entry.name)) != 0);
+  }
+  // A submenu of greyed entries alone is greyed too.
+  for (const MenuEntry& entry : MainMenu()) {
+    auto* menu = findChild<QMenu*>(ToQt(entry.name));
+    if (!menu || entry.parent.empty()) continue;
+    const auto actions = menu->actions();
+    menu->menuAction()->setEnabled(std::any_of(actions.begin(), actions.end(),
+                                               [](QAction* a) { return a->isEnabled(); }));
+  }
+}
+
+void Main::SetTitle() {
+  setWindowTitle(QString::fromStdString(MainTitle(session_.settings.paths)));
+  if (chts_) chts_->RefreshTitle();
+}
+
+void Main::TakeSize() {
+  const MainSize size =
+      MainWindowSize(session_.UserSetting("Height"), session_.UserSetting("Width"));
+  // The standing size is that of a small screen, and grows with it.
+  const double growH = size.heightKept ? 1 : session_.settings.ScreenScaleH;
+  const double growW = size.widthKept ? 1 : session_.settings.ScreenScaleW;
+  const QRect room = screen()->availableGeometry();
+  const QSize wanted(int(size.width * growW / kTwipsPerPixel),
+                     int(size.height * growH / kTwipsPerPixel));
+  const int frame = style()->pixelMetric(QStyle::PM_TitleBarHeight);
+  resize(wanted.boundedTo(room.size() - QSize(0, frame)));
+  const FormPlace place = CentreForm(room.width(), room.height(), width(), height());
+  move(room.topLeft() + QPoint(std::max(place.left, 0), std::max(place.top, 0)));
+}
+
+void Main::KeepSize() {
+  const QSize size = isMaximized() || isFullScreen() ? normalGeometry().size() : this->size();
+  session_.SaveUserSetting("Height", Str(std::int32_t(size.height() * kTwipsPerPixel)));
+  session_.SaveUserSetting("Width", Str(std::int32_t(size.width() * kTwipsPerPixel)));
+}
+
+void Main::OpenCharts() {
+  if (chts_) {
+    mdi_->setActiveSubWindow(qobject_cast<QMdiSubWindow*>(chts_->parentWidget()));
+    chts_->setFocus();
+    return;
+  }
+  chts_ = new Chts({.files = session_.files,
+                    .dialogs = session_.dialogs,
+                    .settings = session_.settings,
+                    .colours = session_.colours,
+                    .current = session_.current});
+  QMdiSubWindow* frame = mdi_->addSubWindow(chts_);
+  frame->setAttribute(Qt::WA_DeleteOnClose);
+  frame->setGeometry(mdi_->viewport()->rect());
+  frame->show();
+  chts_->setFocus();
+  // With the layout done the picture has its size.
+  QApplication::sendPostedEvents();
+  if (chts_) chts_->Start();
+}
+
+void Main::OpenPaths() {
+  if (cpath_) {
+    cpath_->activateWindow();
+    return;
+  }
+  cpath_ = new CPath({.ini = session_.ini,
+                      .files = session_.files,
+                      .dialogs = session_.dialogs,
+                      .settings = session_.settings,
+                      .readAllSettings = [this] {
+                        return ReadAllSettings(session_, commandLine_, true);
+                      },
+                      .pathsSaved = [this] {
+                        EnableMenus();
+                        SetTitle();
+                      },
+                      .endProgram = [this] { EndProgram(); },
+                      .openWMPath = {}},
+                     this);
+  cpath_->setAttribute(Qt::WA_DeleteOnClose);
+  if (!cpath_->Fill()) {
+    delete cpath_;
+    return;
+  }
+  cpath_->open();
+  cpath_->move(mdi_->mapToGlobal(QPoint(0, 0)));
+}
+
+void Main::OpenHelp() {
+  const std::string own = session_.settings.paths.SystemPath + "korahlp32.hlp";
+  if (session_.files.CheckFile(own) &&
+      QDesktopServices::openUrl(
+          QUrl::fromLocalFile(QString::fromStdString(session_.files.HostPath(own)))))
+    return;
+  if (help_) {
+    help_->raise();
+    help_->activateWindow();
+    return;
+  }
+  const QString page = FindGuide(QCoreApplication::applicationDirPath());
+  if (page.isEmpty()) {
+    session_.dialogs.Message("The Help file is missing", "KORA Charting Help");
+    return;
+  }
+  help_ = new HelpWindow(page);
+  help_->show();
+}
+
+void Main::RunSibling(const std::string& program) {
+  const std::string path = session_.settings.paths.SystemPath + program;
+  if (!session_.files.CheckFile(path)) throw RunTimeError(kFileNotFound, "File not found  " + path);
+  DisableMenus();
+  try {
+    session_.processes.RunAndWait(session_.files.HostPath(path), {},
+                                  [this] { session_.dialogs.Yield(); });
+  } catch (...) {
+    EnableMenus();
+    throw;
+  }
+  EnableMenus();
+}
+
+void Main::AskPrinter() {
+  AskPrinterColours(session_.files, session_.settings.paths.SystemPath, session_.dialogs,
+                    session_.printer);
+}
+
+void Main::EndProgram() {
+  KeepSize();
+  hide();
+  QCoreApplication::quit();
+}
+
+void Main::closeEvent(QCloseEvent* event) {
+  KeepSize();
+  mdi_->closeAllSubWindows();
+  if (help_) help_->close();
+  event->accept();
+  QCoreApplication::quit();
+}
+
+// A window that fills the frame goes on filling it when the frame changes its size.
+bool Main::eventFilter(QObject* object, QEvent* event) {
+  if (object == mdi_->viewport() && event->type() == QEvent::Resize) {
+    const QSize before = mdiSize_;
+    mdiSize_ = mdi_->viewport()->size();
+    for (QMdiSubWindow* frame : mdi_->subWindowList())
+      if (frame->geometry() == QRect(QPoint(0, 0), before)) frame->resize(mdiSize_);
+  }
+  return QMainWindow::eventFilter(object, event);
+}
+
+}  // namespace kora

@@ -1,0 +1,64 @@
+#pragma once
+
+#include <QMainWindow>
+#include <QPointer>
+#include <functional>
+#include <map>
+#include <string>
+
+#include "chartwindow/forms/Chts.h"
+#include "settings/forms/CPath.h"
+#include "shell/session.h"
+
+class QMdiArea;
+
+namespace kora {
+
+// The main window: a frame with the menu, over the windows of the work.
+class Main : public QMainWindow {
+ public:
+  // `commandLine`: the words the program was started with, for reading the settings again.
+  Main(Session& session, std::string commandLine);
+
+  // What an entry does. An entry without it is there and greyed.
+  void SetOpener(const std::string& entry, std::function<void()> open);
+
+  // While a long task runs the menus of the work are off.
+  void DisableMenus();
+  void EnableMenus();
+
+  void SetTitle();
+  // The folder form, asking first where the paths are missing.
+  void OpenPaths();
+  void OpenCharts();
+
+  Chts* charts() const { return chts_; }
+
+ protected:
+  void closeEvent(QCloseEvent* event) override;
+  bool eventFilter(QObject* object, QEvent* event) override;
+
+ private:
+  void BuildMenu();
+  void SetOpeners();
+  void Open(const std::string& entry);
+  void TakeSize();
+  void KeepSize();
+  void OpenHelp();
+  // Runs a program of the program folder and waits for its end.
+  void RunSibling(const std::string& program);
+  void AskPrinter();
+  void EndProgram();
+
+  Session& session_;
+  std::string commandLine_;
+  QMdiArea* mdi_;
+  QPointer<Chts> chts_;
+  QPointer<CPath> cpath_;
+  QPointer<QWidget> help_;
+  std::map<std::string, std::function<void()>> openers_;
+  QSize mdiSize_;
+  bool longTask_ = false;
+};
+
+}  // namespace kora

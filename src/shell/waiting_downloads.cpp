@@ -1,0 +1,56 @@
+#include "shell/waiting_downloads.h"
+
+#include "base/runtime_error.h"
+#include "base/text.h"
+#include "platform/dialogs.h"
+
+namespace kora {
+namespace {
+
+constexpr std::string_view kTitle = "Downloaded Data";
+
+const char* QuestionFor(int service) {
+  switch (service) {
+    case 1:
+    case 3: return " There are some KORA/Tarvo files to update into KORA";
+    case 2: return " There are some BOURSE files to update into KORA";
+    case 4: return " There are some Ex Internet data files to update into KORA";
+    case 5: return " There are some EIS downloaded files to update into KORA";
+    default: return nullptr;
+  }
+}
+
+bool EndsWith(std::string_view name, std::string_view ending) {
+  return name.size() > ending.size() &&
+         EqualNoCase(name.substr(name.size() - ending.size()), ending);
+}
+
+}  // namespace
+
+std::optional<std::string> WaitingDownloads(const Files& files,
+                                            const DownloadSettings& download) {
+  const char* question = QuestionFor(download.DataService);
+  if (!question || Trim(download.DLPath).empty()) return std::nullopt;
+  // Internet data may come under its own ending and is renamed when it is taken in.
+  const bool asx = download.DataService == 4 && EndsWith(download.InternetDLfmt, ".ASX");
+  for (const std::string& name : files.List(WithBackslash(download.DLPath)))
+    if (EndsWith(name, ".d") || (asx && EndsWith(name, ".asx"))) return question;
+  return std::nullopt;
+}
+
+bool AskForWaitingDownloads(const Files& files, const DownloadSettings& download,
+                            Dialogs& dialogs) {
+  try {
+    const auto question = WaitingDownloads(files, download);
+    return question && dialogs.Ask(*question, kTitle, Buttons::kOkCancel) == Answer::kOk;
+  } catch (const RunTimeError& e) {
+    if (e.number() != kFileNotFound && e.number() != kPathAccess && e.number() != kPathNotFound)
+      dialogs.Message(
+          "Error while checking for KORATarvo download files not updated into KORA \n"
+          "Check download paths and/or Modify Download Details ",
+          kTitle);
+    return false;
+  }
+}
+
+}  // namespace kora

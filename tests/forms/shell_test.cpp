@@ -1,0 +1,360 @@
+#include <QDir>
+#include <QFile>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMdiArea>
+#include <QMdiSubWindow>
+#include <QMenu>
+#include <QMenuBar>
+#include <QPushButton>
+#include <QTemporaryDir>
+#include <QTextBrowser>
+#include <QTimer>
+
+#include "platform/qt/single_instance.h"
+#include "shell/forms/AbtKora.h"
+#include "shell/forms/HelpWindow.h"
+#include "shell/forms/Logo.h"
+#include "shell/forms/Main.h"
+#include "shell/main_menu.h"
+#include "tests/forms/form_fixture.h"
+
+namespace kora {
+namespace {
+
+class MainTest : public test::FormTest {
+ protected:
+  Main& Open() {
+    ReadSettings();
+    form = std::make_unique<Main>(*session, "");
+    form->show();
+    form->activateWindow();
+    EXPECT_TRUE(QTest::qWaitForWindowActive(form.get()));
+    return *form;
+  }
+  QAction* Entry(const char* name) { return Find<QAction>(form.get(), name); }
+  QAction* Menu(const char* name) { return Find<QMenu>(form.get(), name)->menuAction(); }
+
+  std::unique_ptr<Main> form;
+};
+
+TEST_F(MainTest, EveryEntryIsThereUnderItsNameWithItsCaption) {
+  Open();
+  for (const MenuEntry& entry : MainMenu()) {
+    const std::string name(entry.name);
+    auto* menu = form->findChild<QMenu*>(name.c_str());
+    QAction* action = menu ? menu->menuAction() : Entry(name.c_str());
+    ASSERT_NE(action, nullptr) << name;
+    EXPECT_EQ(action->text().toStdString(), entry.caption);
+  }
+}
+
+TEST_F(MainTest, AnEntryWhoseFormIsNotThereIsGreyed) {
+  Open();
+  for (const char* there : {"mnuChartDisplay", "mnuPaths", "mnuExit", "mnSHlp", "mnuAboutKora"})
+    EXPECT_TRUE(Entry(there)->isEnabled()) << there;
+  for (const char* notYet : {"mnFnts", "mnuKBUpdate", "mnuTextFile", "mnStats"})
+    EXPECT_FALSE(Entry(notYet)->isEnabled()) << notYet;
+  form->SetOpener("mnStats", [] {});
+  EXPECT_TRUE(Entry("mnStats")->isEnabled());
+}
+
+TEST_F(MainTest, TheDownloadMenuFollowsTheService) {
+  session->ini.PutSetting("Download", "DataService", "2");
+  Open();
+  form->SetOpener("mnuBourse", [] {});
+  form->SetOpener("mnuTARVO", [] {});
+  EXPECT_TRUE(Entry("mnuBourse")->isVisible());
+  EXPECT_TRUE(Entry("mnuBourse")->isEnabled());
+  EXPECT_FALSE(Entry("mnuTARVO")->isVisible());
+  session->settings.download.DataService = 1;
+  form->EnableMenus();
+  EXPECT_FALSE(Entry("mnuBourse")->isVisible());
+  EXPECT_TRUE(Entry("mnuTARVO")->isEnabled());
+}
+
+TEST_F(MainTest, ALongTaskDisablesTheMenusTogether) {
+  Open();
+  form->DisableMenus();
+  for (const char* menu : {"mnuFile", "mnuData", "mnuAComms", "mnTools", "mnuAnalysis"})
+    EXPECT_FALSE(Menu(menu)->isEnabled()) << menu;
+  EXPECT_TRUE(Menu("mnuHelp")->isEnabled());
+  form->EnableMenus();
+  for (const char* menu : {"mnuFile", "mnuData", "mnuAComms", "mnTools", "mnuAnalysis"})
+    EXPECT_TRUE(Menu(menu)->isEnabled()) << menu;
+}
+
+TEST_F(MainTest, TheTitleTellsTheDataFolderAndFollowsIt) {
+  Open();
+  EXPECT_EQ(form->windowTitle(),
+            "KORA Charting 7F   -   Current Data Folder c:\\korawin\\data\\");
+  Entry("mnuPaths")->trigger();
+  auto* paths = form->findChild<CPath*>();
+  ASSERT_NE(paths, nullptr);
+  Find<QLineEdit>(paths, "Text2")->setText("c:\\elsewhere\\");
+  Click(paths, "Command1");
+  EXPECT_EQ(form->windowTitle(), "KORA Charting 7F   -   Current Data Folder c:\\elsewhere\\");
+}
+
+TEST_F(MainTest, TheSizeIsKeptFromRunToRun) {
+  session->SaveUserSetting("Height", "6000");
+  session->SaveUserSetting("Width", "7500");
+  Open();
+  EXPECT_EQ(form->size(), QSize(500, 400));
+  form->resize(450, 300);
+  form->close();
+  EXPECT_EQ(session->UserSetting("Height"), "4500");
+  EXPECT_EQ(session->UserSetting("Width"), "6750");
+}
+
+TEST_F(MainTest, ATooSmallHeightGivesTheStandingOne) {
+  session->SaveUserSetting("Height", "2999");
+  session->SaveUserSetting("Width", "7500");
+  Open();
+  EXPECT_EQ(form->size(), QSize(500, 443)) << "6645 twips";
+}
+
+TEST_F(MainTest, AboutShowsItsLinesAndEnterClosesIt) {
+  Open();
+  Entry("mnuAboutKora")->trigger();
+  auto* about = form->findChild<AbtKora*>();
+  ASSERT_NE(about, nullptr);
+  EXPECT_EQ(about->windowTitle(), "About KORA");
+  EXPECT_EQ(Find<QLabel>(about, "Label1(0)")->text(),
+            "* * Version 7F * *     for Windows 95/98 or later ");
+  EXPECT_EQ(Find<QLabel>(about, "Label1(1)")->text(),
+            "KORA software is designed to be used as a tool only.");
+  QTest::keyClick(about, Qt::Key_Return);
+  EXPECT_FALSE(about->isVisible());
+}
+
+TEST_F(MainTest, TheMenusOpenByTheirKeys) {
+  Open();
+  QTest::keyClick(form.get(), Qt::Key_F, Qt::AltModifier);
+  auto* file = Find<QMenu>(form.get(), "mnuFile");
+  ASSERT_TRUE(WaitFor([&] { return file->isVisible(); }));
+  QTest::keyClick(file, Qt::Key_C);
+  EXPECT_NE(form->charts(), nullptr);
+}
+
+TEST_F(MainTest, ASiblingThatIsNotThereIsTold) {
+  session->ini.PutSetting("Download", "DataService", "1");
+  Open();
+  Entry("mnuMMAScan")->trigger();
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_NE(dialogs.said[0].text.find("c:\\korawin\\Mmascan.EXE"), std::string::npos);
+  EXPECT_TRUE(Menu("mnuFile")->isEnabled());
+}
+
+class ChtsTest : public MainTest {
+ protected:
+  Chts& OpenCharts() {
+    Open();
+    Entry("mnuChartDisplay")->trigger();
+    EXPECT_NE(form->charts(), nullptr);
+    return *form->charts();
+  }
+  PictureBox* Picture() { return dynamic_cast<PictureBox*>(Find<QWidget>(form.get(), "Picture1")); }
+  // Pixels that are not the background.
+  int Ink() {
+    const QImage& image = Picture()->surface().image();
+    const QRgb ground = QtSurface::Rgb(session->colours[kBackground]);
+    int ink = 0;
+    for (int y = 0; y < image.height(); ++y)
+      for (int x = 0; x < image.width(); ++x)
+        ink += (image.pixel(x, y) | 0xFF000000) != ground;
+    return ink;
+  }
+  std::string shown() { return session->current.CurrentDataFile; }
+};
+
+TEST_F(ChtsTest, OpensOnTheFirstSecurityInTheFrame) {
+  Chts& charts = OpenCharts();
+  EXPECT_EQ(shown(), "AAA.WDT");
+  EXPECT_EQ(charts.windowTitle(), "KORA Charting 7F   -  CHARTS  c:\\korawin\\data\\");
+  auto* mdi = Find<QMdiArea>(form.get(), "MDI");
+  ASSERT_EQ(mdi->subWindowList().size(), 1);
+  EXPECT_EQ(mdi->subWindowList()[0]->size(), mdi->viewport()->size());
+  EXPECT_EQ(Picture()->surface().Width(), Picture()->width());
+  EXPECT_GT(Ink(), 1000);
+  EXPECT_TRUE(charts.window().Chart.ChartDrawn);
+  EXPECT_TRUE(dialogs.said.empty());
+}
+
+TEST_F(ChtsTest, PageDownAndPageUpStepThroughTheNameFile) {
+  Chts& charts = OpenCharts();
+  EXPECT_TRUE(charts.isAncestorOf(QApplication::focusWidget()));
+  const QImage first = Picture()->surface().image().copy();
+  for (const char* expected : {"BBB.WDT", "CCC.WDT", "AAA.WDT"}) {
+    QTest::keyClick(Picture(), Qt::Key_PageDown);
+    EXPECT_EQ(shown(), expected);
+  }
+  EXPECT_EQ(Picture()->surface().image(), first);
+  QTest::keyClick(Picture(), Qt::Key_PageUp);
+  EXPECT_EQ(shown(), "CCC.WDT");
+  EXPECT_NE(Picture()->surface().image(), first);
+}
+
+TEST_F(ChtsTest, ANewSizeRecomposesTheSameChart) {
+  Chts& charts = OpenCharts();
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  const auto before = charts.window().Chart.ChartRight;
+  form->resize(form->width() - 150, form->height() - 90);
+  ASSERT_TRUE(WaitFor([&] { return charts.window().Chart.ChartRight < before && Ink() > 1000; }));
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_EQ(charts.window().ChartIndex, 2);
+  EXPECT_EQ(Picture()->surface().Width(), Picture()->width());
+}
+
+TEST_F(ChtsTest, TheEntryBringsTheStandingWindowBack) {
+  Chts* charts = &OpenCharts();
+  Entry("mnuChartDisplay")->trigger();
+  EXPECT_EQ(form->charts(), charts);
+  EXPECT_EQ(Find<QMdiArea>(form.get(), "MDI")->subWindowList().size(), 1);
+}
+
+TEST_F(ChtsTest, ClosingAndOpeningStartsAnew) {
+  OpenCharts();
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  form->charts()->parentWidget()->close();
+  ASSERT_TRUE(WaitFor([&] { return form->charts() == nullptr; }));
+  Entry("mnuChartDisplay")->trigger();
+  EXPECT_EQ(shown(), "AAA.WDT");
+}
+
+TEST_F(ChtsTest, WithoutANameFileItSaysSoOnceAndStands) {
+  session->files.Remove("c:\\korawin\\data\\Names.dat");
+  Chts& charts = OpenCharts();
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(charts.window().ChartIndex, 0);
+  form->resize(form->width() - 100, form->height() - 50);
+  QCoreApplication::processEvents();
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  EXPECT_EQ(dialogs.said.size(), 2u);
+}
+
+TEST_F(ChtsTest, AChartThatFailsIsNotToldAgainAtEverySize) {
+  home.Put("drive_c/korawin/data/AAA.WDT", "torn");
+  OpenCharts();
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  for (int i = 1; i < 4; ++i) {
+    form->resize(form->width() - 20, form->height() - 20);
+    QCoreApplication::processEvents();
+  }
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_GT(Ink(), 1000);
+}
+
+class LogoTest : public test::FormTest {
+ protected:
+  Logo& Make() {
+    logo = std::make_unique<Logo>(*session, "");
+    Find<QTimer>(logo.get(), "Timer2")->setInterval(0);
+    return *logo;
+  }
+  bool MainShows() {
+    return WaitFor([&] { return logo->main() && logo->main()->isVisible() && !logo->isVisible(); });
+  }
+  std::unique_ptr<Logo> logo;
+};
+
+TEST_F(LogoTest, ASecondInstanceIsToldBeforeAnySettingIsRead) {
+  const SingleInstance first(home.path(), "KORA32");
+  EXPECT_FALSE(first.Previous());
+  const SingleInstance second(home.path(), "KORA32");
+  EXPECT_TRUE(second.Previous());
+  EXPECT_FALSE(Make().Start(second.Previous()));
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].text, "You already have this application running.");
+  EXPECT_EQ(dialogs.said[0].title, "KORA Charting 7F");
+  EXPECT_EQ(session->settings.paths.SystemPath, "") << "nothing was read";
+  EXPECT_FALSE(home.Exists("drive_c/korawin/chtmisc"));
+  EXPECT_EQ(logo->main(), nullptr);
+}
+
+TEST_F(LogoTest, TheInstanceBeforeMayHaveEndedOrHaveAnotherHome) {
+  { const SingleInstance gone(home.path(), "KORA32"); }
+  const SingleInstance next(home.path(), "KORA32");
+  EXPECT_FALSE(next.Previous());
+  test::TempHome other;
+  EXPECT_FALSE(SingleInstance(other.path(), "KORA32").Previous());
+  EXPECT_FALSE(SingleInstance(home.path() + "/not there", "KORA32").Previous());
+}
+
+TEST_F(LogoTest, ReadsTheSettingsThenOpensTheMainWindow) {
+  EXPECT_TRUE(Make().Start(false));
+  EXPECT_TRUE(logo->isVisible());
+  EXPECT_TRUE(dialogs.busy);
+  EXPECT_EQ(session->settings.paths.SystemPath, "c:\\korawin\\");
+  EXPECT_TRUE(home.Exists("drive_c/korawin/chtmisc"));
+  EXPECT_TRUE(home.Exists("drive_c/korawin/chtsave"));
+  ASSERT_TRUE(MainShows());
+  EXPECT_FALSE(dialogs.busy);
+  EXPECT_TRUE(dialogs.said.empty());
+}
+
+TEST_F(LogoTest, NoWaitingFilesNoMessageAndTheMainWindowStands) {
+  int updates = 0;
+  Make().Update = [&](Main&) { ++updates; };
+  home.Put("drive_c/korawin/download/readme.txt", "");
+  ASSERT_TRUE(logo->Start(false));
+  ASSERT_TRUE(MainShows());
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_EQ(updates, 0);
+}
+
+TEST_F(LogoTest, WaitingFilesAreTakenInOnOk) {
+  int updates = 0;
+  home.Put("drive_c/korawin/download/20261102.d", "x");
+  Make().Update = [&](Main& main) {
+    EXPECT_EQ(&main, logo->main());
+    ++updates;
+  };
+  ASSERT_TRUE(logo->Start(false));
+  ASSERT_TRUE(MainShows());
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].text, " There are some Ex Internet data files to update into KORA");
+  EXPECT_EQ(updates, 1);
+}
+
+TEST_F(LogoTest, GivingUpTheDriveEndsTheProgram) {
+  session->files.Remove("C:\\WINDOWS\\Kora.ini");
+  dialogs.replies = {std::nullopt};
+  EXPECT_FALSE(Make().Start(false));
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].title, "Drive");
+  EXPECT_FALSE(dialogs.busy);
+  EXPECT_FALSE(logo->isVisible());
+}
+
+TEST(Help, TheGuideIsFoundBesideTheProgramOrAboveIt) {
+  QTemporaryDir folder;
+  const QDir root(folder.path());
+  const auto put = [&](const QString& place) {
+    root.mkpath(place);
+    QFile file(root.filePath(place + "/index.html"));
+    ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+    file.write("<html><body><h1>Guide</h1></body></html>");
+  };
+  root.mkpath("build/release/bin");
+  const QString bin = root.filePath("build/release/bin");
+  put("docs/guide");
+  EXPECT_EQ(FindGuide(bin), QFileInfo(root.filePath("docs/guide/index.html")).canonicalFilePath());
+  put("build/release/bin/guide");
+  EXPECT_EQ(FindGuide(bin),
+            QFileInfo(root.filePath("build/release/bin/guide/index.html")).canonicalFilePath());
+
+  HelpWindow& help = *new HelpWindow(FindGuide(bin));  // deletes itself on closing
+  help.show();
+  EXPECT_EQ(help.windowTitle(), "KORA Charting Help");
+  auto* page = help.findChild<QTextBrowser*>("Text1");
+  ASSERT_NE(page, nullptr);
+  EXPECT_EQ(page->toPlainText(), "Guide");
+  help.close();
+}
+
+}  // namespace
+}  // namespace kora
