@@ -26,7 +26,7 @@ void MakeSymmetric(T& highest, T& lowest) {
 
 // Index of the last bar on show, -1 when there is none.
 inline int LastBar(const ChartBars& bars) {
-  return std::min<int>(bars.BarCount, static_cast<int>(bars.bars.size()) - 1);
+  return std::clamp<int>(bars.BarCount, -1, static_cast<int>(bars.bars.size()) - 1);
 }
 
 // A value kept as a 32-bit float. Error 6 when it is too large for one; a NaN and an infinity

@@ -1,7 +1,6 @@
 #include "indicators/stochastic_fx.h"
 
 #include <algorithm>
-#include <numeric>
 #include <string>
 #include <vector>
 
@@ -43,19 +42,24 @@ Form FormOf(OscHost& host) {
   return form;
 }
 
-// The last D values, zeros at the start.
+// The last D values of a column, zeros at the start.
 template <typename T>
 class Rows {
  public:
-  explicit Rows(int size) : slots_(size > 0 ? size_t(size) : 0) {}
-  void Shift(T value) {
-    std::copy(slots_.begin() + 1, slots_.end(), slots_.begin());
-    slots_.back() = value;
+  Rows(int D, int bars) : D_(D > 0 ? size_t(D) : 0) {
+    values_.reserve(D_ + size_t(bars));
+    values_.resize(D_);
   }
-  double Sum() const { return std::accumulate(slots_.begin(), slots_.end(), 0.0); }
+  void Shift(T value) { values_.push_back(value); }
+  double Sum() const {
+    double sum = 0;
+    for (size_t i = values_.size() - D_; i < values_.size(); ++i) sum += values_[i];
+    return sum;
+  }
 
  private:
-  std::vector<T> slots_;
+  size_t D_;
+  std::vector<T> values_;
 };
 
 // A signal on the price picture: screen only.
@@ -74,8 +78,8 @@ void Draw(OscHost& host, int& bar) {
   if (form.K == 0) return;
   const ChartBars& bars = host.chart.Bars;
   const int last = LastBar(bars);
-  Rows<float> aboveLow(form.D), range(form.D);
-  Rows<std::int32_t> slow(form.D);
+  Rows<float> aboveLow(form.D, last + 1), range(form.D, last + 1);
+  Rows<std::int32_t> slow(form.D, last + 1);
 
   OscPanel panel(host, kPanelUnits);
   panel.Frame();
@@ -93,14 +97,15 @@ void Draw(OscHost& host, int& bar) {
       host.panel.Line(panel.PanelLeft, y, panel.PanelRight, y, host.colour(kBorder));
   }
 
+  const std::vector<PriceRange> ranges =
+      StochasticRanges(bars, host.request.Name.RecType, form.K);
   const auto plotY = [&](double v) { return CLng(yOf(form.reversed ? 100 - v : v)); };
   double previousX = 0;
   std::int32_t previousKY = 0, previousDY = 0, previousThirdY = 0;
   int zone = 0, previousZone = 0;  // 1 above the 90% line, 2 between, 3 below the 20% line
   for (bar = std::max(0, form.K + 1); bar <= last; ++bar) {
     const double x = panel.PanelLeft + double(bar) * host.chart.BarSpacing;
-    const StochasticRange window =
-        StochasticRangeAt(bars, host.request.Name.RecType, form.K, bar);
+    const PriceRange window = ranges[size_t(bar)];
     const float above = bars[size_t(bar)].Close - window.Lowest;
     const float height = window.Highest - window.Lowest;
     const std::int32_t percentK = CLng((height != 0 ? double(above) / height : above) * 100.0);
@@ -146,17 +151,20 @@ void Draw(OscHost& host, int& bar) {
 
 }  // namespace
 
-StochasticRange StochasticRangeAt(const ChartBars& bars, std::int16_t recType, int K, int bar) {
-  StochasticRange range{0.0f, 100000.0f};
+std::vector<PriceRange> StochasticRanges(const ChartBars& bars, std::int16_t recType, int K) {
+  constexpr PriceRange kStart{0.0f, 100000.0f};
+  const int last = LastBar(bars);
+  std::vector<PriceRange> ranges(size_t(last + 1), kStart);
+  if (K < 0) return ranges;
   const bool ranged = recType > kAdvanceDecline;
-  for (int j = bar - K; j <= bar; ++j) {
-    const ChartBar& b = bars[size_t(j)];
-    const float high = ranged && b.High != 0 ? b.High : b.Close;
-    const float low = ranged && b.Low != 0 ? b.Low : b.Close;
-    if (high != 0 && high > range.Highest) range.Highest = high;
-    if (low != 0 && low < range.Lowest) range.Lowest = low;
+  SlidingRange window(last + 1);
+  for (int i = 0; i <= last; ++i) {
+    const ChartBar& bar = bars[size_t(i)];
+    window.Add(i, ranged && bar.High != 0 ? bar.High : bar.Close,
+               ranged && bar.Low != 0 ? bar.Low : bar.Close);
+    if (i > K) ranges[size_t(i)] = window.Since(i - K, kStart);
   }
-  return range;
+  return ranges;
 }
 
 void ShowStochasticFX(OscHost& host) {

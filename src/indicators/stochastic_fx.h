@@ -1,8 +1,10 @@
 #pragma once
 
 #include <cstdint>
+#include <vector>
 
 #include "indicators/oscillators.h"
+#include "indicators/sliding_range.h"
 
 namespace kora {
 
@@ -28,11 +30,8 @@ namespace kora {
 //
 // Reversed orientation (FX and R/F with FXRev) draws 100 - v and swaps the guide labels.
 
-struct StochasticRange {
-  float Highest, Lowest;
-};
-
-// The range of bars bar - K to bar. A K below 0 has no bars and leaves the start values.
-StochasticRange StochasticRangeAt(const ChartBars& bars, std::int16_t recType, int K, int bar);
+// For each bar the range of bars bar - K to bar; up to bar K, and where K is below 0, the start
+// values.
+std::vector<PriceRange> StochasticRanges(const ChartBars& bars, std::int16_t recType, int K);
 
 }  // namespace kora

@@ -1,11 +1,11 @@
 #include "indicators/williams.h"
 
-#include <algorithm>
 #include <cmath>
 #include <string>
 
 #include "base/numbers.h"
 #include "indicators/osc_series.h"
+#include "indicators/sliding_range.h"
 
 namespace kora {
 namespace {
@@ -54,18 +54,15 @@ std::vector<WilliamsPoint> WilliamsSeries(const ChartBars& bars, std::int16_t re
   series.reserve(size_t(last + 1));
   const bool closes = recType >= kCloseVolume && recType <= kAdvanceDecline;
   float w = 0;
-  for (int i = std::max(0, P); i <= last; ++i) {
-    float highest = -100000.0f, lowest = 100000.0f;
-    for (int k = 0; k < P; ++k) {
-      const ChartBar& bar = bars[size_t(i - k)];
-      const float high = closes ? bar.Close : bar.High;
-      const float low = closes ? bar.Close : bar.Low;
-      if (high != 0 && high > highest) highest = high;
-      if (low != 0 && low < lowest) lowest = low;
-    }
+  SlidingRange window(last + 1);
+  for (int i = 0; i <= last; ++i) {
+    const ChartBar& bar = bars[size_t(i)];
+    window.Add(i, closes ? bar.Close : bar.High, closes ? bar.Close : bar.Low);
+    if (i < P) continue;
+    const auto [highest, lowest] = window.Since(i - P + 1, {-100000.0f, 100000.0f});
     const float range = highest - lowest;
     if (highest == 0 || range == 0) continue;
-    const double value = double(highest - bars[size_t(i)].Close) / range * 100.0;
+    const double value = double(highest - bar.Close) / range * 100.0;
     const float kept = static_cast<float>(value);
     if (std::isfinite(kept)) w = kept;
     series.push_back({i, w});

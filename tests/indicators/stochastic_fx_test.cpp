@@ -32,6 +32,10 @@ struct Stochastic : OscFixture {
   }
 };
 
+PriceRange RangeAt(const ChartBars& bars, std::int16_t recType, int K, int bar) {
+  return StochasticRanges(bars, recType, K)[size_t(bar)];
+}
+
 const std::vector<float> kCloses{10, 12, 11, 14, 13, 13.25f};
 
 }  // namespace
@@ -106,7 +110,7 @@ TEST(StochasticTest, WindowHoldsOneBarMoreThanThePeriod) {
   closes[0] = 1;
   closes[1] = 100;
   f.Closes(closes);
-  const StochasticRange range = StochasticRangeAt(f.chart.Bars, kShare, 10, 11);
+  const PriceRange range = RangeAt(f.chart.Bars, kShare, 10, 11);
   EXPECT_EQ(range.Highest, 100);  // bar 1 is in
   EXPECT_EQ(range.Lowest, 50);    // bar 0 is not
 }
@@ -135,7 +139,7 @@ TEST(StochasticTest, FlatWindowDividesByOne) {
 TEST(StochasticTest, ZeroCloseInTheWindowCountsForNeitherEnd) {
   Stochastic f(2, 0);
   f.Closes({10, 12, 0, 11});
-  const StochasticRange range = StochasticRangeAt(f.chart.Bars, kShare, 2, 3);
+  const PriceRange range = RangeAt(f.chart.Bars, kShare, 2, 3);
   EXPECT_EQ(range.Highest, 12);
   EXPECT_EQ(range.Lowest, 11);
 }
@@ -151,6 +155,7 @@ TEST(StochasticTest, BarsOwnZeroCloseGivesAPercentFromZeroFarOutOfTheFrame) {
 TEST(StochasticTest, ZeroHighOrLowStandsWithTheClose) {
   OscFixture f;
   ChartBar bar{};
+  f.AddBar(bar);
   bar.High = 0;
   bar.Low = 5;
   bar.Close = 6;
@@ -159,14 +164,14 @@ TEST(StochasticTest, ZeroHighOrLowStandsWithTheClose) {
   bar.Low = 0;
   bar.Close = 4;
   f.AddBar(bar);
-  const StochasticRange range = StochasticRangeAt(f.chart.Bars, kShare, 1, 1);
+  const PriceRange range = RangeAt(f.chart.Bars, kShare, 1, 2);
   EXPECT_EQ(range.Highest, 6);
   EXPECT_EQ(range.Lowest, 4);
 }
 
 TEST(StochasticTest, SecuritiesWithoutARangeStandWithTheirCloses) {
   OscFixture f;
-  for (const float close : {6.0f, 7.0f}) {
+  for (const float close : {0.0f, 6.0f, 7.0f}) {
     ChartBar bar{};
     bar.High = 50;
     bar.Low = 1;
@@ -174,11 +179,46 @@ TEST(StochasticTest, SecuritiesWithoutARangeStandWithTheirCloses) {
     f.AddBar(bar);
   }
   for (const std::int16_t type : {kCloseVolume, kCloseOnly, kAdvanceDecline}) {
-    const StochasticRange range = StochasticRangeAt(f.chart.Bars, type, 1, 1);
+    const PriceRange range = RangeAt(f.chart.Bars, type, 1, 2);
     EXPECT_EQ(range.Highest, 7);
     EXPECT_EQ(range.Lowest, 6);
   }
-  EXPECT_EQ(StochasticRangeAt(f.chart.Bars, kIndex, 1, 1).Highest, 50);
+  EXPECT_EQ(RangeAt(f.chart.Bars, kIndex, 1, 2).Highest, 50);
+}
+
+TEST(StochasticTest, RangesAreThoseOfAScanOfEachWindow) {
+  OscFixture f;
+  std::uint32_t noise = 7;
+  for (int i = 0; i < 400; ++i) {
+    float price[3];
+    for (float& p : price) {
+      noise = noise * 1664525u + 1013904223u;
+      // A third zeros, and now and then a price below zero or beyond the start value.
+      p = noise >> 30 ? float(noise >> 20) * ((noise >> 12) % 16 ? 1.0f : -40.0f) : 0.0f;
+    }
+    ChartBar bar{};
+    bar.High = price[0];
+    bar.Low = i % 50 == 3 ? std::numeric_limits<float>::quiet_NaN() : price[1];
+    bar.Close = price[2];
+    f.AddBar(bar);
+  }
+  for (const std::int16_t type : {kCloseOnly, kShare}) {
+    for (const int K : {1, 2, 10, 57}) {
+      const std::vector<PriceRange> ranges = StochasticRanges(f.chart.Bars, type, K);
+      for (int i = K + 1; i < 400; ++i) {
+        PriceRange scan{0, 100000};
+        for (int j = i - K; j <= i; ++j) {
+          const ChartBar& bar = f.chart.Bars[size_t(j)];
+          const float high = type > 3 && bar.High != 0 ? bar.High : bar.Close;
+          const float low = type > 3 && bar.Low != 0 ? bar.Low : bar.Close;
+          if (high != 0 && high > scan.Highest) scan.Highest = high;
+          if (low != 0 && low < scan.Lowest) scan.Lowest = low;
+        }
+        ASSERT_EQ(ranges[size_t(i)].Highest, scan.Highest) << K << " " << i;
+        ASSERT_EQ(ranges[size_t(i)].Lowest, scan.Lowest) << K << " " << i;
+      }
+    }
+  }
 }
 
 TEST(StochasticTest, NoDGivesPercentKAloneInTheFastForm) {
@@ -330,7 +370,7 @@ TEST(StochasticTest, NegativePeriodHasAnEmptyWindowAndKeepsTheStartValues) {
   OscFixture f;
   f.Closes(kCloses);
   for (const std::int16_t K : std::initializer_list<std::int16_t>{-1, -200, -32768}) {
-    const StochasticRange range = StochasticRangeAt(f.chart.Bars, kShare, K, 2);
+    const PriceRange range = RangeAt(f.chart.Bars, kShare, K, 2);
     EXPECT_EQ(range.Highest, 0);
     EXPECT_EQ(range.Lowest, 100000);
     Stochastic g(K, -3);
