@@ -1,13 +1,12 @@
 #pragma once
 
-#include <cstdlib>
-#include <fstream>
 #include <sstream>
 #include <string>
 #include <vector>
 
 #include "base/numbers.h"
 #include "tests/indicators/osc_fixture.h"
+#include "tests/indicators/real_prices.h"
 
 namespace kora::test {
 
@@ -42,21 +41,14 @@ inline void SetPriceMap(OscFixture& f, float perY, std::int16_t bottom = 290) {
   f.chart.Price.ChartBottom = bottom;
 }
 
-// Real prices, as "code,date,open,high,low,close,volume,..." lines. False where there are none.
+// Real prices, volumes in thousands. False where there are none on this machine.
 inline bool SetRealBars(OscFixture& f, const std::string& code) {
-  std::ifstream in(std::string(KORA_DATA_DIR) + "/" + code + ".csv");
+  const std::vector<ChartBar> days = RealBars(code + ".csv");
   std::vector<Bar> bars;
-  std::string line;
-  while (std::getline(in, line)) {
-    std::stringstream fields(line);
-    std::string field[7];
-    for (std::string& text : field) std::getline(fields, text, ',');
-    bars.push_back({float(Val(field[3])), float(Val(field[4])), float(Val(field[5])),
-                    CLng(Val(field[6]) / 1000)});
-  }
-  if (bars.empty()) return false;
+  for (const ChartBar& day : days)
+    bars.push_back({day.High, day.Low, day.Close, day.Volume / 1000});
   SetBars(f, bars);
-  return true;
+  return !bars.empty();
 }
 
 // The numbers of a script line behind its letter.
