@@ -92,6 +92,12 @@ std::string StrShortest(T value) {
 
 }  // namespace
 
+float CSng(double value) {
+  const auto single = static_cast<float>(value);
+  if (!std::isfinite(single)) throw RunTimeError(kOverflow);
+  return single;
+}
+
 double RoundHalfEven(double value) { return std::nearbyint(value); }
 
 std::int16_t CInt(double value) {
