@@ -2,7 +2,7 @@
 
 kora_packages=(
   cmake ninja-build g++ ccache
-  qt6-base-dev libqt6svg6-dev libgl1-mesa-dev
+  qt6-base-dev qt6-svg-dev libgl1-mesa-dev
   libcli11-dev libgtest-dev libbenchmark-dev
   fonts-liberation
 )
