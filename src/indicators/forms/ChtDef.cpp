@@ -53,11 +53,12 @@ ChtDef::ChtDef(ChtDefServices services, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("ChtDef");
   setWindowTitle("Chart Defaults");
-  auto* columns = new QHBoxLayout;
-  columns->addLayout(PeriodColumns());
-  columns->addSpacing(fontMetrics().height());
-  columns->addLayout(SwitchColumn());
-  columns->addStretch();
+  // Three columns on one grid, so that their rows stand level.
+  auto* grid = new QGridLayout;
+  AddPeriods(grid);
+  AddSwitches(grid);
+  for (const int gap : {3, 7}) grid->setColumnMinimumWidth(gap, fontMetrics().height());
+  grid->setColumnStretch(12, 1);
 
   auto* compare = new QHBoxLayout;
   compFile_ = NewField(this, "CompFile", 40, 100);
@@ -65,7 +66,7 @@ ChtDef::ChtDef(ChtDefServices services, QWidget* parent)
   compare->addWidget(compFile_, 1);
 
   auto* layout = new QVBoxLayout(this);
-  layout->addLayout(columns);
+  layout->addLayout(grid);
   layout->addLayout(compare);
   layout->addStretch();
   auto* buttons = new ButtonRow(this);
@@ -83,75 +84,71 @@ ChtDef::ChtDef(ChtDefServices services, QWidget* parent)
   FocusField(periods_[0].first);
 }
 
-ChtDef::Twin ChtDef::AddTwin(QGridLayout* grid, const char* caption, const char* daily,
-                             const char* twin) {
-  const int row = grid->rowCount();
+ChtDef::Twin ChtDef::AddTwin(QGridLayout* grid, int row, int column, const char* caption,
+                             const char* daily, const char* twin) {
   const Twin fields{NewField(this, daily, 4, 6), NewField(this, twin, 4, 6)};
   fields.first->setAccessibleName(QString(caption) + " daily");
   fields.second->setAccessibleName(QString(caption) + " weekly");
-  grid->addWidget(NewLabel(this, caption, fields.first), row, 0);
-  grid->addWidget(fields.first, row, 1);
-  grid->addWidget(fields.second, row, 2);
+  grid->addWidget(NewLabel(this, caption, fields.first), row, column);
+  grid->addWidget(fields.first, row, column + 1);
+  grid->addWidget(fields.second, row, column + 2);
   return fields;
 }
 
-ToggleBox* ChtDef::AddToggle(QGridLayout* grid, const char* caption, const char* name,
-                             const char* on, const char* off) {
-  const int row = grid->rowCount();
-  auto* box = new ToggleBox(this, name, on, off);
-  box->setAccessibleDescription(caption);
-  grid->addWidget(NewLabel(this, caption, box), row, 0);
-  grid->addWidget(box, row, 1, 1, 2);
-  return box;
+void ChtDef::AddHeads(QGridLayout* grid, int column) {
+  grid->addWidget(NewLabel(this, "Daily"), 0, column + 1);
+  grid->addWidget(NewLabel(this, "Weekly"), 0, column + 2);
 }
 
-QLayout* ChtDef::PeriodColumns() {
-  auto* both = new QHBoxLayout;
-  QGridLayout* grid = nullptr;
+void ChtDef::AddPeriods(QGridLayout* grid) {
   for (int i = 0; i < 22; ++i) {
-    if (i % kRowsAColumn == 0) {
-      if (grid) both->addSpacing(fontMetrics().height());
-      grid = new QGridLayout;
-      grid->addWidget(NewLabel(this, "Daily"), 0, 1);
-      grid->addWidget(NewLabel(this, "Weekly"), 0, 2);
-      both->addLayout(grid);
-    }
+    const int column = i < kRowsAColumn ? 0 : 4;
+    if (i % kRowsAColumn == 0) AddHeads(grid, column);
     const OscKey& key = OscKeys()[size_t(i)];
-    periods_[size_t(i)] = AddTwin(grid, kPeriodCaptions[i], key.daily, key.twin);
+    periods_[size_t(i)] = AddTwin(grid, 1 + i % kRowsAColumn, column, kPeriodCaptions[i],
+                                  key.daily, key.twin);
   }
-  return both;
 }
 
-QLayout* ChtDef::SwitchColumn() {
-  auto* grid = new QGridLayout;
-  grid->addWidget(NewLabel(this, "Daily"), 0, 1);
-  grid->addWidget(NewLabel(this, "Weekly"), 0, 2);
-  average1_ = AddTwin(grid, "Average 1", "Av1D", "Av1W");
-  avOne_ = new ToggleBox(this, "AvOne", "ON", "OFF");
-  avOne_->setAccessibleDescription("Average 1");
-  grid->addWidget(avOne_, 1, 3);
-  average2_ = AddTwin(grid, "Average 2", "Av2D", "Av2W");
-  avTwo_ = new ToggleBox(this, "AvTwo", "ON", "OFF");
-  avTwo_->setAccessibleDescription("Average 2");
-  grid->addWidget(avTwo_, 2, 3);
-  avCalc_ = AddToggle(grid, "Averages", "AvCalc", "Exponential", "Simple Moving");
-  scMethod_ = AddToggle(grid, "Scales", "ScMethod", "Automatic", "Name File");
-  bars_ = AddToggle(grid, "Bar Charts and   Candlestick Charts", "BCCalTp", "Logarithmic",
-                    "Arithmetic");
-  lines_ = AddToggle(grid, "Line Charts", "LCalTp", "Logarithmic", "Arithmetic");
-  volumes_ = AddToggle(grid, "Volumes", "VCalTp", "Logarithmic", "Arithmetic");
-  cutVols_ = AddToggle(grid, "Volumes Height", "CutVols", "Limit Height", "Full Height");
-  showOsc_ = AddToggle(grid, "Always show oscillator settings box ", "ShowOsc", "ON", "OFF");
+void ChtDef::AddSwitches(QGridLayout* grid) {
+  constexpr int kColumn = 8;
+  AddHeads(grid, kColumn);
+  const auto average = [&](int row, const char* caption, const char* name) {
+    auto* box = new ToggleBox(this, name, "ON", "OFF");
+    box->setAccessibleDescription(caption);
+    grid->addWidget(box, row, kColumn + 3);
+    return box;
+  };
+  average1_ = AddTwin(grid, 1, kColumn, "Average 1", "Av1D", "Av1W");
+  avOne_ = average(1, "Average 1", "AvOne");
+  average2_ = AddTwin(grid, 2, kColumn, "Average 2", "Av2D", "Av2W");
+  avTwo_ = average(2, "Average 2", "AvTwo");
+
+  int row = 3;
+  const auto toggle = [&](const char* caption, const char* name, const char* on,
+                          const char* off) {
+    auto* box = new ToggleBox(this, name, on, off);
+    box->setAccessibleDescription(caption);
+    grid->addWidget(NewLabel(this, caption, box), row, kColumn);
+    grid->addWidget(box, row++, kColumn + 1, 1, 2);
+    return box;
+  };
+  avCalc_ = toggle("Averages", "AvCalc", "Exponential", "Simple Moving");
+  scMethod_ = toggle("Scales", "ScMethod", "Automatic", "Name File");
+  bars_ = toggle("Bar Charts and   Candlestick Charts", "BCCalTp", "Logarithmic", "Arithmetic");
+  lines_ = toggle("Line Charts", "LCalTp", "Logarithmic", "Arithmetic");
+  volumes_ = toggle("Volumes", "VCalTp", "Logarithmic", "Arithmetic");
+  cutVols_ = toggle("Volumes Height", "CutVols", "Limit Height", "Full Height");
+  showOsc_ = toggle("Always show oscillator settings box ", "ShowOsc", "ON", "OFF");
   const auto check = [&](const char* caption, const char* name) {
     auto* box = new QCheckBox(caption, this);
     box->setObjectName(name);
-    grid->addWidget(box, grid->rowCount(), 0, 1, 4);
+    grid->addWidget(box, row++, kColumn, 1, 4);
     return box;
   };
   fxRev_ = check("&FX reversed in R/F Oscillator", "FXRev");
   fillIn_ = check("Fill &In Directional Movement Osc.", "FillIn");
   rfAve_ = check("Show &averages in R/F oscillator", "RFAve");
-  return grid;
 }
 
 // Any letter changes the scale method, as a click does.

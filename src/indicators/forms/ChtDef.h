@@ -43,11 +43,11 @@ class ChtDef : public QDialog {
 
  private:
   using Twin = std::pair<QLineEdit*, QLineEdit*>;
-  Twin AddTwin(QGridLayout* grid, const char* caption, const char* daily, const char* twin);
-  ToggleBox* AddToggle(QGridLayout* grid, const char* caption, const char* name, const char* on,
-                       const char* off);
-  QLayout* PeriodColumns();
-  QLayout* SwitchColumn();
+  Twin AddTwin(QGridLayout* grid, int row, int column, const char* caption, const char* daily,
+               const char* twin);
+  void AddHeads(QGridLayout* grid, int column);
+  void AddPeriods(QGridLayout* grid);
+  void AddSwitches(QGridLayout* grid);
   void Fill(const ChartDefaults& form);
   ChartDefaults Typed() const;
   void Save();

@@ -60,7 +60,10 @@ QLineEdit* OscFrm::AddField(const QString& name, const QString& label, const std
   auto* caption = NewLabel(this, label, field);
   caption->setTextFormat(Qt::PlainText);
   grid->addWidget(caption, row, 0);
-  grid->addWidget(field, row, 1);
+  if (columns > kFieldLimit)
+    grid->addWidget(field, row, 1);
+  else
+    grid->addWidget(field, row, 1, Qt::AlignLeft);
   return field;
 }
 

@@ -112,6 +112,8 @@ ColNew::ColNew(ColNewServices services, QWidget* parent)
     label2_[i] = new ColourItem(this);
     label2_[i]->setObjectName(QString("Label2(%1)").arg(i));
     label2_[i]->setText(FormText(ColourRoleName(EntryOf(i))));
+    // For an item in the colour of the background.
+    label2_[i]->setToolTip(label2_[i]->text());
     // Entries beyond the roles colour nothing.
     label2_[i]->setEnabled(!label2_[i]->text().isEmpty());
     itemGroup->addButton(label2_[i], i);
