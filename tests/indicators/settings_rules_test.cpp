@@ -287,7 +287,7 @@ TEST_F(ChartDefaultsRules, KeysThatCantBeWrittenAreListedAtTheEnd) {
   EXPECT_EQ(dialogs.said[0].title, "Chart Defaults");
   const std::string& text = dialogs.said[0].text;
   EXPECT_EQ(text.substr(0, 18), "; StochK; StochKW;");
-  EXPECT_NE(text.find("; VtyDW; CompFile; BCCalTp; "), std::string::npos) << text;
+  EXPECT_NE(text.find("; VtyD; VtyW; CompFile; BCCalTp; "), std::string::npos) << text;
   EXPECT_EQ(text.substr(text.size() - 10), "; ScMethod");
 }
 

@@ -34,12 +34,12 @@ class LookSettings : public testing::Test {
 };
 
 TEST_F(LookSettings, LineWidthOutsideOneToTenCountsAsTwo) {
-  for (const std::int16_t width : {0, -1, 11, 32767}) {
-    settings.charts.LineWidth = width;
+  for (const int width : {0, -1, 11, 32767}) {
+    settings.charts.LineWidth = std::int16_t(width);
     EXPECT_EQ(PrintedLineWidth(settings), 2) << width;
   }
-  for (const std::int16_t width : {1, 10}) {
-    settings.charts.LineWidth = width;
+  for (const int width : {1, 10}) {
+    settings.charts.LineWidth = std::int16_t(width);
     EXPECT_EQ(PrintedLineWidth(settings), width);
   }
   SaveLineWidth(ini, settings, 7);
