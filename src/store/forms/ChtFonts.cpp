@@ -87,7 +87,7 @@ void ChtFonts::Pick(int index) {
   ShowChoice(index);
 }
 
-// In the font itself, though not so large that the form grows out of the screen.
+// In the font itself, at the form's own size.
 void ChtFonts::ShowChoice(int index) {
   const FontChoice& choice = choice_[index];
   QFont shown = font();

@@ -16,8 +16,8 @@ namespace kora {
 class ChtFonts : public QDialog {
  public:
   // Lets the user choose a font, starting at the standing one; nothing when cancelled.
-  using PickFont = std::function<std::optional<FontChoice>(QWidget* over, const FontChoice& standing,
-                                                           bool printerFontsOnly)>;
+  using PickFont = std::function<std::optional<FontChoice>(
+      QWidget* over, const FontChoice& standing, bool printerFontsOnly)>;
   // With no `pick`, the platform's own list of fonts.
   ChtFonts(LookServices services, QWidget* parent, PickFont pick = {});
 

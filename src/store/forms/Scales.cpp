@@ -19,7 +19,8 @@ Scales::Scales(ScalesServices services, QWidget* parent)
   const NameRec& record = services_.current.Rec;
   const bool any = services_.current.NameRecNo > 0;
   auto* grid = new QGridLayout(this);
-  const std::string title = FromAnsi(record.Code.trimmed()) + "  " + FromAnsi(Trim(record.Name.trimmed()));
+  const std::string title =
+      FromAnsi(record.Code.trimmed()) + "  " + FromAnsi(Trim(record.Name.trimmed()));
   auto* label1 = NewLabel(this, any ? FormText(title) : QString("No chart is selected"));
   label1->setObjectName("Label1");
   label1->setTextFormat(Qt::PlainText);
