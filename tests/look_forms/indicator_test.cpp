@@ -307,9 +307,13 @@ TEST_F(DefaultsForm, AKeyInTheScaleMethodBoxChangesIt) {
   EXPECT_EQ(box->text(), "Automatic");
   EXPECT_EQ(Focused(), "BCCalTp");
   Press(Qt::Key_Space);
-  EXPECT_EQ(Caption("BCCalTp"), "Logarithmic") << "the others go by Space alone";
+  EXPECT_EQ(Caption("BCCalTp"), "Logarithmic") << "the others go by Space and Enter";
   QTest::keyClicks(QApplication::focusWidget(), "n");
   EXPECT_EQ(Caption("BCCalTp"), "Logarithmic");
+  Press(Qt::Key_Return);
+  EXPECT_EQ(Caption("BCCalTp"), "Arithmetic");
+  EXPECT_EQ(Osc("BCCalTp"), "False") << "nothing saved";
+  EXPECT_TRUE(dialogs.said.empty());
 }
 
 TEST_F(DefaultsForm, AnAverageSwitchedTakesEffectAtOnce) {

@@ -58,6 +58,19 @@ TEST_F(LookForms, CancelAndEscapeChangeNothing) {
   EXPECT_EQ(saved, 0);
 }
 
+TEST_F(LookForms, EnterOnCancelCancels) {
+  Open<PLW>(Look());
+  QTest::keyClicks(Spin(), "7");
+  for (const char* next : {"Command1", "Command2"}) {
+    Press(Qt::Key_Tab);
+    EXPECT_EQ(Focused(), next);
+  }
+  Press(Qt::Key_Return);
+  EXPECT_FALSE(form->isVisible());
+  EXPECT_EQ(Chart("Line Width"), "2");
+  EXPECT_EQ(saved, 0);
+}
+
 TEST_F(LookForms, LineWidthStaysWithinOneToTen) {
   settings.charts.LineWidth = 50;
   Open<PLW>(Look());

@@ -25,13 +25,12 @@ constexpr int kRowsAColumn = 11;
 
 }  // namespace
 
-// One of two words, changed by a click or by Space.
+// One of two words, changed by a click, Space or Enter.
 class ToggleBox : public QPushButton {
  public:
   ToggleBox(QWidget* parent, const char* name, const char* on, const char* off)
       : QPushButton(parent), on_(on), off_(off) {
     setObjectName(name);
-    setAutoDefault(false);
     // As wide as the longer word, so that the form keeps still.
     setText(on_.size() > off_.size() ? on_ : off_);
     setMinimumWidth(sizeHint().width());

@@ -43,7 +43,6 @@ QPushButton* ButtonRow::Add(const QString& name, const QString& caption,
                             std::function<void()> pressed) {
   auto* button = new QPushButton(caption, form_);
   button->setObjectName(name);
-  button->setAutoDefault(false);
   button->setDefault(!any_);
   any_ = true;
   addWidget(button);

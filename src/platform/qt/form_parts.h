@@ -26,7 +26,8 @@ QLabel* NewLabel(QWidget* form, const QString& caption, QWidget* buddy = nullptr
 // A label for sentences: it wraps at about `columns` letters.
 QLabel* NewNote(QWidget* form, const QString& text, int columns = 46);
 
-// The buttons at the foot of a form. The first one added is what Enter presses.
+// The buttons at the foot of a form. Enter presses the first one added, or the one that has the
+// focus.
 class ButtonRow : public QHBoxLayout {
  public:
   explicit ButtonRow(QDialog* form);

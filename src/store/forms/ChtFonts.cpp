@@ -47,7 +47,6 @@ ChtFonts::ChtFonts(LookServices services, QWidget* parent, PickFont pick)
   for (int i = 0; i < 2; ++i) {
     auto* select = new QPushButton(QString("Select Font &%1").arg(i + 1), this);
     select->setObjectName(QString("Command3(%1)").arg(i));
-    select->setAutoDefault(false);
     label3_[i] = NewLabel(this, {});
     label3_[i]->setObjectName(QString("Label3(%1)").arg(i));
     label3_[i]->setTextFormat(Qt::PlainText);
