@@ -49,6 +49,8 @@ quietly() {
 
 # Builds a preset; further words are targets.
 build_preset() {
+  # What was compiled in one checkout need not be compiled again in another.
+  export CCACHE_BASEDIR="$root" CCACHE_NOHASHDIR=true
   local preset="$1" targets=()
   shift
   [[ $# -eq 0 ]] || targets=(--target "$@")

@@ -104,7 +104,7 @@ void DrawScale(const ChartCanvas& canvas, bool lineChart, std::string_view class
   const Colour grid = canvas.colour(kFixedGrid);
   const Colour text = canvas.colour(kScalesText);
   const double left = chart.ChartLeft, right = chart.ChartRight;
-  const double size = canvas.fonts.Font2Points();
+  constexpr double size = ChartCanvas::kSmallText;
 
   pen.Box('B', {left, double(chart.ChartTop), right, double(chart.ChartBottom), border});
 
@@ -156,7 +156,8 @@ void DrawFixedGrid(const ChartCanvas& canvas) {
 }
 
 void DateAxis::Bar(std::string_view yyyymmdd, double x) {
-  if (yyyymmdd.substr(0, 6) > lastMonth_) NewMonth(yyyymmdd, x);
+  // A chart laid over another stands on the other's axis.
+  if (canvas_.chart.OscPanel <= 1 && yyyymmdd.substr(0, 6) > lastMonth_) NewMonth(yyyymmdd, x);
 }
 
 void DateAxis::NewMonth(std::string_view yyyymmdd, double x) {

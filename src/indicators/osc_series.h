@@ -9,12 +9,21 @@
 #include <vector>
 
 #include "base/numbers.h"
-#include "base/runtime_error.h"
 #include "store/chart_bars.h"
 
 namespace kora {
 
 // Small steps that several panels share.
+
+// Element i of bars or of a column; the routines count bars in int.
+template <typename Column>
+auto& At(Column& column, int i) {
+  return column[static_cast<size_t>(i)];
+}
+
+// Units of value to a unit of height. 0, which ends a panel at its frame, also where there is no
+// height.
+inline double ScaleOf(double range, double height) { return height == 0 ? 0 : range / height; }
 
 // Makes a range symmetric about zero: where `lowest` is at or above minus `highest`, it becomes
 // minus `highest`; otherwise `highest` becomes minus `lowest`.
@@ -27,14 +36,6 @@ void MakeSymmetric(T& highest, T& lowest) {
 // Index of the last bar on show, -1 when there is none.
 inline int LastBar(const ChartBars& bars) {
   return std::clamp<int>(bars.BarCount, -1, static_cast<int>(bars.bars.size()) - 1);
-}
-
-// A value kept as a 32-bit float. Error 6 when it is too large for one; a NaN and an infinity
-// stay.
-inline float CSng(double value) {
-  const float kept = static_cast<float>(value);
-  if (std::isinf(kept) && !std::isinf(value)) throw RunTimeError(kOverflow);
-  return kept;
 }
 
 // The mean of a full window of y values. They are 16-bit and so is their sum: error 6 where it

@@ -44,7 +44,7 @@ void Draw(OscHost& host, std::int16_t P, std::int16_t A, const std::string& Comp
   std::vector<std::int16_t> slots(A > 0 ? size_t(A) : 0);
   RollingWindow<std::int16_t, std::int32_t> window(slots.data(), A);
   const double spacing = host.chart.BarSpacing;
-  panel.PlotX = panel.PanelLeft - 2 * spacing;
+  panel.PlotX = CInt(panel.PanelLeft - 2 * spacing);
   float highest = -100000.0f, lowest = 100000.0f;
   std::int32_t seen = 0;
   int drawn = 0, averages = 0;
@@ -61,7 +61,7 @@ void Draw(OscHost& host, std::int16_t P, std::int16_t A, const std::string& Comp
     }
     if (seen < host.chart.Bars.FirstDataRec) continue;
 
-    panel.PlotX += spacing;
+    panel.PlotX = CInt(panel.PlotX + spacing);
     ++drawn;
     const std::int16_t y = CInt(floor - (double(bar.Value) - lowest) / scale);
     if (A > 0 && window.Add(y)) {

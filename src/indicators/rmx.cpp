@@ -51,7 +51,7 @@ void Lines(OscHost& host, OscPanel& panel, const Form& form, const RmxSeries& se
   std::optional<std::int16_t> previousCentre;
   int values = 0, averages = 0;
   for (int b = 0; b < int(series.Points.size()); ++b) {
-    panel.PlotX += spacing;
+    panel.PlotX = CInt(panel.PlotX + spacing);
     const RmxPoint& point = series.Points[size_t(b)];
     if (point.Value == 0) continue;
     const double from = panel.PlotX - spacing;

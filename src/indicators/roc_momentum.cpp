@@ -67,7 +67,7 @@ void Draw(OscHost& host, const Form& form) {
   std::int16_t previousY = 0, previousAverageY = 0;
   panel.PlotX = panel.PanelLeft - spacing;
   for (int i = 0; i < int(series.V.size()); ++i) {
-    panel.PlotX += spacing;
+    panel.PlotX = CInt(panel.PlotX + spacing);
     const std::int16_t y = yOf(series.V[size_t(i)]);
     if (i > form.P) panel.Line('H', panel.PlotX - spacing, previousY, panel.PlotX, y, kOscLine1);
     if (form.A > 0 && window.Add(y)) {

@@ -104,7 +104,7 @@ void Draw(OscHost& host, int& bar) {
   std::int32_t previousKY = 0, previousDY = 0, previousThirdY = 0;
   int zone = 0, previousZone = 0;  // 1 above the 90% line, 2 between, 3 below the 20% line
   for (bar = std::max(0, form.K + 1); bar <= last; ++bar) {
-    const double x = panel.PanelLeft + double(bar) * host.chart.BarSpacing;
+    const double x = CInt(panel.PanelLeft + double(bar) * host.chart.BarSpacing);
     const PriceRange window = ranges[size_t(bar)];
     const float above = bars[size_t(bar)].Close - window.Lowest;
     const float height = window.Highest - window.Lowest;

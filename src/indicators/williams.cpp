@@ -10,10 +10,10 @@
 namespace kora {
 namespace {
 
-// CInt that leaves `y` as it was where the value does not fit 16 bits or is no number.
-void SetY(std::int16_t& y, double value) {
+// CInt that leaves `place` as it was where the value does not fit 16 bits or is no number.
+void SetPlace(std::int16_t& place, double value) {
   const double rounded = RoundHalfEven(value);
-  if (rounded >= -32768 && rounded <= 32767) y = CInt(rounded);
+  if (rounded >= -32768 && rounded <= 32767) place = CInt(rounded);
 }
 
 void Draw(OscHost& host, int P) {
@@ -31,17 +31,17 @@ void Draw(OscHost& host, int P) {
       WilliamsSeries(host.chart.Bars, host.request.Name.RecType, P);
   float slots[3];
   RollingWindow<float, float> window(slots, 3);
-  std::int16_t y = 0, meanY = 0;
+  std::int16_t x = panel.PanelLeft, y = 0, meanY = 0;
   double previousX = 0, previousY = 0;
   int points = 0;
   for (const WilliamsPoint& point : series) {
-    panel.PlotX = panel.PanelLeft + double(point.Bar) * host.chart.BarSpacing;
-    SetY(y, point.W * unit + top);
+    SetPlace(x, panel.PanelLeft + double(point.Bar) * host.chart.BarSpacing);
+    SetPlace(y, point.W * unit + top);
     if (!window.Add(y)) continue;
-    SetY(meanY, window.Total() / 3.0);
-    if (points >= 3) panel.Line('H', previousX, previousY, panel.PlotX, meanY, kOscLine1);
+    SetPlace(meanY, window.Total() / 3.0);
+    if (points >= 3) panel.Line('H', previousX, previousY, x, meanY, kOscLine1);
     ++points;
-    previousX = panel.PlotX;
+    previousX = x;
     previousY = meanY;
   }
 }

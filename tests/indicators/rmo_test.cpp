@@ -283,6 +283,15 @@ TEST(RmoTest, PriceThatIsNoNumberEndsInTheMessage) {
   EXPECT_EQ(f.dialogs.said[0].text, "There is an unexpected error No. 6\nOverflow");
 }
 
+TEST(RmoTest, BarBeyond16BitsIsAnOverflow) {
+  Rmo f(2, 0);
+  f.Put(kOnes, kIndexCloses);
+  f.chart.BarSpacing = 20000;  // the plot would begin at -39,958
+  ShowRMO(f.host);
+  ASSERT_EQ(f.dialogs.said.size(), 1u);
+  EXPECT_EQ(f.dialogs.said[0].text, "There is an unexpected error No. 6\nOverflow");
+}
+
 TEST(RmoTest, RealPricesAgreeWithAPlainComputation) {
   const std::vector<ChartBar> prices = RealBars("AAPL.csv"), index = RealBars("INTC.csv");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";

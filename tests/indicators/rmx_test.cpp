@@ -290,6 +290,15 @@ TEST(RmxTest, PriceThatIsNoNumberEndsInTheMessage) {
   EXPECT_EQ(f.dialogs.said[0].text, "There is an unexpected error No. 6\nOverflow");
 }
 
+TEST(RmxTest, BarBeyond16BitsIsAnOverflow) {
+  Rmx f(2, 0);
+  f.Put(kOnes, kIndexCloses);
+  f.chart.BarSpacing = 20000;  // bar 2 would stand at 40,042
+  ShowRMX(f.host);
+  ASSERT_EQ(f.dialogs.said.size(), 1u);
+  EXPECT_EQ(f.dialogs.said[0].text, "There is an unexpected error No. 6\nOverflow");
+}
+
 TEST(RmxTest, RealPricesAgreeWithAPlainComputation) {
   std::vector<ChartBar> prices = RealBars("AAPL.csv"), index = RealBars("INTC.csv");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";

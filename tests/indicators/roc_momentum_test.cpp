@@ -284,6 +284,15 @@ TEST(MomentumTest, PanelByHandHasNoAverage) {
             "H,44,380,46,321,45\r\nH,46,321,48,439,45\r\nH,48,439,50,380,45\r\n");
 }
 
+TEST(RocTest, BarBeyond16BitsIsAnOverflow) {
+  Change f(1, 2);
+  f.Closes(kCloses);
+  f.chart.BarSpacing = 20000;  // bar 2 would stand at 40,042
+  ShowROC(f.host);
+  ASSERT_EQ(f.dialogs.said.size(), 1u);
+  EXPECT_EQ(f.dialogs.said[0].text, "There is an unexpected error No. 6\nOverflow");
+}
+
 TEST(RocTest, RealPricesAgreeWithAPlainComputation) {
   const std::vector<ChartBar> prices = test::RealBars("ORCL.csv");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";

@@ -420,6 +420,15 @@ TEST(StochasticTest, PanelTooLowForAScaleIsADivisionByZero) {
   EXPECT_EQ(f.dialogs.said[0].text, "There is an unexpected error No. 11\nDivision by zero");
 }
 
+TEST(StochasticTest, BarBeyond16BitsIsAnOverflow) {
+  Stochastic f(1, 0);
+  f.Closes(kCloses);
+  f.chart.BarSpacing = 20000;  // bar 2 would stand at 40,042
+  ShowStochasticFX(f.host);
+  ASSERT_EQ(f.dialogs.said.size(), 1u);
+  EXPECT_NE(f.dialogs.said[0].text.find("at date (20000105)"), std::string::npos);
+}
+
 TEST(StochasticTest, RealPricesAgreeWithAPlainComputation) {
   const std::vector<ChartBar> prices = test::RealBars("AAPL.csv");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";

@@ -176,6 +176,15 @@ TEST(WilliamsTest, WeeklyAndMonthlyChartsShareTheTwinPeriod) {
   EXPECT_EQ(f.Lines('T')[0], "T,8.25,44,313,Williams %R Oscillator (9 Period),27");
 }
 
+TEST(WilliamsTest, BarBeyond16BitsKeepsTheLastPlace) {
+  Williams f(1);
+  f.Between({15, 20, 10, 15, 20, 15, 10, 20});
+  f.chart.BarSpacing = 5400;  // bar 6 stands at 32,442 and bar 7 would at 37,842
+  ShowWilliams(f.host);
+  EXPECT_TRUE(f.dialogs.said.empty());
+  EXPECT_EQ(f.Lines('H'), (Texts{"H,27042,360,32442,380,45", "H,32442,380,32442,380,45"}));
+}
+
 TEST(WilliamsTest, RealPricesAgreeWithAPlainComputation) {
   const std::vector<ChartBar> prices = test::RealBars("INTC.csv");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";
