@@ -2,11 +2,9 @@
 
 #include <algorithm>
 #include <cmath>
-#include <limits>
 
 #include "base/dates.h"
 #include "base/numbers.h"
-#include "base/runtime_error.h"
 #include "base/text.h"
 
 namespace kora {
@@ -28,12 +26,6 @@ std::optional<std::int16_t> WholeWithin(std::string_view text, int least, int mo
   const std::optional<float> value = ParseFloat(Trim(text));
   if (!value || *value < float(least) || *value > float(most)) return std::nullopt;
   return CInt(double(*value));
-}
-
-float PriceOf(std::string_view text) {
-  const double value = Val(text);
-  if (std::fabs(value) > double(std::numeric_limits<float>::max())) throw RunTimeError(kOverflow);
-  return static_cast<float>(value);
 }
 
 }  // namespace
@@ -130,7 +122,7 @@ std::string FinishDateText(std::string_view yyyymmdd) {
 
 void SaveScales(const Files& files, const std::string& dataPath, CurrentName& current,
                 std::string_view base, std::string_view top, std::string_view pfInc) {
-  const float values[3] = {PriceOf(base), PriceOf(top), PriceOf(pfInc)};
+  const float values[3] = {CSng(Val(base)), CSng(Val(top)), CSng(Val(pfInc))};
   RewriteCurrentName(files, dataPath, current, [&](NameRec& record) {
     record.Base = values[0];
     record.Top = values[1];
