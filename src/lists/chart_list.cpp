@@ -1,0 +1,216 @@
+#include "lists/chart_list.h"
+
+#include <algorithm>
+#include <limits>
+#include <unordered_map>
+
+#include "base/numbers.h"
+#include "base/record_file.h"
+#include "base/runtime_error.h"
+#include "platform/settings_file.h"
+#include "store/name_file.h"
+
+namespace kora {
+namespace {
+
+constexpr std::string_view kLetters = "ABCDEFGHJKZ";  // no I
+constexpr std::string_view kUserSection = "KORA Charting System";
+
+char LetterOf(std::int16_t ChartListNo) {
+  if (ChartListNo < kFirstChartList || ChartListNo > kResultList) throw RunTimeError(kBadCall);
+  return kLetters[size_t(ChartListNo - kFirstChartList)];
+}
+
+std::string Key(std::int16_t ChartListNo) {
+  return std::string("SubList") + LetterOf(ChartListNo);
+}
+
+std::string OwnName(std::int16_t ChartListNo) {
+  return std::string("Chart List ") + LetterOf(ChartListNo);
+}
+
+std::string Padded(std::string_view code) { return PadRight(UCase(Trim(code)), 6); }
+
+// The codes of the name file with the first record that has each.
+class NameIndex {
+ public:
+  NameIndex(const Files& files, const std::string& dataPath) {
+    const NameFile names(files, NameFilePath(dataPath));
+    CInt(names.count());  // a record number has 16 bits
+    std::int16_t number = 0;
+    const std::vector<NameRec> records = names.ReadAll();
+    numbers_.reserve(records.size());
+    for (const NameRec& rec : records) numbers_.try_emplace(std::string(rec.Code.raw()), ++number);
+  }
+
+  // The records of the codes that are there; the others, unless blank, go to `dropped`.
+  std::vector<ListRec> Refreshed(std::span<const std::string> codes, ListCodes& dropped) const {
+    std::vector<ListRec> out;
+    out.reserve(codes.size());
+    for (const std::string& code : codes) {
+      if (Trim(code).empty()) continue;
+      const auto found = Trim(code).size() <= 6 ? numbers_.find(Padded(code)) : numbers_.end();
+      if (found == numbers_.end()) {
+        dropped.push_back(code);
+        continue;
+      }
+      ListRec rec;
+      rec.ListRecNo = found->second;
+      rec.ListCode.set(found->first);
+      out.push_back(rec);
+    }
+    return out;
+  }
+
+ private:
+  std::unordered_map<std::string, std::int16_t> numbers_;
+};
+
+std::string_view BytesOf(std::span<const ListRec> records) {
+  return {reinterpret_cast<const char*>(records.data()), records.size_bytes()};
+}
+
+bool Holds(const ListCodes& list, std::string_view code) {
+  return std::find(list.begin(), list.end(), code) != list.end();
+}
+
+// In list order, each once, within the list.
+std::vector<size_t> InOrder(std::span<const size_t> places, size_t size) {
+  std::vector<size_t> out(places.begin(), places.end());
+  std::sort(out.begin(), out.end());
+  out.erase(std::unique(out.begin(), out.end()), out.end());
+  while (!out.empty() && out.back() >= size) out.pop_back();
+  return out;
+}
+
+}  // namespace
+
+std::string ListFileName(std::int16_t ChartListNo) { return Key(ChartListNo) + ".Dat"; }
+
+std::string ListFilePath(const std::string& dataPath, std::int16_t ChartListNo) {
+  return dataPath + ListFileName(ChartListNo);
+}
+
+std::string ChartListName(const SettingsFile& user, std::int16_t ChartListNo) {
+  if (ChartListNo == kResultList) return "Chart Scan Results";
+  const std::string kept = user.GetSetting(kUserSection, Key(ChartListNo));
+  return kept == kUnknown ? OwnName(ChartListNo) : kept;
+}
+
+UserListNames GetSubLists(const SettingsFile& user) {
+  UserListNames names;
+  for (size_t i = 0; i < names.size(); ++i)
+    names[i] = ChartListName(user, std::int16_t(kFirstChartList + int(i)));
+  return names;
+}
+
+bool SaveSLNames(SettingsFile& user, const UserListNames& names) {
+  bool saved = true;
+  for (size_t i = 0; i < names.size(); ++i) {
+    const auto number = std::int16_t(kFirstChartList + int(i));
+    saved = user.PutSetting(kUserSection, Key(number), names[i]) && saved;
+  }
+  return saved;
+}
+
+std::vector<ListRec> ReadList(const Files& files, const std::string& dataPath,
+                              std::int16_t ChartListNo) {
+  const std::string path = ListFilePath(dataPath, ChartListNo);
+  if (!files.CheckFile(path)) return {};
+  const RecordFile<ListRec> list(files, path);
+  CInt(list.count());
+  return list.ReadAll();
+}
+
+void WriteList(const Files& files, const std::string& dataPath, std::int16_t ChartListNo,
+               std::span<const ListRec> records) {
+  CInt(double(records.size()));
+  files.WriteAll(ListFilePath(dataPath, ChartListNo), BytesOf(records));
+}
+
+ListCodes CodesOf(std::span<const ListRec> records) {
+  ListCodes codes;
+  codes.reserve(records.size());
+  for (const ListRec& rec : records)
+    if (const std::string_view code = Trim(rec.ListCode.trimmed()); !code.empty())
+      codes.emplace_back(code);
+  return codes;
+}
+
+ListCodes SaveSubList(const Files& files, const std::string& dataPath, std::int16_t ChartListNo,
+                      std::span<const std::string> codes) {
+  ListCodes dropped;
+  WriteList(files, dataPath, ChartListNo, NameIndex(files, dataPath).Refreshed(codes, dropped));
+  return dropped;
+}
+
+ListCheck CheckAllLists(const Files& files, const std::string& dataPath, std::int16_t last) {
+  const NameIndex index(files, dataPath);
+  ListCheck check;
+  for (std::int16_t number = kFirstChartList; number <= last; ++number) {
+    if (!files.CheckFile(ListFilePath(dataPath, number))) continue;
+    ListCodes dropped;
+    const auto codes = CodesOf(ReadList(files, dataPath, number));
+    WriteList(files, dataPath, number, index.Refreshed(codes, dropped));
+    ++check.lists;
+    check.removed += int(dropped.size());
+  }
+  return check;
+}
+
+bool AddCode(ListCodes& list, std::string_view code) {
+  std::string added = UCase(Trim(code));
+  if (added.empty() || Holds(list, added)) return false;
+  list.push_back(std::move(added));
+  return true;
+}
+
+std::optional<size_t> FindTypedCode(std::span<const std::string> nameCodes,
+                                    std::string_view typed) {
+  const std::string code = UCase(Trim(typed));
+  if (code.empty()) return std::nullopt;
+  for (size_t i = 0; i < nameCodes.size(); ++i)
+    if (Trim(nameCodes[i]) == code) return i;
+  return std::nullopt;
+}
+
+void DeleteItems(ListCodes& list, std::span<const size_t> places) {
+  const std::vector<size_t> order = InOrder(places, list.size());
+  for (auto place = order.rbegin(); place != order.rend(); ++place)
+    list.erase(list.begin() + std::ptrdiff_t(*place));
+}
+
+std::string DeleteQuestion(std::string_view code) {
+  return "Delete " + std::string(code) + "  ?";
+}
+
+std::string DeleteAllFromQuestion(std::string_view listName) {
+  return "Delete all items from " + std::string(listName);
+}
+
+std::string ChangedQuestion(std::string_view listName) {
+  return (listName.empty() ? "List" : std::string(listName)) + " has changed. SAVE Changes?";
+}
+
+std::string_view CheckSides(const ListSide& a, const ListSide& b) {
+  if (a.ChartListNo == 0 || b.ChartListNo == 0) return "Both lists must be displayed";
+  if (a.ChartListNo == b.ChartListNo) return "Lists cannot be same";
+  return {};
+}
+
+std::string_view CopyItems(const ListSide& from, ListSide& to, std::span<const size_t> places) {
+  if (const std::string_view fault = CheckSides(from, to); !fault.empty()) return fault;
+  for (const size_t place : InOrder(places, from.Codes.size()))
+    if (AddCode(to.Codes, from.Codes[place])) to.Changed = true;
+  return {};
+}
+
+std::string_view MoveItems(ListSide& from, ListSide& to, std::span<const size_t> places) {
+  if (const std::string_view fault = CopyItems(from, to, places); !fault.empty()) return fault;
+  const size_t before = from.Codes.size();
+  DeleteItems(from.Codes, places);
+  if (from.Codes.size() != before) from.Changed = true;
+  return {};
+}
+
+}  // namespace kora
