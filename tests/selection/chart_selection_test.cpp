@@ -940,13 +940,13 @@ TEST_F(ChartSelectionTest, TheSecondChartStartsFromTheFirstAndWritesNothing) {
   EXPECT_EQ(view().Combo1, kCandleIndex);
   EXPECT_EQ(view().Text3, "4");
   ExpectShown("BHP", 3);
-  Selection().ChooseSecondStyle(kPointFigureIndex);
+  Selection().ChooseStyle(kPointFigureIndex);
   EXPECT_EQ(view().Label4, "Point Reversal");
   EXPECT_TRUE(state.DateLimitOn) << "the first chart's limit is the pair's";
   EXPECT_TRUE(state.OscShown);
-  Selection().ChooseSecondStyle(kLineIndex);
+  Selection().ChooseStyle(kLineIndex);
   Selection().EnterCode("XAO");
-  ASSERT_TRUE(Selection().OKSecond());
+  ASSERT_TRUE(Selection().OK());
   EXPECT_EQ(state.ChartIndex, 3);
   EXPECT_EQ(Kept("Type"), "unknown");
 }

@@ -100,14 +100,16 @@ void SubList2::ListChosen(int side, int index) {
   ListSide chosen;
   chosen.ChartListNo = std::int16_t(index + kFirstChartList);
   if (chosen.ChartListNo == sides_[side].ChartListNo) return;
-  // The same list twice would be saved twice, each time without the other's changes.
-  const ListSide& other = sides_[1 - side];
-  const std::string_view fault = other.ChartListNo == 0 ? "" : CheckSides(chosen, other);
-  if (!fault.empty()) services_.dialogs.Message(fault, kTitle);
-  if (!fault.empty() || !LeaveList(side)) {
-    combo1_[side]->setCurrentIndex(
-        sides_[side].ChartListNo == 0 ? -1 : sides_[side].ChartListNo - kFirstChartList);
+  if (!LeaveList(side)) {
+    combo1_[side]->setCurrentIndex(sides_[side].ChartListNo - kFirstChartList);
     return;
+  }
+  // The same list twice would be saved twice, each time without the other's changes: this side
+  // stays without a list.
+  const ListSide& other = sides_[1 - side];
+  if (other.ChartListNo == chosen.ChartListNo) {
+    services_.dialogs.Message(CheckSides(chosen, other), kTitle);
+    chosen.ChartListNo = 0;
   }
   sides_[side] = chosen;
   ShowSide(side);
