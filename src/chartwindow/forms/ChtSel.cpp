@@ -155,16 +155,16 @@ QLineEdit* ChtSel::AddSwitch(const char* name) {
 
 // An average shows as on the chart: in its colour, on the chart's background. Unticked, its
 // colour is held to what can be read on the form.
-void ChtSel::ColourAverage(QCheckBox* box, bool ticked, int entry) {
+void ChtSel::ColourAverage(QCheckBox* box, bool onGround, int entry) {
   QPalette palette;
   QColor text = ColourOf(services_.colours[size_t(entry)]);
-  const QColor ground = ticked ? ColourOf(services_.colours[kBackground])
-                               : palette.color(QPalette::Window);
+  const QColor ground = onGround ? ColourOf(services_.colours[kBackground])
+                                 : palette.color(QPalette::Window);
   if (!Readable(text, ground)) text = palette.color(QPalette::WindowText);
-  if (ticked) palette.setColor(box->backgroundRole(), ground);
+  if (onGround) palette.setColor(box->backgroundRole(), ground);
   palette.setColor(QPalette::Active, QPalette::WindowText, text);
   palette.setColor(QPalette::Inactive, QPalette::WindowText, text);
-  box->setAutoFillBackground(ticked);
+  box->setAutoFillBackground(onGround);
   box->setPalette(palette);
 }
 
@@ -177,8 +177,8 @@ void ChtSel::Refresh() {
   oAve2_->setText(QString::fromStdString(view.OAve2));
   oAve1_->setChecked(view.OAve1Ticked);
   oAve2_->setChecked(view.OAve2Ticked);
-  ColourAverage(oAve1_, view.OAve1Ticked, view.OAve1Colour);
-  ColourAverage(oAve2_, view.OAve2Ticked, view.OAve2Colour);
+  ColourAverage(oAve1_, view.ExtrasEnabled && view.OAve1Ticked, view.OAve1Colour);
+  ColourAverage(oAve2_, view.ExtrasEnabled && view.OAve2Ticked, view.OAve2Colour);
   for (QWidget* extra : std::initializer_list<QWidget*>{combo2_, combo3_, oAve1_, oAve2_})
     extra->setEnabled(view.ExtrasEnabled);
   text6_->setText(QString::fromStdString(view.Text6));

@@ -21,7 +21,7 @@ class ChtSel : public SelectionForm {
 
  private:
   QLineEdit* AddSwitch(const char* name);
-  void ColourAverage(QCheckBox* box, bool ticked, int entry);
+  void ColourAverage(QCheckBox* box, bool onGround, int entry);
   void Activated();
   void OpenChtOptions();
   void OpenSearch();

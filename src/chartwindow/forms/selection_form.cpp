@@ -66,10 +66,6 @@ SelectionForm::SelectionForm(const char* name, const QString& title, ChtSelServi
   label4_->setObjectName("Label4");
   connect(text3_, &QLineEdit::textEdited, this,
           [this](const QString& text) { services_.selection.TypeSpacing(text.toStdString()); });
-  connect(text3_, &QLineEdit::editingFinished, this, [this] {
-    services_.selection.LeaveSpacing();
-    Refresh();
-  });
 
   ok_ = AddButton("OK", "SHOW C&HART");
   command2_ = AddButton("Command2", "Clos&e");
@@ -199,6 +195,9 @@ bool SelectionForm::eventFilter(QObject* object, QEvent* event) {
       Step(key == Qt::Key_Up);
       return true;
     }
+  } else if (object == text3_ && event->type() == QEvent::FocusOut) {
+    services_.selection.LeaveSpacing();
+    Refresh();
   } else if (FieldMouse(object, event->type())) {
     return true;
   }
@@ -209,7 +208,7 @@ void SelectionForm::keyPressEvent(QKeyEvent* event) {
   switch (event->key()) {
     case Qt::Key_Return:
     case Qt::Key_Enter:
-      if (auto* button = qobject_cast<QPushButton*>(focusWidget())) button->click();
+      if (auto* button = qobject_cast<QAbstractButton*>(focusWidget())) button->click();
       return;
     case Qt::Key_PageUp:
       vScroll1_->triggerAction(QAbstractSlider::SliderSingleStepSub);
