@@ -2,7 +2,7 @@
 
 kora_packages=(
   cmake ninja-build g++ ccache
-  qt6-base-dev libqt6svg6-dev libgl1-mesa-dev
+  qt6-base-dev qt6-svg-dev libgl1-mesa-dev
   libcli11-dev libgtest-dev libbenchmark-dev
   fonts-liberation
 )
@@ -49,6 +49,8 @@ quietly() {
 
 # Builds a preset; further words are targets.
 build_preset() {
+  # What was compiled in one checkout need not be compiled again in another.
+  export CCACHE_BASEDIR="$root" CCACHE_NOHASHDIR=true
   local preset="$1" targets=()
   shift
   [[ $# -eq 0 ]] || targets=(--target "$@")

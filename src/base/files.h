@@ -92,7 +92,7 @@ std::string WithBackslash(std::string_view folder);
 // no path or wildcard character, no control byte, no device name ("NUL", "COM1"), no dots
 // at its end. Codes become file names only after this test.
 bool IsFileCode(std::string_view code);
-// Trimmed code + extension, as "BHP" and ".WDT" give "BHP.WDT". Error 52 unless IsFileCode.
+// Trimmed code + extension, as "ORE" and ".WDT" give "ORE.WDT". Error 52 unless IsFileCode.
 std::string CodeFileName(std::string_view code, std::string_view extension);
 
 // Reads lines that end in CR LF or LF. The last needs no end.

@@ -25,8 +25,12 @@ void ChartScript::Close() {
   if (!open_) return;
   open_ = false;
   if (!files_) return;
-  const auto file = files_->Open(path_, append_ ? OpenMode::kCreate : OpenMode::kReplace);
-  file->WriteAt(append_ ? file->Size() : 0, buffer_.data(), buffer_.size());
+  // Written over and cut, not emptied first: file systems write a file that was emptied to the
+  // disk as it closes, which costs more than the whole chart.
+  const auto file = files_->Open(path_, OpenMode::kCreate);
+  const std::uint64_t at = append_ ? file->Size() : 0;
+  file->WriteAt(at, buffer_.data(), buffer_.size());
+  if (file->Size() > at + buffer_.size()) file->Truncate(at + buffer_.size());
 }
 
 char ScriptLine::letter() const {

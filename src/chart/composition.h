@@ -41,7 +41,7 @@ struct Composition {
   std::int16_t UpperBarCount = 0;  // BarCount of the first of two charts
   bool ScaleMissing = false;       // a manual scale was asked for and there is none
   bool ChartDrawn = false;         // the composition ended without a failure
-  std::string DataFile;            // "BHP.WDT", for messages
+  std::string DataFile;            // "ORE.WDT", for messages
   double SurfaceHeight = 0;
 };
 

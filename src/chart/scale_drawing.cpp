@@ -156,7 +156,8 @@ void DrawFixedGrid(const ChartCanvas& canvas) {
 }
 
 void DateAxis::Bar(std::string_view yyyymmdd, double x) {
-  if (yyyymmdd.substr(0, 6) > lastMonth_) NewMonth(yyyymmdd, x);
+  // A chart laid over another stands on the other's axis.
+  if (canvas_.chart.OscPanel <= 1 && yyyymmdd.substr(0, 6) > lastMonth_) NewMonth(yyyymmdd, x);
 }
 
 void DateAxis::NewMonth(std::string_view yyyymmdd, double x) {

@@ -4,6 +4,7 @@
 #include <cmath>
 #include <limits>
 #include <new>
+#include <vector>
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
@@ -14,9 +15,17 @@
 namespace kora {
 namespace {
 
-// The longest a chart of all panels over 32,767 records gets, with room to spare.
+// Far above any chart of ours; what is larger is not worth reading.
 constexpr std::uint64_t kLargestSavedChart = 16u << 20;
 constexpr double kLargestFont = 500;
+constexpr size_t kMostFontSizes = 32;  // a chart has a handful
+
+// What one play may draw, in units of a solid line's length, about ten nanoseconds each on a
+// picture in memory: far more than a chart needs, where a hostile script would keep the window
+// busy for minutes.
+constexpr double kMostWork = 2e8;
+constexpr double kWorkOfCommand = 10, kWorkOfText = 500, kWorkOfCharacter = 40;
+constexpr double kDashedFactor = 4, kFilledUnitsPerWork = 40;
 
 constexpr std::string_view kLineLetters = "BFHLMCDEV";
 constexpr std::string_view kTextLetters = "TSZ";
@@ -32,16 +41,14 @@ double Place(const ScriptLine& line, int field) {
   return value;
 }
 
-double FontSize(const ScriptLine& line) {
-  const double size = Place(line, 2);
-  if (size < 1 || size > kLargestFont) throw RunTimeError(kInvalidValue);
-  return size;
-}
-
 class Player {
  public:
   Player(Surface& surface, const FontSettings& fonts, const ChartColours& colours)
-      : surface_(surface), fonts_(fonts), textColour_(colours[kScalesText]) {
+      : surface_(surface),
+        fonts_(fonts),
+        textColour_(colours[kScalesText]),
+        width_(surface.ScaleWidth()),
+        height_(surface.ScaleHeight()) {
     font_ = {fonts.Font1Name, ChartFontSize(), fonts.Font1Bold, false};
     surface_.SetFont(font_);
     surface_.SetDrawStyle(DrawStyle::kSolid);
@@ -56,6 +63,7 @@ class Player {
     } else if (Holds(kLineLetters, letter)) {
       Segment(letter, line);
     } else if (letter == 'P') {
+      Spend(kWorkOfCommand);
       surface_.PSet(Place(line, 2), Place(line, 3), line.whole(4));
     } else {
       return;
@@ -68,7 +76,23 @@ class Player {
  private:
   double ChartFontSize() const { return fonts_.TitleSize >= 1 ? fonts_.TitleSize : 8; }
 
+  void Spend(double work) {
+    work_ += work;
+    if (work_ > kMostWork) throw RunTimeError(kOutOfMemory);
+  }
+
+  double FontSize(const ScriptLine& line) {
+    const double size = Place(line, 2);
+    if (size < 1 || size > kLargestFont) throw RunTimeError(kInvalidValue);
+    if (std::find(sizes_.begin(), sizes_.end(), size) == sizes_.end()) {
+      if (sizes_.size() == kMostFontSizes) throw RunTimeError(kOutOfMemory);
+      sizes_.push_back(size);
+    }
+    return size;
+  }
+
   void Print(const ScriptLine& line, const SurfaceFont& font) {
+    Spend(kWorkOfText + kWorkOfCharacter * double(line.text[4].size()));
     const double x = Place(line, 3), y = Place(line, 4);
     const Colour colour = line.whole(6);
     surface_.SetFont(font);
@@ -105,6 +129,12 @@ class Player {
     const std::int32_t x1 = line.whole(2), y1 = line.whole(3), x2 = line.whole(4),
                        y2 = line.whole(5);
     const Colour colour = line.whole(6);
+    const double across = std::min(std::abs(double(x2) - x1), width_);
+    const double down = std::min(std::abs(double(y2) - y1), height_);
+    const bool filled = letter == 'C' || letter == 'F';
+    const bool broken = letter == 'D' || letter == 'E' || letter == 'V';
+    Spend(kWorkOfCommand + (filled ? across * down / kFilledUnitsPerWork
+                                   : (across + down) * (broken ? kDashedFactor : 2)));
     switch (letter) {
       case 'B': surface_.Box(x1, y1, x2, y2, colour); return;
       case 'C':
@@ -125,6 +155,9 @@ class Player {
   const FontSettings& fonts_;
   Colour textColour_;
   SurfaceFont font_;  // Font 1 as the lines have left it
+  double width_, height_;
+  double work_ = 0;
+  std::vector<double> sizes_;  // of fonts seen so far
   bool commandSeen_ = false;
 };
 

@@ -16,8 +16,8 @@ class Dialogs;
 //
 // True when the script was played to its end and held a command. False when it held none, or
 // when a line could not be played: a seventh field, a number beyond its range, a font size that
-// is none, a line longer than any script's, a last line cut off in the middle. What was drawn
-// until then stays. Never raises.
+// is none, a line longer than any script's, a last line cut off in the middle, or more drawing
+// than any chart needs (a few seconds' worth). What was drawn until then stays. Never raises.
 bool PlayChartScript(std::string_view script, Surface& surface, const FontSettings& fonts,
                      const ChartColours& colours);
 

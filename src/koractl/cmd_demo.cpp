@@ -15,7 +15,8 @@ void AddDemo(CLI::App& app, CommandLine& line) {
       ->capture_default_str()
       ->check(CLI::Range(1, 40));
   command->add_option("--seed", options->seed, "The same seed gives the same bytes")
-      ->capture_default_str();
+      ->capture_default_str()
+      ->check(CLI::NonNegativeNumber);
   command->callback([&line, options] {
     line.run = [&line, options] {
       Run run(line);

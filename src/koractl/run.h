@@ -29,7 +29,7 @@ struct Run {
 
   // Finds the security, in any case, or ends the operation: session.current is set.
   void Locate(const std::string& code);
-  // "BHP.WDT" of the security found.
+  // "ORE.WDT" of the security found.
   std::string DataFileName() const;
   // Ends the operation in the words that a chart has for a failure with its price file.
   // `record`: the record being read, 0 none.

@@ -68,6 +68,9 @@ struct SortEntry {
 void ShellSort(std::vector<SortEntry>& items);
 std::string SortKey(const NameRec& record, NameSort mode);
 
+// The records in sorted order, those with NameStatus 1 left out.
+std::vector<NameRec> SortedNames(std::span<const NameRec> records, NameSort mode);
+
 // Sorts the file, dropping records with NameStatus 1. With fewer than two records the file is
 // left as it is. Works over TEMP.WK1 and renames it to Names.DAT; a failure leaves the old file.
 void SortNameFile(const Files& files, const std::string& dataPath, NameSort mode);

@@ -8,9 +8,6 @@
 
 namespace kora {
 
-// The records in sorted order, those with NameStatus 1 left out.
-std::vector<NameRec> SortedNames(std::span<const NameRec> records, NameSort mode);
-
 // Writes the records to the work file, brings them to the disk and renames the work file over
 // `path`. A failure leaves `path` as it was and no work file.
 void ReplaceThrough(const Files& files, const std::string& workPath, const std::string& path,

@@ -400,18 +400,6 @@ void StagePrices(const Files& files, const std::string& dataPath, const std::str
   Told(path, [&] { set.Add(path, BytesOf(merged)); });
 }
 
-// The records in the order of a name file after a save, deleted ones left out.
-std::vector<NameRec> SortedNames(const std::vector<NameRec>& names) {
-  std::vector<SortEntry> order;
-  for (size_t i = 0; i < names.size(); ++i)
-    if (names[i].NameStatus != 1)
-      order.push_back({std::int32_t(i), SortKey(names[i], NameSort::kCategory)});
-  ShellSort(order);
-  std::vector<NameRec> out;
-  for (const SortEntry& entry : order) out.push_back(names[size_t(entry.RecNo)]);
-  return out;
-}
-
 // Record numbers go stale by the sort, and a list shows what stands at its numbers.
 void StageLists(const Files& files, const std::string& dataPath,
                 const std::vector<NameRec>& names, FileSet& set) {
@@ -470,7 +458,7 @@ void Import(const Files& files, const std::string& dataPath, const std::string& 
   }
   // Names behind prices: a name without a price file would fail to chart.
   if (added) {
-    const auto sorted = SortedNames(names);
+    const auto sorted = SortedNames(names, NameSort::kCategory);
     if (sorted.size() > size_t(kMostRecords))
       throw Refused("the name file would have more than " + std::to_string(kMostRecords) +
                     " records");

@@ -371,6 +371,18 @@ TEST(DateAxisTest, WeeklyChartsShowYearsAlone) {
   EXPECT_EQ(texts, 1);
 }
 
+TEST(DateAxisTest, SuperimposedSecondChartStandsOnTheAxisOfTheFirst) {
+  ComposerFixture f;
+  f.Day("20240315", 10, 11, 9, 10);
+  f.chart.OscPanel = 1;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("T,8.25,42,431,M,27"));
+  f.script.Open(false);
+  f.chart.OscPanel = 2;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_FALSE(f.Wrote("T,8.25,42,431,M,27"));
+}
+
 TEST(ScaleTest, LabelsOfThirteenStepsAndMoreThinFromTheSeventhOn) {
   ComposerFixture f;
   f.request.AutoScale = false;

@@ -330,6 +330,33 @@ TEST_F(LogoTest, GivingUpTheDriveEndsTheProgram) {
   EXPECT_FALSE(logo->isVisible());
 }
 
+TEST_F(LogoTest, SettingsThatMakeNoSenseAreToldAndTheProgramStands) {
+  for (const std::string system : {"1:\\x\\y\\", "\\\\\\", "c:\\a\\\\b\\", "c:\\..\\..\\"}) {
+    home.Put("Kora.ini", "[KoraPaths]\r\nSystem=" + system + "\r\nChtData=" + system + "\r\n");
+    session = std::make_unique<Session>(home.path(), dialogs);
+    dialogs.replies = {std::nullopt};
+    dialogs.answers = {Answer::kYes, Answer::kYes};
+    if (!Make().Start(false)) continue;
+    ASSERT_TRUE(MainShows()) << system;
+    dialogs.said.clear();
+    Find<QAction>(logo->main(), "mnuChartDisplay")->trigger();
+    EXPECT_EQ(dialogs.said.size(), 1u) << system;
+    Find<QAction>(logo->main(), "mnuPaths")->trigger();
+    logo.reset();
+  }
+}
+
+TEST_F(LogoTest, ASettingsFileOfRubbishStartsThePromptOfTheDrive) {
+  std::string rubbish;
+  for (int i = 0; i < 5000; ++i) rubbish += char(i * 131 + i / 7);
+  home.Put("Kora.ini", rubbish);
+  session = std::make_unique<Session>(home.path(), dialogs);
+  dialogs.replies = {std::nullopt};
+  EXPECT_FALSE(Make().Start(false));
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].title, "Drive");
+}
+
 TEST(Help, TheGuideIsFoundBesideTheProgramOrAboveIt) {
   QTemporaryDir folder;
   const QDir root(folder.path());

@@ -241,7 +241,8 @@ TEST(ReversalLegendTest, FiveMarksInTheirColours) {
 }
 
 TEST(MmaBoxesTest, BlankIsZeroAndTheRangeEndsAtSixHundred) {
-  std::array<std::string, 12> boxes{"3", "", "600", " 10 ", "0", "abc", "12.5", "7", "", "", "", ""};
+  std::array<std::string, 12> boxes{"3",    "",  "600", " 10 ", "0", "abc",
+                                    "12.5", "7", "",    "",     "",  ""};
   size_t refused = 99;
   EXPECT_EQ(ReadMMABoxes(boxes, refused),
             (MmaPeriods{3, 0, 600, 10, 0, 0, 12, 7, 0, 0, 0, 0}));

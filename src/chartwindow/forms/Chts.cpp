@@ -1,5 +1,6 @@
 #include "chartwindow/forms/Chts.h"
 
+#include <QCloseEvent>
 #include <QKeyEvent>
 
 namespace kora {
@@ -74,6 +75,12 @@ void Chts::keyPressEvent(QKeyEvent* event) {
   if (event->key() == Qt::Key_PageDown) Step(1);
   else if (event->key() == Qt::Key_PageUp) Step(0);
   else QMainWindow::keyPressEvent(event);
+}
+
+// A composition lets events run; the window has to outlive it.
+void Chts::closeEvent(QCloseEvent* event) {
+  if (composing_) event->ignore();
+  else QMainWindow::closeEvent(event);
 }
 
 }  // namespace kora

@@ -30,6 +30,7 @@ class Chts : public QMainWindow {
 
  protected:
   void keyPressEvent(QKeyEvent* event) override;
+  void closeEvent(QCloseEvent* event) override;
 
  private:
   void Step(int direction);

@@ -6,6 +6,7 @@
 #include <QScreen>
 #include <QVBoxLayout>
 
+#include "base/runtime_error.h"
 #include "shell/main_menu.h"
 #include "shell/waiting_downloads.h"
 
@@ -94,10 +95,16 @@ bool Logo::Start(bool previous) {
   session_.dialogs.Yield();
 
   ScaleToScreen();
-  if (!ReadAllSettings(session_, commandLine_, true)) {
-    session_.dialogs.SetBusy(false);
-    close();
-    return false;
+  try {
+    if (!ReadAllSettings(session_, commandLine_, true)) {
+      session_.dialogs.SetBusy(false);
+      close();
+      return false;
+    }
+  } catch (const RunTimeError& e) {
+    // With a folder that can't be one the program stands all the same, so that it can be mended.
+    session_.dialogs.Message(std::string(e.what()) + "  " + session_.settings.paths.SystemPath,
+                             "KORA Charting 7F");
   }
   session_.dialogs.Yield();
   timer2_->start();
@@ -113,7 +120,7 @@ void Logo::Timer() {
   raise();
   if (session_.settings.PathsMissing) {
     hide();
-    main_->OpenPaths();
+    if (!main_->OpenPaths()) return;
   }
   if (Update && AskForWaitingDownloads(session_.files, session_.settings.download,
                                        session_.dialogs))

@@ -177,10 +177,10 @@ void Main::OpenCharts() {
   if (chts_) chts_->Start();
 }
 
-void Main::OpenPaths() {
+bool Main::OpenPaths() {
   if (cpath_) {
     cpath_->activateWindow();
-    return;
+    return true;
   }
   cpath_ = new CPath({.ini = session_.ini,
                       .files = session_.files,
@@ -199,10 +199,11 @@ void Main::OpenPaths() {
   cpath_->setAttribute(Qt::WA_DeleteOnClose);
   if (!cpath_->Fill()) {
     delete cpath_;
-    return;
+    return false;
   }
   cpath_->open();
   cpath_->move(mdi_->mapToGlobal(QPoint(0, 0)));
+  return true;
 }
 
 void Main::OpenHelp() {
@@ -247,7 +248,7 @@ void Main::AskPrinter() {
 void Main::EndProgram() {
   KeepSize();
   hide();
-  QCoreApplication::quit();
+  QCoreApplication::exit(0);
 }
 
 void Main::closeEvent(QCloseEvent* event) {
@@ -255,7 +256,7 @@ void Main::closeEvent(QCloseEvent* event) {
   mdi_->closeAllSubWindows();
   if (help_) help_->close();
   event->accept();
-  QCoreApplication::quit();
+  QCoreApplication::exit(0);
 }
 
 // A window that fills the frame goes on filling it when the frame changes its size.

@@ -28,8 +28,9 @@ class Main : public QMainWindow {
   void EnableMenus();
 
   void SetTitle();
-  // The folder form, asking first where the paths are missing.
-  void OpenPaths();
+  // The folder form, asking first where the paths are missing. False when the program ends
+  // instead.
+  bool OpenPaths();
   void OpenCharts();
 
   Chts* charts() const { return chts_; }
