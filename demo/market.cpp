@@ -57,6 +57,9 @@ class Clustered {
 
 double Hold(double value, double low, double high) { return std::clamp(value, low, high); }
 
+// Volumes of shares are in hundreds, as data services deliver them.
+constexpr double kSharesPerUnit = 100;
+
 std::int32_t ToVolume(double volume) {
   return std::int32_t(std::floor(Hold(volume, 1.0, 2.0e9)));
 }
@@ -300,7 +303,7 @@ Series SimulateShare(const ShareProfile& share, const Factors& factors, const Da
       rec.High = FromThousandths(high);
       rec.Low = FromThousandths(low);
       rec.Close = FromThousandths(close);
-      rec.Volume = ToVolume(turnover * activity * spike * grain * 0.6 / price);
+      rec.Volume = ToVolume(turnover * activity * spike * grain * 0.6 / price / kSharesPerUnit);
       if (luck < 0.0012) rec.Open = rec.High = rec.Low = 0;
       series.records.push_back(rec);
     }
@@ -391,7 +394,7 @@ Series MarketSums::MakeIndex(const Sums& sums, const Days& days) const {
     rec.High = tenths(top + 0.4 * std::max(0.0, sums.high[d] * scale - top));
     rec.Low = tenths(bottom - 0.4 * std::max(0.0, bottom - sums.low[d] * scale));
     rec.Close = tenths(close);
-    rec.Volume = ToVolume(sums.volume[d] / 1000);
+    rec.Volume = ToVolume(sums.volume[d] * kSharesPerUnit / 1000);
     series.records.push_back(rec);
     level = close;
   }
@@ -414,7 +417,7 @@ Series MarketSums::AdvanceDecline(const Days& days) const {
     rec.High = float(rises_[d]);
     rec.Low = float(falls_[d]);
     rec.Close = float(total);
-    rec.Volume = ToVolume(all_.volume[d] / 1000);
+    rec.Volume = ToVolume(all_.volume[d] * kSharesPerUnit / 1000);
     series.records.push_back(rec);
   }
   return series;

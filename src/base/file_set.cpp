@@ -29,56 +29,50 @@ void RemoveQuietly(Io& io, const std::string& host) noexcept {
 
 }  // namespace
 
-FileSet::~FileSet() { Discard(); }
-
-void FileSet::Add(std::string_view path, std::string_view bytes) {
+void FileSet::Add(std::string_view path, std::string bytes) {
   Item item;
   item.host = files_.HostPath(path);
+  item.temporary = item.host + kTemporary;
   const HostStatus status = files_.io().Status(item.host);
   if (status.folder) throw RunTimeError(kPathAccess, "Is a directory");
   item.existed = status.exists;
-  item.temporary = item.host + kTemporary;
-  items_.push_back(item);
-  WriteFlushed(files_.io(), item.temporary, bytes);
+  item.bytes = std::move(bytes);
+  items_.push_back(std::move(item));
 }
 
 void FileSet::Commit() {
   Io& io = files_.io();
   try {
+    for (const Item& item : items_) WriteFlushed(io, item.temporary, item.bytes);
     for (Item& item : items_) {
-      if (item.existed) item.before = ReadWhole(*io.Open(item.host, OpenMode::kRead));
+      item.bytes.clear();
+      if (item.existed) item.bytes = ReadWhole(*io.Open(item.host, OpenMode::kRead));
       io.Rename(item.temporary, item.host);
       item.placed = true;
     }
   } catch (const RunTimeError&) {
     Restore();
-    Discard();
+    items_.clear();
     throw;
   }
-  items_.clear();
-}
-
-void FileSet::Discard() noexcept {
-  for (const Item& item : items_)
-    if (!item.placed) RemoveQuietly(files_.io(), item.temporary);
   items_.clear();
 }
 
 void FileSet::Restore() noexcept {
   Io& io = files_.io();
   for (const Item& item : items_) {
-    if (!item.placed) continue;
-    if (!item.existed) {
+    if (item.placed && item.existed) {
+      try {
+        WriteFlushed(io, item.temporary, item.bytes);
+        io.Rename(item.temporary, item.host);
+        continue;
+      } catch (const RunTimeError&) {
+        // The new file stays: it is whole, and better than none.
+      }
+    } else if (item.placed) {
       RemoveQuietly(io, item.host);
-      continue;
     }
-    try {
-      WriteFlushed(io, item.temporary, item.before);
-      io.Rename(item.temporary, item.host);
-    } catch (const RunTimeError&) {
-      // The new file stays: it is whole, and better than none.
-      RemoveQuietly(io, item.temporary);
-    }
+    RemoveQuietly(io, item.temporary);
   }
 }
 

@@ -16,6 +16,10 @@ std::int16_t CInt(double value);
 // Rounds half to even to 32 bits. Error 6 when the result leaves the range, or for NaN.
 std::int32_t CLng(double value);
 
+// To a 32-bit float. Error 6 when the result leaves the range of floats, or for NaN: an overflow
+// is an overflow, never an infinity.
+float CSng(double value);
+
 // Rounds half to even, staying a double. For sums that are held to a range later.
 double RoundHalfEven(double value);
 
@@ -44,6 +48,7 @@ std::string Str(std::int32_t value);
 
 // Appends Str(value) to `out`, without a text in between.
 void AppendStr(std::string& out, double value);
+void AppendStr(std::string& out, float value);
 void AppendStr(std::string& out, std::int32_t value);
 
 // Writes a number by a pattern of "#", "0" and one ".":

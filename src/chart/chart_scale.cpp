@@ -8,14 +8,7 @@
 namespace kora {
 namespace {
 
-// A 32-bit float that came out of the range of floats is an overflow, not an infinity.
-float ToSingle(double value) {
-  const auto f = static_cast<float>(value);
-  if (!std::isfinite(f)) throw RunTimeError(kOverflow);
-  return f;
-}
-
-float Through(double value, const char* pattern) { return ToSingle(Val(Format(value, pattern))); }
+float Through(double value, const char* pattern) { return CSng(Val(Format(value, pattern))); }
 
 // Near par a small range keeps its own ends: bank bills and the like stay legible.
 bool NearPar(float value, float high, float low) {
@@ -30,12 +23,12 @@ float RoundTop(float h) {
   if (raised > 100) {
     double n = RoundHalfEven(raised / 10);
     if (h >= 10 * n) n += 1;
-    return ToSingle(10 * n);
+    return CSng(10 * n);
   }
   if (raised >= 1) {
     double n = RoundHalfEven(raised / 0.1);
     if (0.1 * n <= h) n += 1;
-    h = ToSingle(0.1 * n);
+    h = CSng(0.1 * n);
     return Through(double(h) * f, "#######.#");  // the factor acts twice: the top's margin
   }
   return h;
@@ -49,24 +42,24 @@ float RoundBottom(float l, float high) {
   if (lowered > 100) {
     double n = RoundHalfEven(lowered / 10);
     if (l <= 10 * n) n -= 1;
-    return ToSingle(10 * n);
+    return CSng(10 * n);
   }
   double n = RoundHalfEven(lowered / 0.1);
   if (0.1 * n >= l) n -= 1;
-  l = ToSingle(0.1 * n);
+  l = CSng(0.1 * n);
   return Through(double(l) * f, "#######.#");
 }
 
 // Outside 0 to 600 both ends go to round figures.
 void RoundOutward(float& low, float& high) {
   if (low >= 0 && low <= 600) return;
-  if (low <= -100 || low > 600) low = ToSingle(Int(low / 100.0) * 100);
-  else if (low < -10) low = ToSingle(Int(low / 10.0) * 10);
+  if (low <= -100 || low > 600) low = CSng(Int(low / 100.0) * 100);
+  else if (low < -10) low = CSng(Int(low / 10.0) * 10);
 
   if ((high > -100 && high < 0) || (high > 0.5 && high < 100)) {
-    high = ToSingle(Int(high / 10.0) * 10);
+    high = CSng(Int(high / 10.0) * 10);
   } else if (high == 0 || high <= -100 || high >= 100) {
-    high = ToSingle((Int(high / 100.0) + 1) * 100);
+    high = CSng((Int(high / 100.0) + 1) * 100);
   }
 }
 
@@ -91,7 +84,7 @@ double StepFor(double r) {
 
 void PickStep(ChartScale& scale) {
   scale.Range = Val(Format(double(scale.ScaleHigh) - double(scale.ScaleLow), "#####0.00"));
-  if (const double step = StepFor(scale.Range); step != 0) scale.GridStep = ToSingle(step);
+  if (const double step = StepFor(scale.Range); step != 0) scale.GridStep = CSng(step);
   scale.GridCount = CInt(Int(Divide(scale.Range, scale.GridStep)));
 }
 
@@ -115,8 +108,8 @@ void SetChartScaleAutomatic(float high, float low, ChartScale& scale) {
   if (!NearPar(h, h, l)) {
     if (double(h) - double(l) < 0.15) {
       if (h < 0.01) h = 0.05f;
-      h = ToSingle(h * 1.05);
-      l = ToSingle(l * 0.95);
+      h = CSng(h * 1.05);
+      l = CSng(l * 0.95);
     }
     h = RoundTop(h);
   }
@@ -124,7 +117,7 @@ void SetChartScaleAutomatic(float high, float low, ChartScale& scale) {
   if (l == 0) l = 0.005f;
   RoundOutward(l, h);
   if (l < 2) {
-    l = ToSingle(RoundHalfEven(l / 0.005) * 0.005);
+    l = CSng(RoundHalfEven(l / 0.005) * 0.005);
     if (l == 0) l = 0.001f;
   }
   scale.ScaleLow = l;

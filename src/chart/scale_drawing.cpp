@@ -104,7 +104,7 @@ void DrawScale(const ChartCanvas& canvas, bool lineChart, std::string_view class
   const Colour grid = canvas.colour(kFixedGrid);
   const Colour text = canvas.colour(kScalesText);
   const double left = chart.ChartLeft, right = chart.ChartRight;
-  const double size = canvas.fonts.Font2Points();
+  constexpr double size = ChartCanvas::kSmallText;
 
   pen.Box('B', {left, double(chart.ChartTop), right, double(chart.ChartBottom), border});
 

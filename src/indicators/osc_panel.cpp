@@ -54,13 +54,16 @@ void CloseScript(OscHost& host) {
 
 }  // namespace
 
+void ResumeScript(OscHost& host) {
+  if (!host.script || host.request.SuppressScript) return;
+  host.script->Close();
+  host.script->Open(true);
+}
+
 OscPanel::OscPanel(OscHost& hostIn, double units)
     : host(hostIn), pen(hostIn.panel, hostIn.request.SuppressScript ? nullptr : hostIn.script) {
   Surface& panel = host.panel;
-  if (host.script && !host.request.SuppressScript) {
-    host.script->Close();
-    host.script->Open(true);
-  }
+  ResumeScript(host);
   if (!host.SecondPass()) {
     if (units > 0 && host.InChartWindow())
       panel.SetScale(0, 0, host.price.ScaleWidth(), units);
@@ -104,8 +107,7 @@ void OscPanel::Title(std::string_view text) {
   const double y = PanelTop + 2.0;
   const double screenX = PanelLeft + (host.SecondPass() ? 290.0 : 2.0);
   const double scriptX = PanelLeft + (host.SecondPass() ? 250.0 : 2.0);
-  pen.Text('T', Font(), {kSmallText, screenX, y, text, colour(kScalesText)},
-           {kSmallText, scriptX, y, text, colour(kScalesText)});
+  TextPair(screenX, scriptX, y, text);
 }
 
 void OscPanel::Guide(double y, std::string_view label, char letter) {
@@ -118,12 +120,16 @@ void OscPanel::Label(double y, std::string_view label) {
   if (!label.empty()) Text(PanelLeft - 5 - TextWidth(label), y - 6, label);
 }
 
-void OscPanel::Text(double x, double y, std::string_view text) {
-  pen.Text('T', Font(), {kSmallText, x, y, text, colour(kScalesText)});
+void OscPanel::Text(double x, double y, std::string_view text) { TextPair(x, x, y, text); }
+
+void OscPanel::TextPair(double screenX, double scriptX, double y, std::string_view text) {
+  pen.Text('T', Font(), {kSmallText, screenX, y, text, colour(kScalesText)},
+           {kSmallText, scriptX, y, text, colour(kScalesText)});
 }
 
 bool RunOscillator(OscHost& host, std::string_view title, bool longForm,
-                   const std::function<void()>& body, const std::function<std::string()>& dateOf) {
+                   const std::function<void()>& body, const std::function<std::string()>& dateOf,
+                   std::string_view diskTitle) {
   for (;;) {
     host.dialogs.SetBusy(true);
     int number = 0;
@@ -143,7 +149,8 @@ bool RunOscillator(OscHost& host, std::string_view title, bool longForm,
     CloseScript(host);
     host.dialogs.SetBusy(false);
     if (longForm && number == kDiskNotReady) {
-      if (host.dialogs.Ask("Disk Not ready. Close drive door", title, Buttons::kOkCancel) ==
+      if (host.dialogs.Ask("Disk Not ready. Close drive door",
+                           diskTitle.empty() ? title : diskTitle, Buttons::kOkCancel) ==
           Answer::kOk)
         continue;
       return false;

@@ -5,6 +5,7 @@
 #include <string>
 #include <string_view>
 
+#include "base/numbers.h"
 #include "chart/chart_pen.h"
 #include "chart/chart_request.h"
 #include "chart/composition.h"
@@ -44,6 +45,9 @@ struct OscHost {
   Colour colour(int entry) const { return colours[static_cast<size_t>(entry)]; }
 };
 
+// Opens the script again behind the chart that it holds, unless it is suppressed.
+void ResumeScript(OscHost& host);
+
 // The panel: its limits, and the ways in which all oscillators draw on it.
 class OscPanel {
  public:
@@ -66,6 +70,10 @@ class OscPanel {
   Colour colour(int entry) const { return host.colour(entry); }
   double TextWidth(std::string_view text);
 
+  // x of a bar that stands under its like on the price chart: bar 0 at PanelLeft. Error 6 beyond
+  // 16 bits.
+  double BarX(int bar) const { return CInt(PanelLeft + double(bar) * host.chart.BarSpacing); }
+
   // Frame in the border colour; passed over in a second pass.
   void Frame();
   // Title in the text colour inside the upper left corner; in a second pass 290 units further
@@ -78,6 +86,8 @@ class OscPanel {
   void Label(double y, std::string_view label);
   // Text of size 8.25 at a place.
   void Text(double x, double y, std::string_view text);
+  // The same at an x of its own in the script.
+  void TextPair(double screenX, double scriptX, double y, std::string_view text);
   // A line of the data in a colour entry.
   void Line(char letter, double x1, double y1, double x2, double y2, int entry) {
     pen.Line(letter, {x1, y1, x2, y2, colour(entry)});
@@ -87,14 +97,38 @@ class OscPanel {
   SurfaceFont Font() const;
 };
 
+// A line drawn from point to point as the points come. The point before is kept whether or not
+// a line was drawn to it.
+class OscTrace {
+ public:
+  OscTrace(ChartPen& pen, char letter) : pen_(pen), letter_(letter) {}
+  // Moves to a point; from the second on with a line, unless `draw` is false.
+  void To(double x, double y, Colour colour, bool draw = true) {
+    if (begun_ && draw) pen_.Line(letter_, {x_, y_, x, y, colour});
+    x_ = x;
+    y_ = y;
+    begun_ = true;
+  }
+  bool begun() const { return begun_; }
+  double y() const { return y_; }  // of the point before; 0 when there is none
+
+ private:
+  ChartPen& pen_;
+  char letter_;
+  bool begun_ = false;
+  double x_ = 0, y_ = 0;
+};
+
 // Runs the body of an oscillator with the busy pointer on. Whatever ends it, the script is
 // closed, and a run-time error is told under `title`. `longForm` tells errors in the data, of
 // files and of the disk apart; the short form knows "480" and "any other" only.
-// `dateOf` gives the date of the record in hand for the message of the long form.
+// `dateOf` gives the date of the record in hand for the message of the long form. `diskTitle`,
+// where given, stands over the question about the disk in place of `title`.
 // Returns true when the body ran to its end.
 bool RunOscillator(OscHost& host, std::string_view title, bool longForm,
                    const std::function<void()>& body,
-                   const std::function<std::string()>& dateOf = nullptr);
+                   const std::function<std::string()>& dateOf = nullptr,
+                   std::string_view diskTitle = {});
 
 // A window of the last `size` values, as all averages of a series use it.
 template <typename T, typename Sum>

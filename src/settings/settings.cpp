@@ -321,7 +321,7 @@ void WriteDefaultSettings(SettingsFile& file) {
       {"Chart Fonts", "CFont", ""},
       {"Chart Fonts", "CFontSize", "9.75"},
       {"Chart Fonts", "SFont", ""},
-      {"Chart Fonts", "SFontSize", "8.25"},
+      {"Chart Fonts", "SFontSize", "6"},
       {"ChartForms", "Zoom", "100"},
       {"Adjustments", "Divs", "0"},
       {"Adjustments", "NoShortNames", "False"},

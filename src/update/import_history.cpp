@@ -388,16 +388,16 @@ std::vector<T> ReadRecords(const Files& files, const std::string& path) {
 }
 
 void StagePrices(const Files& files, const std::string& dataPath, const std::string& code,
-                 const Group& group, FileSet& set, ImportCounts& counts) {
+                 Group& group, FileSet& set, ImportCounts& counts) {
   const std::string path = dataPath + CodeFileName(code, ".WDT");
   const auto old = ReadRecords<PriceRec>(files, path);
   if (!std::is_sorted(old.begin(), old.end(), Earlier))
     throw Refused(std::string(NameOf(path)) + ": the dates in the file are not in order");
-  const auto merged = Merge(old, group.rows, counts);
+  const auto merged = Merge(old, std::move(group.rows), counts);
   if (merged.size() > size_t(kMostRecords))
     throw Refused(std::string(NameOf(path)) + ": more than " + std::to_string(kMostRecords) +
                   " records");
-  Told(path, [&] { set.Add(path, BytesOf(merged)); });
+  Told(path, [&] { set.Add(path, std::string(BytesOf(merged))); });
 }
 
 // Record numbers go stale by the sort, and a list shows what stands at its numbers.
@@ -416,7 +416,8 @@ void StageLists(const Files& files, const std::string& dataPath,
       rec.ListRecNo = it->second;
       fresh.push_back(rec);
     }
-    if (BytesOf(fresh) != BytesOf(old)) Told(path, [&] { set.Add(path, BytesOf(fresh)); });
+    if (BytesOf(fresh) != BytesOf(old))
+      Told(path, [&] { set.Add(path, std::string(BytesOf(fresh))); });
   }
 }
 
@@ -445,7 +446,7 @@ void Import(const Files& files, const std::string& dataPath, const std::string& 
 
   FileSet set(files);
   bool added = false;
-  for (const auto& [code, group] : parsed.groups) {
+  for (auto& [code, group] : parsed.groups) {
     if (group.rows.empty()) continue;
     StagePrices(files, dataPath, code, group, set, counts);
     counts.Codes.insert(code);
@@ -462,10 +463,10 @@ void Import(const Files& files, const std::string& dataPath, const std::string& 
     if (sorted.size() > size_t(kMostRecords))
       throw Refused("the name file would have more than " + std::to_string(kMostRecords) +
                     " records");
-    Told(namePath, [&] { set.Add(namePath, BytesOf(sorted)); });
+    Told(namePath, [&] { set.Add(namePath, std::string(BytesOf(sorted))); });
     StageLists(files, dataPath, sorted, set);
   }
-  Told(dataPath, [&] { set.Commit(); });
+  set.Commit();
 }
 
 }  // namespace

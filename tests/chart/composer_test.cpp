@@ -48,7 +48,7 @@ TEST(ComposerTest, OrderOfThePartsOfAChart) {
                        "H,42,429,42,",                        // volume bar
                        "B,42,386,631,429,16",                 // volume panel
                        "B,42,45,631,386,16",                  // frame of the scale
-                       "S,8,44,33,DAILY - ARITHMETIC -,27",   // mode line
+                       "S,8.25,44,33,DAILY - ARITHMETIC -,27",   // mode line
                        "V,242,45,242,386,35",                 // fixed grid, 100 bars on
                        "T,8.25,380,2,Last date",              // end texts
                        "T,8.25,380,20,Closing",
@@ -430,9 +430,9 @@ TEST(ScaleTest, PercentageBandsAreNamedInTheModeLineWithTheDefault5) {
   f.Day("20240315", 10, 11, 9, 10);
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote(
-      "S,8,44,33,DAILY - ARITHMETIC -      Percentage Bands  &5%    -5%,27"));
+      "S,8.25,44,33,DAILY - ARITHMETIC -      Percentage Bands  &5%    -5%,27"));
   EXPECT_TRUE(f.price.Has(
-      "text 8 44,27 DAILY - ARITHMETIC -      Percentage Bands  &5%    -5% 27"));
+      "text 8.25 44,27 DAILY - ARITHMETIC -      Percentage Bands  &5%    -5% 27"));
 }
 
 TEST(ScaleTest, ClassTextFollowsTheModeUnlessItIsUnknown) {
@@ -441,10 +441,10 @@ TEST(ScaleTest, ClassTextFollowsTheModeUnlessItIsUnknown) {
   f.request.Name.IndClass.set("10");
   f.Day("20240315", 10, 11, 9, 10);
   ASSERT_TRUE(f.Compose());
-  EXPECT_TRUE(f.Wrote("S,8,44,33,DAILY - ARITHMETIC -      Gold,27"));
+  EXPECT_TRUE(f.Wrote("S,8.25,44,33,DAILY - ARITHMETIC -      Gold,27"));
   f.request.Name.IndClass.set("020");
   ASSERT_TRUE(f.Compose());
-  EXPECT_TRUE(f.Wrote("S,8,44,33,DAILY - ARITHMETIC -,27"));
+  EXPECT_TRUE(f.Wrote("S,8.25,44,33,DAILY - ARITHMETIC -,27"));
 }
 
 TEST(ScaleTest, LogarithmicLineHasAFurtherBlankInItsModeText) {
@@ -452,10 +452,10 @@ TEST(ScaleTest, LogarithmicLineHasAFurtherBlankInItsModeText) {
   f.request.LogBars = f.request.LogLines = true;
   f.Day("20240315", 10, 11, 9, 10);
   ASSERT_TRUE(f.Compose());
-  EXPECT_TRUE(f.Wrote("S,8,44,33,DAILY - LOGARITHMIC -,27"));
+  EXPECT_TRUE(f.Wrote("S,8.25,44,33,DAILY - LOGARITHMIC -,27"));
   f.request.ChartStyle = 'L';
   ASSERT_TRUE(f.Compose());
-  EXPECT_TRUE(f.Wrote("S,8,44,33,DAILY - LOGARITHMIC - ,27"));
+  EXPECT_TRUE(f.Wrote("S,8.25,44,33,DAILY - LOGARITHMIC - ,27"));
 }
 
 TEST(ScaleTest, IndexOfZeroHasAnEmptyLabelWhichWritesNoLine) {

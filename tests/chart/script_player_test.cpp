@@ -56,8 +56,9 @@ struct SavedFixture : PlayerFixture {
 // grid lines and a lower mode line, texts of S lose their blanks, and Font 2 is never bold.
 std::string AsPlayed(const std::string& op) {
   int at = 0;
-  if (op == "text 8 44,27 DAILY - ARITHMETIC - 27") return "text 8 44,33 DAILY-ARITHMETIC- 27";
-  if (op.rfind("text 8 b ", 0) == 0) return "text 8 " + op.substr(9);
+  if (op == "text 8.25 44,27 DAILY - ARITHMETIC - 27")
+    return "text 8.25 44,33 DAILY-ARITHMETIC- 27";
+  if (op.rfind("text 8.25 b ", 0) == 0) return "text 8.25 " + op.substr(12);
   if (std::sscanf(op.c_str(), "line dot %d,50,", &at) == 1) {
     const std::string x = std::to_string(at);
     if (op == "line dot " + x + ",50," + x + ",429 35")

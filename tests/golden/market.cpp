@@ -66,7 +66,7 @@ void GoldenMarket::Add(const char* code, const char* title, std::int16_t type, f
     const float high = (open > close ? open : close) * (1 + (draw() + 1) * 0.006f);
     const float low = (open < close ? open : close) * (1 - (draw() + 1) * 0.006f);
     const float burst = draw();
-    const auto volume = std::int32_t(40000.0f + 30000.0f * draw() + (burst > 0.96f ? 300000.0f : 0));
+    const auto volume = std::int32_t(4000.0f + 3000.0f * draw() + (burst > 0.96f ? 30000.0f : 0));
     if (type == kAdvanceDecline) {
       rec.High = std::nearbyint(400 + 200 * draw());
       rec.Low = std::nearbyint(400 + 200 * draw());

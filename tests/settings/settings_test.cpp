@@ -423,7 +423,7 @@ TEST_F(SettingsTest, ANewInstallationReadsBackWhole) {
   EXPECT_EQ(settings_.charts.BlankSpace, 10);
   EXPECT_EQ(settings_.charts.VolHeight, 2);
   EXPECT_EQ(settings_.fonts.TitleSize, 9.75);
-  EXPECT_EQ(settings_.fonts.Font2Size, 8.25);
+  EXPECT_EQ(settings_.fonts.Font2Size, 6);
   EXPECT_EQ(settings_.fonts.Font1Name, "");
   for (const OscKey& key : OscKeys()) {
     EXPECT_EQ((settings_.osc.*key.value).daily, key.defaultDaily) << key.daily;
