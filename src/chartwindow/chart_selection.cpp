@@ -265,7 +265,6 @@ void ChartSelection::Load() {
 
   if (state.ChartListNo < kFullList || state.ChartListNo >= kResultList)
     state.ChartListNo = kFullList;
-  state.ChartListChanged = false;
   state.ChartSelLoaded = true;
   ShowListName();
   Guarded([&] {

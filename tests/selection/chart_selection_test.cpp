@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "base/numbers.h"
+#include "tests/support/failing_io.h"
 #include "tests/support/records.h"
 #include "tests/support/scripted_dialogs.h"
 #include "tests/support/temp_home.h"
@@ -88,7 +89,8 @@ class ChartSelectionTest : public testing::Test {
     EXPECT_EQ(current.CurrentDataFile, std::string(code) + ".WDT");
   }
 
-  TempHome home;
+  test::FailingIo io;
+  TempHome home{io};
   ScriptedDialogs dialogs;
   Settings settings;
   SettingsFile ini, user;
@@ -893,6 +895,18 @@ TEST_F(ChartSelectionTest, OkWithASpacingThatIsNoNumberToKeepSaysSoAndChangesNot
   EXPECT_EQ(state.ChartPeriod, "A");
   EXPECT_EQ(state.ChartIndex, 1);
   EXPECT_EQ(Kept("Period"), "unknown");
+}
+
+TEST_F(ChartSelectionTest, SettingsThatCannotBeWrittenDoNotKeepTheChartFromShowing) {
+  Loaded();
+  Selection().ChoosePeriod(kWeeklyIndex);
+  io.Reset(1);
+  io.lasting = true;
+  EXPECT_TRUE(Selection().OK());
+  EXPECT_EQ(state.ChartPeriod, "W");
+  Selection().Close();
+  EXPECT_GT(io.calls, 0);
+  EXPECT_TRUE(dialogs.said.empty());
 }
 
 TEST_F(ChartSelectionTest, CloseWritesOnlyWhatIsInRange) {
