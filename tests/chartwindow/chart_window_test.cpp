@@ -51,10 +51,16 @@ class ChartWindowTest : public testing::Test {
       window_ = std::make_unique<ChartWindow>(ChartWindowServices{.files = home.files(),
                                                                   .dialogs = dialogs,
                                                                   .settings = settings,
+                                                                  .ini = ini,
+                                                                  .user = user,
                                                                   .colours = colours,
                                                                   .current = current,
-                                                                  .price = surface});
-      window_->Loading = false;
+                                                                  .state = state,
+                                                                  .price = surface,
+                                                                  .panel = panel});
+      window_->Load();
+      surface.ops.clear();
+      panel.ops.clear();
     }
     return *window_;
   }
@@ -66,7 +72,10 @@ class ChartWindowTest : public testing::Test {
   Settings settings;
   ChartColours colours{};
   CurrentName current;
-  RecordingSurface surface{638, 452};
+  SettingsFile ini{home.files(), "C:\\WINDOWS\\Kora.ini"};
+  SettingsFile user{home.files(), "C:\\WINDOWS\\KoraUser.ini"};
+  ChartState state;
+  RecordingSurface surface{638, 452}, panel{638, 144};
 
  private:
   std::unique_ptr<ChartWindow> window_;
@@ -75,7 +84,7 @@ class ChartWindowTest : public testing::Test {
 TEST_F(ChartWindowTest, TheFirstChartIsTheFirstSecurityOfTheNameFile) {
   PutThree();
   EXPECT_TRUE(window().NextChart());
-  EXPECT_EQ(window().ChartIndex, 1);
+  EXPECT_EQ(state.ChartIndex, 1);
   EXPECT_EQ(shown(), "AAA.WDT");
   EXPECT_EQ(current.NameCount, 3);
   EXPECT_EQ(current.NameRecNo, 1);
@@ -91,19 +100,19 @@ TEST_F(ChartWindowTest, ForwardFromTheLastChartGoesToRecordOne) {
     EXPECT_TRUE(window().NextChart());
     EXPECT_EQ(shown(), expected);
   }
-  EXPECT_EQ(window().ChartIndex, 1);
+  EXPECT_EQ(state.ChartIndex, 1);
 }
 
 TEST_F(ChartWindowTest, BackwardFromRecordOneGoesToTheLast) {
   PutThree();
   window().NextChart();
-  window().ChartDirection = 0;
+  state.ChartDirection = 0;
   EXPECT_TRUE(window().StepChart());
   EXPECT_EQ(shown(), "CCC.WDT");
-  EXPECT_EQ(window().ChartIndex, 3);
+  EXPECT_EQ(state.ChartIndex, 3);
   EXPECT_TRUE(window().StepChart());
   EXPECT_EQ(shown(), "BBB.WDT");
-  window().ChartDirection = 1;
+  state.ChartDirection = 1;
   EXPECT_TRUE(window().StepChart());
   EXPECT_EQ(shown(), "CCC.WDT");
 }
@@ -112,7 +121,7 @@ TEST_F(ChartWindowTest, ARedrawStaysOnTheChart) {
   PutThree();
   window().NextChart();
   EXPECT_TRUE(window().Redraw());
-  EXPECT_EQ(window().ChartIndex, 1);
+  EXPECT_EQ(state.ChartIndex, 1);
   EXPECT_EQ(shown(), "AAA.WDT");
   window().NextChart();
   EXPECT_TRUE(window().Redraw());
@@ -122,7 +131,7 @@ TEST_F(ChartWindowTest, ARedrawStaysOnTheChart) {
 TEST_F(ChartWindowTest, ThereIsNothingToRedrawBeforeTheFirstChart) {
   PutThree();
   EXPECT_FALSE(window().Redraw());
-  EXPECT_EQ(window().ChartIndex, 0);
+  EXPECT_EQ(state.ChartIndex, 0);
   EXPECT_TRUE(surface.ops.empty());
 }
 
@@ -132,33 +141,33 @@ TEST_F(ChartWindowTest, NothingIsComposedWhileLoading) {
   EXPECT_FALSE(window().NextChart());
   EXPECT_FALSE(window().StepChart());
   EXPECT_FALSE(window().DrawChart());
-  EXPECT_EQ(window().ChartIndex, 0);
+  EXPECT_EQ(state.ChartIndex, 0);
   EXPECT_TRUE(surface.ops.empty());
 }
 
 TEST_F(ChartWindowTest, DataWithoutBarsComesUpAsALineAndTheStyleStays) {
   PutNames({Security("AAA"), Security("CLO", 1, kCloseOnly), Security("CCC")});
   window().NextChart();
-  EXPECT_EQ(window().Request.ChartStyle, 'B');
+  EXPECT_EQ(state.ChartStyle, 'B');
   window().NextChart();
-  EXPECT_EQ(window().Request.ChartStyle, 'L');
+  EXPECT_EQ(state.ChartStyle, 'L');
   window().NextChart();
-  EXPECT_EQ(window().Request.ChartStyle, 'L');
+  EXPECT_EQ(state.ChartStyle, 'L');
   EXPECT_EQ(shown(), "CCC.WDT");
 }
 
 TEST_F(ChartWindowTest, EveryTypeWithoutBarsTurnsCandlesIntoALine) {
   for (const std::int16_t type : {kCloseVolume, kCloseOnly, kAdvanceDecline}) {
     PutNames({Security("CLO", 1, type)});
-    window().Request.ChartStyle = 'C';
+    state.ChartStyle = 'C';
     window().NextChart();
-    EXPECT_EQ(window().Request.ChartStyle, 'L') << type;
+    EXPECT_EQ(state.ChartStyle, 'L') << type;
   }
   for (const std::int16_t type : {kShare, kIndex}) {
     PutNames({Security("BAR", 1, type)});
-    window().Request.ChartStyle = 'C';
+    state.ChartStyle = 'C';
     window().NextChart();
-    EXPECT_EQ(window().Request.ChartStyle, 'C') << type;
+    EXPECT_EQ(state.ChartStyle, 'C') << type;
   }
 }
 
@@ -169,7 +178,7 @@ TEST_F(ChartWindowTest, AMissingNameFileIsToldAndNothingIsShown) {
   EXPECT_EQ(dialogs.said[0].text.find(
                 "There is a file access problem. Check directory paths option."), 0u);
   EXPECT_NE(dialogs.said[0].text.find("c:\\korawin\\data\\Names.dat"), std::string::npos);
-  EXPECT_EQ(window().ChartIndex, 0);
+  EXPECT_EQ(state.ChartIndex, 0);
 }
 
 TEST_F(ChartWindowTest, AnEmptyNameFileIsTold) {
@@ -180,7 +189,7 @@ TEST_F(ChartWindowTest, AnEmptyNameFileIsTold) {
     EXPECT_FALSE(window().NextChart());
     ASSERT_EQ(dialogs.said.size(), 1u);
     EXPECT_EQ(dialogs.said[0].text, " There are no records in Names.Dat for this folder.");
-    EXPECT_EQ(window().ChartIndex, 0);
+    EXPECT_EQ(state.ChartIndex, 0);
   }
 }
 
@@ -223,17 +232,17 @@ TEST_F(ChartWindowTest, ANameFileThatShrankWhileTheWindowStoodWrapsToItsStart) {
 TEST_F(ChartWindowTest, DrawnLinesAreEmptiedAtEachNewChartUnlessTwoShareTheSurface) {
   PutThree();
   home.Put("drive_c/korawin/data/ChtLns.Tmp", "H,1,2,3,4,5\r\n");
-  window().SplitScreen = true;
+  state.SplitScreen = true;
   window().NextChart();
   EXPECT_NE(home.Get("drive_c/korawin/data/ChtLns.Tmp"), "");
-  window().SplitScreen = false;
+  state.SplitScreen = false;
   window().NextChart();
   EXPECT_TRUE(home.Exists("drive_c/korawin/data/ChtLns.Tmp"));
   EXPECT_EQ(home.Get("drive_c/korawin/data/ChtLns.Tmp"), "");
 }
 
 TEST_F(ChartWindowTest, TheTitleTellsTheDataFolder) {
-  EXPECT_EQ(window().Title(), "KORA Charting 7F   -  CHARTS  c:\\korawin\\data\\");
+  EXPECT_EQ(window().view().Title, "KORA Charting 7F   -  CHARTS  c:\\korawin\\data\\");
 }
 
 }  // namespace
