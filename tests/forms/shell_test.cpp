@@ -202,7 +202,7 @@ TEST_F(ChtsTest, ANewSizeRecomposesTheSameChart) {
   form->resize(form->width() - 150, form->height() - 90);
   ASSERT_TRUE(WaitFor([&] { return charts.window().Chart.ChartRight < before && Ink() > 1000; }));
   EXPECT_EQ(shown(), "BBB.WDT");
-  EXPECT_EQ(charts.window().ChartIndex, 2);
+  EXPECT_EQ(charts.window().state().ChartIndex, 2);
   EXPECT_EQ(Picture()->surface().Width(), Picture()->width());
 }
 
@@ -226,7 +226,7 @@ TEST_F(ChtsTest, WithoutANameFileItSaysSoOnceAndStands) {
   session->files.Remove("c:\\korawin\\data\\Names.dat");
   Chts& charts = OpenCharts();
   EXPECT_EQ(dialogs.said.size(), 1u);
-  EXPECT_EQ(charts.window().ChartIndex, 0);
+  EXPECT_EQ(charts.window().state().ChartIndex, 0);
   form->resize(form->width() - 100, form->height() - 50);
   QCoreApplication::processEvents();
   EXPECT_EQ(dialogs.said.size(), 1u);

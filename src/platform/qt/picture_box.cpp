@@ -13,9 +13,18 @@ PictureBox::PictureBox(QWidget* parent) : QWidget(parent), surface_(640, 454) {
 QSize PictureBox::minimumSizeHint() const { return {160, 100}; }
 QSize PictureBox::sizeHint() const { return {640, 454}; }
 
+// A surface of the right size keeps its picture.
 void PictureBox::Fit() {
+  if (surface_.Width() == width() && surface_.Height() == height() &&
+      surface_.DevicePixelRatio() == devicePixelRatioF())
+    return;
   surface_.Resize(width(), height(), devicePixelRatioF());
   if (Resized) Resized();
+}
+
+void PictureBox::Place(const QRect& place) {
+  setGeometry(place);
+  Fit();
 }
 
 void PictureBox::resizeEvent(QResizeEvent*) { Fit(); }
@@ -26,7 +35,6 @@ void PictureBox::paintEvent(QPaintEvent*) {
   // On a screen of another scale the picture is made anew, outside of this paint.
   if (surface_.DevicePixelRatio() != devicePixelRatioF())
     QTimer::singleShot(0, this, [this] {
-      if (surface_.DevicePixelRatio() == devicePixelRatioF()) return;
       Fit();
       update();
     });

@@ -165,8 +165,11 @@ void Main::OpenCharts() {
   chts_ = new Chts({.files = session_.files,
                     .dialogs = session_.dialogs,
                     .settings = session_.settings,
+                    .ini = session_.ini,
+                    .user = session_.user,
                     .colours = session_.colours,
-                    .current = session_.current});
+                    .current = session_.current,
+                    .state = session_.charts});
   QMdiSubWindow* frame = mdi_->addSubWindow(chts_);
   frame->setAttribute(Qt::WA_DeleteOnClose);
   frame->setGeometry(mdi_->viewport()->rect());
