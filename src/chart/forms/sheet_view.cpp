@@ -43,8 +43,10 @@ void SheetView::SetDropped(std::function<void(QPointF)> dropped) {
 }
 
 QSize SheetView::sizeHint() const {
+  // Room for the sheet either way round.
   const double unit = logicalDpiX() / kTwipsPerInch * kPartOfSize;
-  return QSizeF(sheet_.width * unit, sheet_.height * unit).toSize() + QSize(2, 2);
+  const int side = int(std::max(sheet_.width, sheet_.height) * unit) + 2;
+  return {side, side};
 }
 
 QSize SheetView::minimumSizeHint() const { return sizeHint() / 2; }
