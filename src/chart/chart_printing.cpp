@@ -29,6 +29,9 @@ class PaperPlayer {
         fonts_(fonts),
         colours_(colours),
         fontLabel_(fontLabel),
+        textFactor_(setup.ScriptPrintMode
+                        ? 1
+                        : std::min(1.0, frame.SX / printer.TwipsPerPixelX())),
         weight_(setup.PrintLine >= 1 && setup.PrintLine <= 10 ? setup.PrintLine : 2) {
     font_ = {fonts.Font1Name, fonts.TitleSize >= 1 ? fonts.TitleSize : 8, fonts.Font1Bold, false};
     SetFont(font_, "Font 1");
@@ -101,7 +104,7 @@ class PaperPlayer {
 
   double Size(const ScriptLine& line, const char* label) {
     fontLabel_ = label;
-    return budget_.FontSize(line);
+    return std::max(1.0, budget_.FontSize(line) * textFactor_);
   }
 
   void Segment(const ScriptLine& line) {
@@ -141,6 +144,9 @@ class PaperPlayer {
   const FontSettings& fonts_;
   const ChartColours& colours_;
   std::string& fontLabel_;
+  // Texts of a chart that is smaller than on the screen shrink with it, or they would run into
+  // one another. The print mode has room for them at their size.
+  double textFactor_;
   double weight_;
   SurfaceFont font_;  // Font 1 as the lines have left it
   PlayBudget budget_{kMostCommands};

@@ -118,6 +118,15 @@ TEST(ChartPrintingTest, TextsKeepTheirSizeAndMoveWithTheChart) {
                  "text 7 b i One 18030,1050 KORA 27"}));
 }
 
+TEST(ChartPrintingTest, TextsOfAChartSmallerThanOnTheScreenShrinkWithIt) {
+  PrintFixture f;
+  f.setup.PrintEnlarge = 0.4f;  // 6 twips to the unit where the screen has 15
+  EXPECT_EQ(f.Page("T,10,20,2,A,5\r\nS,15,1,1,B,5\r\nZ,2,1,1,C,5\r\n"),
+            (Ops{"text 4 120,12 A 5", "text 6 6,6 B 5", "text 1 b i 6,6 C 5"}));
+  f.setup.ScriptPrintMode = true;
+  EXPECT_EQ(f.Page("T,10,20,2,A,5\r\n"), (Ops{"text 10 b 120,12 A 5"}));
+}
+
 TEST(ChartPrintingTest, TextOfBlanksPrintsNothing) {
   PrintFixture f;
   EXPECT_EQ(f.Page("T,8,20,2,   ,26\r\nT,8,20,2,,26\r\nS,8,20,2,  ,26\r\nL,0,0,1,1,5\r\n"),
