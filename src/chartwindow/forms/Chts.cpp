@@ -13,6 +13,7 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QMouseEvent>
+#include <QPainter>
 #include <QPointer>
 #include <QPushButton>
 #include <QStatusBar>
@@ -130,6 +131,10 @@ struct Chts::Area : QWidget {
   QSize minimumSizeHint() const override { return {160, 100}; }
   QSize sizeHint() const override { return {640, 400}; }
   void resizeEvent(QResizeEvent*) override { form->SizeChanged(); }
+  // What the pictures leave free looks like them.
+  void paintEvent(QPaintEvent* event) override {
+    QPainter(this).fillRect(event->rect(), QtSurface::Rgb(form->colours()[kBackground]));
+  }
   Chts* form;
 };
 
