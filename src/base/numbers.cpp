@@ -90,6 +90,24 @@ std::string StrShortest(T value) {
   return std::string(buffer, end.ptr);
 }
 
+template <typename T>
+void AppendShortest(std::string& out, T value) {
+  // Nearly every coordinate is a whole number, or one of moderate size.
+  if (value >= T(-1e9) && value <= T(1e9)) {
+    const auto whole = static_cast<std::int32_t>(value);
+    if (T(whole) == value) {
+      AppendStr(out, whole);
+      return;
+    }
+    char buffer[512];
+    const auto end =
+        std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed);
+    out.append(buffer, end.ptr);
+    return;
+  }
+  out += StrShortest(value);
+}
+
 }  // namespace
 
 float CSng(double value) {
@@ -163,17 +181,8 @@ void AppendStr(std::string& out, std::int32_t value) {
   out.append(buffer, std::to_chars(buffer, buffer + sizeof buffer, value).ptr);
 }
 
-void AppendStr(std::string& out, double value) {
-  // Nearly every coordinate is a whole number.
-  if (value >= -1e9 && value <= 1e9) {
-    const auto whole = static_cast<std::int32_t>(value);
-    if (whole == value) {
-      AppendStr(out, whole);
-      return;
-    }
-  }
-  out += Str(value);
-}
+void AppendStr(std::string& out, double value) { AppendShortest(out, value); }
+void AppendStr(std::string& out, float value) { AppendShortest(out, value); }
 
 std::string Format(double value, std::string_view pattern) {
   if (!std::isfinite(value)) return Str(value);

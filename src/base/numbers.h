@@ -48,6 +48,7 @@ std::string Str(std::int32_t value);
 
 // Appends Str(value) to `out`, without a text in between.
 void AppendStr(std::string& out, double value);
+void AppendStr(std::string& out, float value);
 void AppendStr(std::string& out, std::int32_t value);
 
 // Writes a number by a pattern of "#", "0" and one ".":

@@ -18,7 +18,13 @@ DrawStyle StyleOf(char letter) {
   }
 }
 
+// A place in the script is a 32-bit float: finer than any paper, and half as long.
 void Field(std::string& out, double value) {
+  out += ',';
+  AppendStr(out, static_cast<float>(value));
+}
+
+void Field(std::string& out, Colour value) {
   out += ',';
   AppendStr(out, value);
 }

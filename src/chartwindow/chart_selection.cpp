@@ -221,6 +221,7 @@ bool ChartSelection::FindFrom(const Books& books, std::int16_t from, Match match
 void ChartSelection::Load() {
   ChartState& state = services_.state;
   const bool first = !state.ChartSelLoaded;
+  second_ = false;
   state.MultiOscOn = 0;
   view_ = {};
   view_.Command6Shown = services_.settings.download.DataService == 3;
@@ -264,7 +265,6 @@ void ChartSelection::Load() {
 
   if (state.ChartListNo < kFullList || state.ChartListNo >= kResultList)
     state.ChartListNo = kFullList;
-  state.ChartListChanged = false;
   state.ChartSelLoaded = true;
   ShowListName();
   Guarded([&] {
@@ -284,15 +284,17 @@ void ChartSelection::Load() {
 
 void ChartSelection::LoadSecond() {
   const ChartState& state = services_.state;
+  second_ = true;
   view_ = {};
   view_.Text3 = Str(std::int32_t(state.BarSpacing));
-  // No SetStyle: the first chart's date limit and oscillator are not the second's to change.
-  view_.Combo1 = IndexOfStyle(state.ChartStyle, kLineIndex);
+  SetStyle(IndexOfStyle(state.ChartStyle, kLineIndex));
   view_.Combo4 = IndexOfPeriod(state.ChartPeriod);
   ShowAverages();
   ShowListName();
-  Guarded([&] { ShowRecord(checkNameFileOpen()); });
-  if (HasNoBars(services_.current.Rec)) view_.Combo1 = kLineIndex;
+  Guarded([&] {
+    ShowRecord(checkNameFileOpen());
+    if (HasNoBars(services_.current.Rec)) SetStyle(kLineIndex);
+  });
 }
 
 void ChartSelection::ShowListName() {
@@ -362,6 +364,10 @@ void ChartSelection::StepBack() {
 bool ChartSelection::OK() {
   ChartState& state = services_.state;
   if (!TakeChoices()) return false;
+  if (second_) {
+    StepBack();
+    return true;
+  }
   state.MultiOscOn = 0;
   if (state.ChartStyle == 'P') {
     state.OscShown = false;
@@ -378,12 +384,6 @@ bool ChartSelection::OK() {
   Write("Bands", Str(std::int32_t(charts.Bands = state.BandKind)));
   WriteShared();
   Write("List", Str(std::int32_t(charts.List = state.ChartListNo)));
-  StepBack();
-  return true;
-}
-
-bool ChartSelection::OKSecond() {
-  if (!TakeChoices()) return false;
   StepBack();
   return true;
 }
@@ -446,7 +446,7 @@ ChartSelection::Entered ChartSelection::EnterCode(std::string_view typed) {
       TakeFound();
     else
       Scroll(1);
-    ChooseOscillator(0);
+    if (!second_) ChooseOscillator(0);
     result = Entered::kNearest;
   });
   return result;
@@ -555,6 +555,7 @@ void ChartSelection::SetStyle(int index) {
   view_.Label4 = index == kPointFigureIndex ? "Point Reversal" : "Chart Spacing";
   if (index != kPointFigureIndex) return;
   view_.Combo4 = kDailyIndex;
+  if (second_) return;
   view_.Combo2 = 0;
   state.OscShown = false;
   LatestDate();
@@ -570,15 +571,7 @@ void ChartSelection::SetStyleForRecord(bool firstLoad) {
 void ChartSelection::ChooseStyle(int index) {
   if (index < kBarIndex || index > kPointFigureIndex) return;
   SetStyle(index);
-  if (HasBars(services_.current.Rec)) rememberedStyle_ = StyleOfIndex(index);
-  CandleSpacing();
-}
-
-void ChartSelection::ChooseSecondStyle(int index) {
-  if (index < kBarIndex || index > kPointFigureIndex) return;
-  view_.Combo1 = index;
-  view_.Label4 = index == kPointFigureIndex ? "Point Reversal" : "Chart Spacing";
-  if (index == kPointFigureIndex) view_.Combo4 = kDailyIndex;
+  if (!second_ && HasBars(services_.current.Rec)) rememberedStyle_ = StyleOfIndex(index);
   CandleSpacing();
 }
 

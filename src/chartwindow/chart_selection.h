@@ -91,16 +91,15 @@ class ChartSelection {
   // ---- Opening and leaving
 
   void Load();
-  // The same for the second chart of a pair: nothing is read from the settings file, and the
-  // list, the place in it and the spacing in use are kept.
+  // The same for the second chart of a pair, starting from the first: until the next Load no
+  // choice touches the finish date, the oscillator or the style remembered for shares.
   void LoadSecond();
   // On return to the form. True when the list had changed: the code takes the focus.
   bool Activate();
   // Stores and writes the choices; ChartIndex is one less then, for the window's NextChart.
-  // False, with the message, when the spacing is no number that can be kept.
+  // False, with the message, when the spacing is no number that can be kept. For the second
+  // chart only style, period and spacing are stored and nothing is written.
   bool OK();
-  // For the second chart of a pair: the choices are for this chart, nothing is written.
-  bool OKSecond();
   void Close();
   // After another data folder was chosen: the full list. Load follows.
   void FolderChanged();
@@ -124,8 +123,6 @@ class ChartSelection {
   // ---- How it is drawn
 
   void ChooseStyle(int index);
-  // For the second chart, whose style leaves the finish date and the oscillator alone.
-  void ChooseSecondStyle(int index);
   void ChoosePeriod(int index);
   // True when the percentage bands are to be asked for.
   bool ChooseBands(int index);
@@ -181,6 +178,7 @@ class ChartSelection {
   ChartSelectionServices services_;
   ChartSelectionView view_;
   char rememberedStyle_ = 'B';  // chosen for a share or index
+  bool second_ = false;
 };
 
 }  // namespace kora

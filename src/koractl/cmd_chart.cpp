@@ -1,24 +1,18 @@
-#include <algorithm>
-#include <charconv>
 #include <memory>
 
 #include "base/dates.h"
-#include "base/host_files.h"
-#include "base/numbers.h"
-#include "base/text.h"
 #include "chart/composer.h"
+#include "indicators/oscillators.h"
+#include "indicators/price_overlays.h"
 #include "koractl/options.h"
 #include "koractl/picture_app.h"
+#include "koractl/picture_output.h"
 #include "koractl/run.h"
-#include "koractl/table.h"
 #include "platform/headless/headless_surface.h"
 #include "platform/qt/picture.h"
 
 namespace kora {
 namespace {
-
-constexpr int kSmallestSide = 100, kLargestSide = 10000;  // chart units
-constexpr double kMostPixels = 100e6;                      // of a picture
 
 struct ChartOptions {
   std::string code;
@@ -49,43 +43,8 @@ void RefuseWhatIsMissing(const ChartOptions& o) {
     throw UsageError(what + " can't be charted yet");
   };
   if (o.style == "P") refuse("--style P");
-  if (!o.osc.empty() || o.slow) refuse("--osc");
-  if (o.bands != 0) refuse("--bands");
-  if (o.mma) refuse("--mma");
   if (!o.box.empty()) refuse("--box");
   if (!o.swing.empty()) refuse("--swing");
-}
-
-PictureSize ReadSize(const ChartOptions& o) {
-  int width = 0, height = 0;
-  const char* end = o.size.data() + o.size.size();
-  auto r = std::from_chars(o.size.data(), end, width);
-  const bool two = r.ec == std::errc() && r.ptr != end && (*r.ptr == 'x' || *r.ptr == 'X');
-  if (two) r = std::from_chars(r.ptr + 1, end, height);
-  if (!two || r.ec != std::errc() || r.ptr != end || std::min(width, height) < kSmallestSide ||
-      std::max(width, height) > kLargestSide)
-    throw UsageError("--size: \"" + o.size + "\" is no WIDTHxHEIGHT from 100x100 to 10000x10000");
-  PictureSize size;
-  size.width = width;
-  size.height = height;
-  size.dpr = o.scale;
-  if (size.width * size.height * size.dpr * size.dpr > kMostPixels)
-    throw UsageError("--scale: a picture of " + o.size + " at scale " + std::to_string(o.scale) +
-                     " is too large");
-  return size;
-}
-
-enum class Output { kStandardOutput, kScript, kPicture };
-
-Output OutputOf(const std::string& out) {
-  if (out == "-") return Output::kStandardOutput;
-  const std::string name = LCase(out);
-  const auto ends = [&name](std::string_view ending) {
-    return name.size() > ending.size() && name.ends_with(ending);
-  };
-  if (ends(".cht")) return Output::kScript;
-  if (ends(".png") || ends(".svg") || ends(".pdf")) return Output::kPicture;
-  throw UsageError("--out: \"" + out + "\" ends in none of .cht, .png, .svg, .pdf");
 }
 
 ChartRequest RequestOf(const ChartOptions& o, const Settings& settings, const NameRec& name) {
@@ -104,12 +63,38 @@ ChartRequest RequestOf(const ChartOptions& o, const Settings& settings, const Na
   request.AutoScale = !o.manual;
   request.FinishDateOn = !o.finish.empty();
   request.FinishDate = o.finish;
+  request.OscName = o.osc;
   return request;
+}
+
+// Composes the price chart and, below it or over it, the oscillator.
+void Compose(Run& run, const ChartOptions& o, const ChartRequest& request, ChartScript& script,
+             Surface& price, Surface* panel) {
+  Session& s = run.session;
+  Composition chart;
+  const ChartServices services{s.files,
+                               run.dialogs,
+                               s.settings.paths,
+                               s.settings.fonts,
+                               s.colours,
+                               price,
+                               panel,
+                               &script,
+                               PriceOverlays(o.mma, s.settings.osc.MMASet)};
+  if (!ComposeChart(services, request, chart)) throw Abandoned();
+  if (o.osc.empty()) return;
+  OscHost host{s.files, run.dialogs, s.settings,          s.colours, request,
+               chart,   price,       panel ? *panel : price, &script};
+  host.OscCode = o.osc;
+  host.SlowStochastic = o.slow;
+  ShowOscillatorPanel(host);
+  if (run.dialogs.said()) throw Abandoned();
 }
 
 int Chart(const CommandLine& line, const ChartOptions& o) {
   RefuseWhatIsMissing(o);
-  const PictureSize size = ReadSize(o);
+  PictureSize size = ReadSize(o.size, o.scale);
+  if (HasPanel(o.osc)) size.panel = o.panel;
   const Output output = OutputOf(o.out);
   if (!o.finish.empty() && !ParseFileDate(o.finish))
     throw UsageError("--finish: \"" + o.finish + "\" is no date in the form yyyymmdd");
@@ -122,30 +107,20 @@ int Chart(const CommandLine& line, const ChartOptions& o) {
   Session& s = run.session;
   const ChartRequest request = RequestOf(o, s.settings, s.current.Rec);
   ChartScript script;
-  const auto compose = [&](Surface& price, Surface* panel) {
-    Composition chart;
-    const ChartServices services{s.files,    run.dialogs, s.settings.paths, s.settings.fonts,
-                                 s.colours, price,       panel,            &script};
-    if (!ComposeChart(services, request, chart)) throw Abandoned();
-  };
+  if (o.osc == "RMO" && o.period != "A") run.Abandon("RMO only available on Daily Charts", "RMO");
   std::string bytes;
   if (output == Output::kPicture) {
     const PictureApp app;
-    bytes = MakePicture(PictureKindOf(o.out), size, compose);
+    bytes = MakePicture(PictureKindOf(o.out), size, [&](Surface& price, Surface* panel) {
+      Compose(run, o, request, script, price, panel);
+    });
   } else {
     HeadlessSurface price(size.width, size.height);
-    compose(price, nullptr);
+    HeadlessSurface panel(size.width, size.panel);
+    Compose(run, o, request, script, price, size.panel > 0 ? &panel : nullptr);
     bytes = script.text();
   }
-  if (output == Output::kStandardOutput) {
-    WriteOut(bytes);
-    return kDone;
-  }
-  try {
-    WriteHostFile(s.files.io(), o.out, bytes);
-  } catch (const RunTimeError& e) {
-    run.Abandon(o.out + ": " + e.what(), "KORA");
-  }
+  WriteOutput(run, o.out, bytes);
   return kDone;
 }
 

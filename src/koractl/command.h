@@ -40,6 +40,7 @@ void AddPrices(CLI::App& app, CommandLine& line);
 void AddBars(CLI::App& app, CommandLine& line);
 void AddScale(CLI::App& app, CommandLine& line);
 void AddChart(CLI::App& app, CommandLine& line);
+void AddPlay(CLI::App& app, CommandLine& line);
 void AddImport(CLI::App& app, CommandLine& line);
 
 }  // namespace kora

@@ -5,6 +5,7 @@
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "shell/program_arguments.h"
 
 namespace kora {
 namespace {
@@ -20,12 +21,9 @@ std::string HomeOf(const CommandLine& line) {
 
 Run::Run(const CommandLine& line) : dialogs(line.answer), session(HomeOf(line), dialogs) {
   for (const std::string& text : line.sets) {
-    const size_t dot = text.find('.');
-    const size_t equals = text.find('=');
-    if (dot == std::string::npos || equals == std::string::npos || dot == 0 || equals < dot + 2)
-      throw UsageError("--set: \"" + text + "\" is no SECTION.KEY=VALUE");
-    session.ini.Override(text.substr(0, dot), text.substr(dot + 1, equals - dot - 1),
-                         text.substr(equals + 1));
+    const auto setting = ParseOverride(text);
+    if (!setting) throw UsageError("--set: \"" + text + "\" is no SECTION.KEY=VALUE");
+    session.ini.Override(setting->section, setting->key, setting->value);
   }
 }
 

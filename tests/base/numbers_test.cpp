@@ -92,7 +92,16 @@ TEST(StrTest, ShortestFormWithoutExponent) {
   std::string out = "x";
   AppendStr(out, 8.25);
   AppendStr(out, 42.0);
-  EXPECT_EQ(out, "x8.2542");
+  AppendStr(out, 2.1936f);
+  AppendStr(out, -7.0f);
+  EXPECT_EQ(out, "x8.25422.1936-7");
+}
+
+TEST(CSngTest, WhatNoFloatHoldsIsAnOverflow) {
+  EXPECT_EQ(CSng(0.1), 0.1f);
+  EXPECT_EQ(CSng(-3.25), -3.25f);
+  for (const double bad : {1e39, -1e39, std::nan(""), HUGE_VAL})
+    EXPECT_THROW(CSng(bad), RunTimeError) << bad;
 }
 
 TEST(FormatTest, HashShowsDigitsOnlyWhereThereAreSome) {

@@ -9,6 +9,8 @@
 #include <iterator>
 
 #include "chart/composer.h"
+#include "indicators/oscillators.h"
+#include "indicators/price_overlays.h"
 #include "platform/headless/headless_surface.h"
 #include "platform/qt/picture.h"
 #include "tests/golden/market.h"
@@ -34,7 +36,20 @@ struct GoldenChart {
   std::function<void(ChartRequest&)> options;
   double panel = 0;
   bool twoCharts = false;
+  const char* osc = "";
+  bool slow = false;
+  bool mma = false;
 };
+
+// A chart of SHARE or another with an oscillator.
+GoldenChart Panel(const char* file, const char* osc, const char* code = "SHARE",
+                  const char* period = "A", bool slow = false) {
+  GoldenChart chart{file, code, 'B', period, 5, 638, 308, [](ChartRequest&) {}};
+  chart.panel = HasPanel(osc) ? 144 : 0;
+  chart.osc = osc;
+  chart.slow = slow;
+  return chart;
+}
 
 void PrintTo(const GoldenChart& chart, std::ostream* out) { *out << chart.file; }
 
@@ -95,6 +110,33 @@ const GoldenChart kCharts[] = {
     {"advance_decline_daily_2", "ADVDEC", 'B', "A", 2, 638, 452, kGrid},
     {"advance_decline_monthly_8", "ADVDEC", 'L', "M", 8, 638, 452, kPlain},
     {"fund_daily_3", "FUND", 'B', "A", 3, 638, 452, kGrid},
+    {"bands_percentage", "SHARE", 'B', "A", 5, 638, 452, [](ChartRequest& r) { r.BandKind = 1; }},
+    {"bands_bollinger", "SHARE", 'C', "A", 5, 638, 452, [](ChartRequest& r) { r.BandKind = 2; }},
+    {"mma_weekly", "SHARE", 'L', "W", 5, 638, 452, kPlain, 0, false, "", false, true},
+    Panel("osc_sto", "STO"),
+    Panel("osc_sto_slow", "STO", "SHARE", "A", true),
+    Panel("osc_fx", "FX"),
+    Panel("osc_rf", "R/F"),
+    Panel("osc_roc", "ROC"),
+    Panel("osc_mom", "MOM"),
+    Panel("osc_wms", "WMS"),
+    Panel("osc_rmo", "RMO"),
+    Panel("osc_rmx", "RMX"),
+    Panel("osc_rsi", "RSI"),
+    Panel("osc_vty", "VTY"),
+    Panel("osc_macd", "MACD"),
+    Panel("osc_dm", "DM"),
+    Panel("osc_ery", "ERY"),
+    Panel("osc_cop", "COP"),
+    Panel("osc_jhg", "JHG"),
+    Panel("osc_obv", "OBV"),
+    Panel("osc_para", "PARA"),
+    Panel("osc_parav", "PARAV"),
+    Panel("osc_sto_penny", "STO", "PENNY"),
+    Panel("osc_macd_index_weekly", "MACD", "INDEX", "W"),
+    Panel("osc_dm_fund", "DM", "FUND"),
+    Panel("osc_roc_advance_decline", "ROC", "ADVDEC"),
+    Panel("osc_obv_penny", "OBV", "PENNY"),
 };
 
 class ChartGoldenTest : public testing::TestWithParam<GoldenChart> {
@@ -123,8 +165,24 @@ class ChartGoldenTest : public testing::TestWithParam<GoldenChart> {
     ChartColours colours;
     LoadColours(market_->home().files(), paths.SystemPath, "Black", colours);
     Composition chart;
-    const ChartServices services{market_->home().files(), dialogs_, paths, fonts, colours,
-                                 price,                   panel,    &script_, {}};
+    Settings settings;
+    settings.paths = paths;
+    settings.fonts = fonts;
+    for (const OscKey& key : OscKeys())
+      settings.osc.*key.value = {key.defaultDaily, key.defaultTwin};
+    settings.osc.MMASet = kDefaultMMASet;
+    settings.osc.FillIn = settings.osc.RFAve = true;
+    settings.osc.CompFile = "c:\\korawin\\data\\INDEX.WDT";
+    request.OscName = golden.osc;
+    const ChartServices services{market_->home().files(),
+                                 dialogs_,
+                                 paths,
+                                 fonts,
+                                 colours,
+                                 price,
+                                 panel,
+                                 &script_,
+                                 PriceOverlays(golden.mma, settings.osc.MMASet)};
     if (golden.twoCharts) {
       chart.TwoCharts = true;
       chart.ChartSlot = 1;
@@ -133,7 +191,13 @@ class ChartGoldenTest : public testing::TestWithParam<GoldenChart> {
       request.ChartStyle = 'C';
     }
     ASSERT_TRUE(ComposeChart(services, request, chart)) << dialogs_.said.back().text;
-    ASSERT_TRUE(dialogs_.said.empty());
+    OscHost host{market_->home().files(), dialogs_, settings,
+                 colours,                 request,  chart,
+                 price,                   panel ? *panel : price, &script_};
+    host.OscCode = golden.osc;
+    host.SlowStochastic = golden.slow;
+    ShowOscillatorPanel(host);
+    ASSERT_TRUE(dialogs_.said.empty()) << dialogs_.said.back().text;
   }
 
   static GoldenMarket* market_;

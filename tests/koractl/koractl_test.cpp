@@ -337,10 +337,47 @@ TEST_F(KoractlTest, ChartOptionsThatMakeNoSense) {
   ExpectUsage({"chart", "ABC", "--out", out, "--nosuch"}, "--nosuch");
 }
 
+TEST_F(KoractlTest, OscillatorsHaveTheirPanelBelowThePrices) {
+  MakeHome();
+  // A panel of 144 units stands from 2.88 to 141.12 below a price picture of 452.
+  const std::string script = Out({"chart", "ABC", "--out", "-", "--osc", "rsi"});
+  EXPECT_NE(script.find("\r\nB,42,455,631,593,"), std::string::npos);
+  EXPECT_NE(script.find("Relative Strength Index Oscillator (14 Period)"), std::string::npos);
+  // The parabolic has no panel, and slow is a form of the stochastic.
+  EXPECT_EQ(Out({"chart", "ABC", "--out", "-", "--osc", "PARA"}).find("\r\nB,42,455"),
+            std::string::npos);
+  EXPECT_NE(Out({"chart", "ABC", "--out", "-", "--osc", "STO", "--slow"}).find("SLOW Stochastic"),
+            std::string::npos);
+  const std::string out = home.path() + "/o.png";
+  EXPECT_EQ(Out({"chart", "ABC", "--out", out, "--osc", "RSI", "--panel", "200"}), "");
+  EXPECT_EQ(home.Get("o.png").substr(20, 4), std::string("\0\0\x02\x8c", 4));  // 452 + 200
+}
+
+TEST_F(KoractlTest, RmoIsForDailyChartsAndNeedsItsCompareFile) {
+  MakeHome();
+  ExpectAbandoned({"chart", "ABC", "--out", home.path() + "/r.png", "--osc", "RMO", "--period", "W"},
+                  "[RMO] RMO only available on Daily Charts");
+  ExpectAbandoned({"chart", "ABC", "--out", home.path() + "/r.png", "--osc", "RMO"},
+                  "[RMX/RMO Compare file] RMX/RMO Compare file path/file details are invalid.");
+}
+
+TEST_F(KoractlTest, PlayShowsASavedChartAndRefusesWhatIsNone) {
+  MakeHome();
+  const std::string saved = home.path() + "/a.cht", out = home.path() + "/a.svg";
+  EXPECT_EQ(Out({"chart", "ABC", "--out", saved}), "");
+  EXPECT_EQ(Out({"play", saved, "--out", out}), "");
+  EXPECT_NE(home.Get("a.svg").find("Abcot Mining"), std::string::npos);
+  home.Put("b.cht", "nothing of ours\r\n");
+  for (const char* name : {"/b.cht", "/missing.cht"})
+    ExpectAbandoned({"play", home.path() + name, "--out", out},
+                    "[Show Saved Chart] There is problem displaying this chart - format invalid.");
+  ExpectUsage({"play", saved, "--out", home.path() + "/a.cht"}, "--out");
+}
+
 TEST_F(KoractlTest, WhatCannotBeChartedYetIsRefused) {
   MakeHome();
-  for (const Words& more : {Words{"--style", "P"}, Words{"--osc", "RSI"}, Words{"--bands", "1"},
-                            Words{"--mma"}, Words{"--swing", "NORM:5"}, Words{"--box", "0.5"}}) {
+  for (const Words& more :
+       {Words{"--style", "P"}, Words{"--swing", "NORM:5"}, Words{"--box", "0.5"}}) {
     Words words{"chart", "ABC", "--out", home.path() + "/c.png"};
     words.insert(words.end(), more.begin(), more.end());
     ExpectUsage(words, more[0]);
@@ -461,7 +498,7 @@ TEST_F(KoractlTest, CommandLinesThatAreWrong) {
   ExpectUsage({"nosuch"}, "");
   ExpectUsage({"names", "more"}, "");
   ExpectUsage({"--answer", "perhaps", "names"}, "--answer");
-  for (const char* later : {"play", "print", "downloads", "update"}) ExpectUsage({later}, "");
+  for (const char* later : {"print", "downloads", "update"}) ExpectUsage({later}, "");
   const ProgramResult help = Run({"--help"});
   EXPECT_EQ(help.code, 0);
   EXPECT_NE(help.out.find("Usage: koractl"), std::string::npos);

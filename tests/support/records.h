@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "base/runtime_error.h"
+#include "tests/support/error_of.h"
 #include "store/name_rec.h"
 #include "store/price_rec.h"
 
@@ -34,17 +35,6 @@ inline NameRec Security(std::string_view code, std::int16_t category = 1,
 template <typename T>
 std::string Bytes(const std::vector<T>& records) {
   return std::string(reinterpret_cast<const char*>(records.data()), records.size() * sizeof(T));
-}
-
-// The number of the run-time error that `call` ends with, 0 for none.
-template <typename Call>
-int ErrorOf(Call call) {
-  try {
-    call();
-  } catch (const RunTimeError& e) {
-    return e.number();
-  }
-  return 0;
 }
 
 }  // namespace kora::test
