@@ -265,10 +265,12 @@ void Chts::BuildStatusBar() {
     status_[i] = new QLabel(bar);
     status_[i]->setObjectName(QString("StatusBar1(%1)").arg(i + 1));
     status_[i]->setFrameStyle(QFrame::Panel | (i == 0 ? QFrame::Raised : QFrame::Sunken));
+    // Of one size in both directions: a text that changes lays nothing out.
+    status_[i]->setFixedHeight(status_[i]->sizeHint().height() + 2);
     bar->addWidget(status_[i]);
   }
   // As high with panels as without.
-  bar->setMinimumHeight(status_[0]->sizeHint().height() + 6);
+  bar->setMinimumHeight(status_[0]->height() + 4);
 }
 
 void Chts::BuildFrame() {
