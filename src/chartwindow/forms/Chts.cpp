@@ -5,6 +5,7 @@
 #include <QClipboard>
 #include <QCloseEvent>
 #include <QFileDialog>
+#include <QFontMetricsF>
 #include <QFrame>
 #include <QGridLayout>
 #include <QKeyEvent>
@@ -193,8 +194,9 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
       picture->surface().SetBackColour(s_.colours[kBackground]);
       picture->surface().Cls();
       window_.ForgetCross();
-      // A chart that could not be drawn would only say so again at every size.
-      if (!window_.Loading && !busy_ && (window_.Chart.ChartDrawn || window_.ChartFromFile))
+      // A hidden panel takes its size when it is needed. A chart that could not be drawn would
+      // only say so again at every size.
+      if (picture->isVisibleTo(area_) && !window_.Loading && !busy_ && (window_.Chart.ChartDrawn || window_.ChartFromFile))
         resized_.start();
     };
   window_.Load();
@@ -484,8 +486,15 @@ void Chts::PlaceLegend() {
 
 void Chts::SizeChanged() {
   const StatusWidths widths = StatusBarWidths(width());
-  for (size_t i = 0; i < status_.size(); ++i)
-    if (status_[i]) status_[i]->setFixedWidth(i + 1 < status_.size() ? widths.each : widths.last);
+  // A price of three digits has room in every panel; where it has not, the letters are smaller.
+  QFont font = statusBar()->font();
+  const auto needed = [&] { return QFontMetricsF(font).horizontalAdvance("Close  000.00") + 8; };
+  while (needed() > widths.each && font.pointSizeF() > 6.5) font.setPointSizeF(font.pointSizeF() - 0.5);
+  for (size_t i = 0; i < status_.size(); ++i) {
+    if (!status_[i]) continue;
+    status_[i]->setFont(font);
+    status_[i]->setFixedWidth(i + 1 < status_.size() ? widths.each : widths.last);
+  }
   if (status_[0] == nullptr || window_.Loading) return;
   if (busy_) sizeWaits_ = true;
   LayOut(twoPanes_);
