@@ -362,9 +362,10 @@ void Chts::EnableEntries() {
 }
 
 void Chts::Trigger(const std::string& entry) {
+  const QPointer<Chts> alive(this);
   if (const auto deed = DeedOf(entry); deed && !busy_) deed();
   // A click has flipped the tick of the entry already; what it says is the window's to tell.
-  ShowView();
+  if (alive) ShowView();
 }
 
 void Chts::OpenForm(const std::string& entry) {
@@ -408,7 +409,12 @@ template <typename Deed>
 void Chts::Do(Deed deed) {
   if (busy_) return;
   busy_ = true;
-  deed();
+  try {
+    deed();
+  } catch (const RunTimeError& e) {
+    s_.dialogs.SetBusy(false);
+    s_.dialogs.Message(e.what(), "Charts");
+  }
   busy_ = false;
   ShowView();
   picture1_->update();
