@@ -5,6 +5,7 @@
 #include <QClipboard>
 #include <QCloseEvent>
 #include <QFileDialog>
+#include <QFileInfo>
 #include <QFontMetricsF>
 #include <QFrame>
 #include <QGridLayout>
@@ -535,7 +536,10 @@ void Chts::SaveAs() {
                            "Documents (*.pdf)"});
     dialog.setDefaultSuffix("cht");
     QObject::connect(&dialog, &QFileDialog::filterSelected, &dialog, [&dialog](const QString& f) {
-      dialog.setDefaultSuffix(f.section("*.", 1).chopped(1));
+      const QString ending = f.section("*.", 1).chopped(1);
+      dialog.setDefaultSuffix(ending);
+      if (dialog.selectedFiles().isEmpty()) return;
+      dialog.selectFile(QFileInfo(dialog.selectedFiles().first()).completeBaseName() + "." + ending);
     });
     try {
       dialog.setDirectory(ToQt(s_.files.HostPath(paths.ChartSavePath)));
