@@ -293,6 +293,33 @@ TEST_F(ChtsFormTest, TheCrossHairLeavesThePictureItFound) {
   EXPECT_FALSE(Button("grid")->isChecked());
 }
 
+// At any scale of the screen, between whole numbers too.
+TEST(CrossHairOnPixels, LeavesThePictureItFoundAtEveryScale) {
+  for (const double dpr : {1.0, 1.25, 1.5, 2.0, 3.0}) {
+    QtRasterSurface price(400, 300, dpr), panel(400, 100, dpr);
+    panel.SetScale(0, 0, 400, 144);
+    std::uint32_t seed = 7;
+    for (int i = 0; i < 400; ++i) {
+      const auto next = [&](int range) {
+        seed = seed * 1664525u + 1013904223u;
+        return double(seed >> 8) / 7 - std::floor(double(seed >> 8) / 7 / range) * range;
+      };
+      price.Line(next(400), next(300), next(400), next(300), Colour(seed & 0xFFFFFF));
+      panel.Line(next(400), next(144), next(400), next(144), Colour(seed & 0xFFFFFF));
+    }
+    const QImage priceBefore = price.image().copy(), panelBefore = panel.image().copy();
+    CrossHair cross(price, &panel, 0xC0A0FF);
+    const CrossLimits limits{42, 390, 10, 280, true, 3, 141};
+    for (int i = 0; i < 300; ++i) cross.Move((i * 97) % 420, (i * 41) % 310, limits);
+    ASSERT_TRUE(cross.Move(200, 150, limits));
+    EXPECT_NE(price.image(), priceBefore) << dpr;
+    EXPECT_NE(panel.image(), panelBefore) << dpr;
+    cross.Erase();
+    EXPECT_EQ(price.image(), priceBefore) << dpr;
+    EXPECT_EQ(panel.image(), panelBefore) << dpr;
+  }
+}
+
 TEST_F(ChtsFormTest, TheWidgetShowsThePictureOfTheSurfacePixelByPixel) {
   Open();
   Press("grid");
@@ -632,6 +659,8 @@ TEST_F(ChtsFormTest, WhileAMessageStandsNothingElseStarts) {
   EXPECT_TRUE(form->isVisible());
   EXPECT_EQ(session->charts.ChartIndex, 2);
   nosy.meanwhile = nullptr;
+  QCoreApplication::processEvents();
+  EXPECT_EQ(nosy.said.size(), 1u) << "the size that came meanwhile does not tell it again";
   Key(Qt::Key_PageDown);
   EXPECT_EQ(shown(), "CCC.WDT");
 }

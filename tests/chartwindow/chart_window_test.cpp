@@ -981,6 +981,20 @@ TEST_F(GridTest, ThePanelsShowTheBarOfThePriceFile) {
   EXPECT_EQ(panels()[7].find("Vol  40"), 0u) << panels()[7];
 }
 
+TEST_F(GridTest, EveryColumnReadsItsDayOfThePriceFile) {
+  const PriceFile prices(home.files(), "c:\\korawin\\data\\AAA.WDT");
+  const auto& chart = window().Chart;
+  ASSERT_EQ(prices.count(), 28);
+  for (std::int32_t record = 1; record <= 28; ++record) {
+    const PriceRec day = prices.Read(record);
+    window().MouseMove(chart.ChartLeft + (record - 1) * double(chart.BarSpacing), 200);
+    const std::string date(day.RecDate.raw());
+    EXPECT_EQ(panels()[2], date.substr(6, 2) + "-" + date.substr(4, 2) + "-" + date.substr(2, 2));
+    EXPECT_EQ(panels()[4], "High  " + std::to_string(int(day.High)) + ".00");
+    EXPECT_EQ(panels()[6], "Close  " + std::to_string(int(day.Close)) + ".00");
+  }
+}
+
 TEST_F(GridTest, BeyondTheLastBarItShowsTheLast) {
   window().MouseMove(window().Chart.ChartRight, 200);
   EXPECT_EQ(panels()[2], "28-02-26");

@@ -188,17 +188,16 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
   resized_.setInterval(0);
   resized_.callOnTimeout(this, [this] {
     if (busy_) sizeWaits_ = true;
-    else Do([this] { window_.Resized(); });
+    // A chart that could not be drawn would only say so again at every size.
+    else if (window_.Chart.ChartDrawn || window_.ChartFromFile) Do([this] { window_.Resized(); });
   });
   for (PictureBox* picture : {picture1_, picture2_})
     picture->Resized = [this, picture] {
       picture->surface().SetBackColour(s_.colours[kBackground]);
       picture->surface().Cls();
       window_.ForgetCross();
-      // A hidden panel takes its size when it is needed. A chart that could not be drawn would
-      // only say so again at every size.
-      if (picture->isVisibleTo(area_) && !window_.Loading && !busy_ && (window_.Chart.ChartDrawn || window_.ChartFromFile))
-        resized_.start();
+      // A hidden panel takes its size when it is needed.
+      if (picture->isVisibleTo(area_) && !window_.Loading && !busy_) resized_.start();
     };
   window_.Load();
   SetForm("OscFrm", s_.forms["OscFrm"]);
