@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include "base/dates.h"
 #include "lists/chart_list.h"
 #include "tests/support/recording_surface.h"
@@ -769,6 +771,34 @@ TEST_F(ChartWindowTest, ASplitScreenTakesTheNextChartBelowAndEnds) {
   window().NextChart();
   EXPECT_FALSE(state.SplitShown);
   EXPECT_TRUE(surface.Has("cls"));
+}
+
+TEST_F(ChartWindowTest, APairIsDrawnAgainAtAnotherSize) {
+  PutThree();
+  for (const bool split : {true, false}) {
+    state.ChartIndex = 0;
+    window().NextChart();
+    if (split) window().StartSplitScreen();
+    else window().StartSuperimpose();
+    EXPECT_TRUE(window().Resized()) << "the second is still to come";
+    const std::string first = script();
+    surface.ops.clear();
+    EXPECT_TRUE(window().NextChart());
+    const auto second = surface.ops;
+    const std::string pair = script();
+    surface.ops.clear();
+    EXPECT_TRUE(window().Resized());
+    EXPECT_EQ(script(), pair);
+    EXPECT_GT(pair.size(), first.size());
+    EXPECT_EQ(std::count(surface.ops.begin(), surface.ops.end(), "cls"), 1);
+    ASSERT_GT(surface.ops.size(), second.size());
+    EXPECT_TRUE(std::equal(second.rbegin(), second.rend(), surface.ops.rbegin()));
+    EXPECT_EQ(state.SplitShown, split);
+    EXPECT_EQ(state.Superimposed, !split);
+    EXPECT_EQ(shown(), "BBB.WDT");
+    window().NextChart();
+    EXPECT_FALSE(state.SplitShown || state.Superimposed);
+  }
 }
 
 TEST_F(ChartWindowTest, ASecondChartThatIsNotChosenLeavesOneChart) {
