@@ -11,6 +11,7 @@
 #include <QTextBrowser>
 #include <QTimer>
 
+#include "chartwindow/forms/Chart2.h"
 #include "platform/qt/single_instance.h"
 #include "shell/forms/AbtKora.h"
 #include "shell/forms/HelpWindow.h"
@@ -220,6 +221,20 @@ TEST_F(ChtsTest, TheEntryBringsTheStandingWindowBack) {
   Entry("mnuChartDisplay")->trigger();
   EXPECT_EQ(form->charts(), charts);
   EXPECT_EQ(Find<QMdiArea>(form.get(), "MDI")->subWindowList().size(), 1);
+}
+
+TEST_F(ChtsTest, ASecondChartThatIsNotChosenLeavesTheNextOneAlone) {
+  Chts& charts = OpenCharts();
+  Entry("cmSplitScreen")->trigger();
+  Chart2* second = nullptr;
+  ASSERT_TRUE(WaitFor([&] { return (second = TopLevel<Chart2>()) != nullptr; }));
+  EXPECT_TRUE(session->charts.SplitScreen);
+  Click(second, "Command2");
+  EXPECT_FALSE(session->charts.SplitScreen);
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_FALSE(session->charts.SplitShown);
+  EXPECT_TRUE(charts.window().Chart.ChartDrawn);
 }
 
 TEST_F(ChtsTest, ClosingAndOpeningStartsAnew) {

@@ -204,7 +204,10 @@ void ChartDesk::OpenSelection() {
 
 void ChartDesk::OpenSecondChart() {
   ChtSelServices services = SelectionServices();
-  services.closed = {};  // leaving it leaves the first chart alone
+  // Leaving it leaves the first chart alone: the next one has the surface to itself.
+  services.closed = [this] {
+    if (chts_) chts_->window().DropSecondChart();
+  };
   auto* form = new Chart2(std::move(services), Over());
   form->setAttribute(Qt::WA_DeleteOnClose);
   form->show();
