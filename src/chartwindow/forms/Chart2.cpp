@@ -45,9 +45,9 @@ Chart2::Chart2(ChtSelServices services, QWidget* parent)
 }
 
 void Chart2::Leave() {
-  const auto closed = services_.closed;
+  const auto dropped = services_.secondDropped;
   QDialog::reject();
-  if (closed) closed();
+  if (dropped) dropped();
 }
 
 }  // namespace kora

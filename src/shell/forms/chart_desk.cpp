@@ -205,7 +205,8 @@ void ChartDesk::OpenSelection() {
 void ChartDesk::OpenSecondChart() {
   ChtSelServices services = SelectionServices();
   // Leaving it leaves the first chart alone: the next one has the surface to itself.
-  services.closed = [this] {
+  services.closed = {};
+  services.secondDropped = [this] {
     if (chts_) chts_->window().DropSecondChart();
   };
   auto* form = new Chart2(std::move(services), Over());
