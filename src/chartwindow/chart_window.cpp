@@ -164,11 +164,30 @@ bool ChartWindow::Resized() {
     return ShowSavedChart(services_.files, services_.dialogs, services_.price,
                           services_.settings.fonts, services_.colours, SavedChartFile);
   }
+  if (state().SplitShown || state().Superimposed) return RedrawPair();
   const std::string picked = panelPicked_ ? panelCode_ : "";
   if (!Redraw()) return false;
   if (picked.empty()) return true;
   state().OscCode = picked;
   return ShowOscillator();
+}
+
+// Both charts of a pair once more, or the first where the second is still to come.
+bool ChartWindow::RedrawPair() {
+  ChartState& s = state();
+  const ChartRequest first = first_, second = Request;
+  const bool split = s.SplitShown;
+  const bool both = split ? !s.SplitScreen : Chart.OscPanel == 0;
+  LayOut(false);
+  if (split) {
+    s.SplitScreen = true;
+    Chart.ChartSlot = 1;
+  } else {
+    Chart.OscPanel = 1;
+  }
+  if (!Compose(first)) return false;
+  if (!split) Chart.OscPanel = 2;
+  return !both || Compose(second);
 }
 
 // Opens the files, finds the record `step` places on and reads it.
@@ -320,6 +339,10 @@ ChartServices ChartWindow::Services(Surface& price, Surface* panel, ChartScript*
 }
 
 bool ChartWindow::Compose() {
+  return Compose(MakeRequest(state(), services_.settings, services_.current.Rec));
+}
+
+bool ChartWindow::Compose(const ChartRequest& request) {
   ChartState& s = state();
   // Two charts of a pair are composed one after the other over a picture that stays.
   EraseCross();
@@ -328,7 +351,8 @@ bool ChartWindow::Compose() {
   s.SplitShown = s.SplitScreen;
   s.Superimposed = Chart.OscPanel == 1 || Chart.OscPanel == 2;
   const bool second = Chart.OscPanel == 2;
-  Request = MakeRequest(s, services_.settings, services_.current.Rec);
+  Request = request;
+  if (Chart.OscPanel == 1 || (s.SplitScreen && Chart.ChartSlot == 1)) first_ = request;
   script_.emplace(services_.files, ScriptPath());
   const bool drawn = ComposeChart(Services(services_.price, &services_.panel, &*script_), Request,
                                   Chart);

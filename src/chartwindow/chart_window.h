@@ -216,6 +216,8 @@ class ChartWindow {
   void TakeChosenLimit();
   void LayOut(bool twoPanes);
   bool Compose();
+  bool Compose(const ChartRequest& request);
+  bool RedrawPair();
   ChartServices Services(Surface& price, Surface* panel, ChartScript* script);
   OscHost Host(std::string_view code, Composition& chart, const ChartRequest& request,
                Surface& price, Surface& panel, ChartScript* script) const;
@@ -234,6 +236,7 @@ class ChartWindow {
   ChartWindowServices services_;
   ChartWindowView view_;
   std::optional<ChartScript> script_;
+  ChartRequest first_;     // of the first chart of a pair
   std::string panelCode_;  // the oscillator that was drawn last, empty none
   bool panelPicked_ = false;  // from the menu: it is not part of the next chart
   std::int16_t panelTop_ = 0, panelBottom_ = 0;

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include "base/dates.h"
 #include "lists/chart_list.h"
 #include "tests/support/recording_surface.h"
@@ -771,6 +773,34 @@ TEST_F(ChartWindowTest, ASplitScreenTakesTheNextChartBelowAndEnds) {
   EXPECT_TRUE(surface.Has("cls"));
 }
 
+TEST_F(ChartWindowTest, APairIsDrawnAgainAtAnotherSize) {
+  PutThree();
+  for (const bool split : {true, false}) {
+    state.ChartIndex = 0;
+    window().NextChart();
+    if (split) window().StartSplitScreen();
+    else window().StartSuperimpose();
+    EXPECT_TRUE(window().Resized()) << "the second is still to come";
+    const std::string first = script();
+    surface.ops.clear();
+    EXPECT_TRUE(window().NextChart());
+    const auto second = surface.ops;
+    const std::string pair = script();
+    surface.ops.clear();
+    EXPECT_TRUE(window().Resized());
+    EXPECT_EQ(script(), pair);
+    EXPECT_GT(pair.size(), first.size());
+    EXPECT_EQ(std::count(surface.ops.begin(), surface.ops.end(), "cls"), 1);
+    ASSERT_GT(surface.ops.size(), second.size());
+    EXPECT_TRUE(std::equal(second.rbegin(), second.rend(), surface.ops.rbegin()));
+    EXPECT_EQ(state.SplitShown, split);
+    EXPECT_EQ(state.Superimposed, !split);
+    EXPECT_EQ(shown(), "BBB.WDT");
+    window().NextChart();
+    EXPECT_FALSE(state.SplitShown || state.Superimposed);
+  }
+}
+
 TEST_F(ChartWindowTest, ASecondChartThatIsNotChosenLeavesOneChart) {
   PutThree();
   window().NextChart();
@@ -949,6 +979,20 @@ TEST_F(GridTest, ThePanelsShowTheBarOfThePriceFile) {
   EXPECT_EQ(panels()[5], "Low  13.00");
   EXPECT_EQ(panels()[6], "Close  14.00");
   EXPECT_EQ(panels()[7].find("Vol  40"), 0u) << panels()[7];
+}
+
+TEST_F(GridTest, EveryColumnReadsItsDayOfThePriceFile) {
+  const PriceFile prices(home.files(), "c:\\korawin\\data\\AAA.WDT");
+  const auto& chart = window().Chart;
+  ASSERT_EQ(prices.count(), 28);
+  for (std::int32_t record = 1; record <= 28; ++record) {
+    const PriceRec day = prices.Read(record);
+    window().MouseMove(chart.ChartLeft + (record - 1) * double(chart.BarSpacing), 200);
+    const std::string date(day.RecDate.raw());
+    EXPECT_EQ(panels()[2], date.substr(6, 2) + "-" + date.substr(4, 2) + "-" + date.substr(2, 2));
+    EXPECT_EQ(panels()[4], "High  " + std::to_string(int(day.High)) + ".00");
+    EXPECT_EQ(panels()[6], "Close  " + std::to_string(int(day.Close)) + ".00");
+  }
 }
 
 TEST_F(GridTest, BeyondTheLastBarItShowsTheLast) {

@@ -44,6 +44,10 @@ Chart2::Chart2(ChtSelServices services, QWidget* parent)
   Refresh();
 }
 
-void Chart2::Leave() { QDialog::reject(); }
+void Chart2::Leave() {
+  const auto dropped = services_.secondDropped;
+  QDialog::reject();
+  if (dropped) dropped();
+}
 
 }  // namespace kora

@@ -5,6 +5,8 @@
 #include <QClipboard>
 #include <QCloseEvent>
 #include <QFileDialog>
+#include <QFileInfo>
+#include <QFontMetricsF>
 #include <QFrame>
 #include <QGridLayout>
 #include <QKeyEvent>
@@ -13,6 +15,7 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QMouseEvent>
+#include <QPainter>
 #include <QPointer>
 #include <QPushButton>
 #include <QStatusBar>
@@ -130,6 +133,10 @@ struct Chts::Area : QWidget {
   QSize minimumSizeHint() const override { return {160, 100}; }
   QSize sizeHint() const override { return {640, 400}; }
   void resizeEvent(QResizeEvent*) override { form->SizeChanged(); }
+  // What the pictures leave free looks like them.
+  void paintEvent(QPaintEvent* event) override {
+    QPainter(this).fillRect(event->rect(), QtSurface::Rgb(form->colours()[kBackground]));
+  }
   Chts* form;
 };
 
@@ -181,16 +188,16 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
   resized_.setInterval(0);
   resized_.callOnTimeout(this, [this] {
     if (busy_) sizeWaits_ = true;
-    else Do([this] { window_.Resized(); });
+    // A chart that could not be drawn would only say so again at every size.
+    else if (window_.Chart.ChartDrawn || window_.ChartFromFile) Do([this] { window_.Resized(); });
   });
   for (PictureBox* picture : {picture1_, picture2_})
     picture->Resized = [this, picture] {
       picture->surface().SetBackColour(s_.colours[kBackground]);
       picture->surface().Cls();
       window_.ForgetCross();
-      // A chart that could not be drawn would only say so again at every size.
-      if (!window_.Loading && !busy_ && (window_.Chart.ChartDrawn || window_.ChartFromFile))
-        resized_.start();
+      // A hidden panel takes its size when it is needed.
+      if (picture->isVisibleTo(area_) && !window_.Loading && !busy_) resized_.start();
     };
   window_.Load();
   SetForm("OscFrm", s_.forms["OscFrm"]);
@@ -260,10 +267,12 @@ void Chts::BuildStatusBar() {
     status_[i] = new QLabel(bar);
     status_[i]->setObjectName(QString("StatusBar1(%1)").arg(i + 1));
     status_[i]->setFrameStyle(QFrame::Panel | (i == 0 ? QFrame::Raised : QFrame::Sunken));
+    // Of one size in both directions: a text that changes lays nothing out.
+    status_[i]->setFixedHeight(status_[i]->sizeHint().height() + 2);
     bar->addWidget(status_[i]);
   }
   // As high with panels as without.
-  bar->setMinimumHeight(status_[0]->sizeHint().height() + 6);
+  bar->setMinimumHeight(status_[0]->height() + 4);
 }
 
 void Chts::BuildFrame() {
@@ -353,9 +362,10 @@ void Chts::EnableEntries() {
 }
 
 void Chts::Trigger(const std::string& entry) {
+  const QPointer<Chts> alive(this);
   if (const auto deed = DeedOf(entry); deed && !busy_) deed();
   // A click has flipped the tick of the entry already; what it says is the window's to tell.
-  ShowView();
+  if (alive) ShowView();
 }
 
 void Chts::OpenForm(const std::string& entry) {
@@ -399,7 +409,12 @@ template <typename Deed>
 void Chts::Do(Deed deed) {
   if (busy_) return;
   busy_ = true;
-  deed();
+  try {
+    deed();
+  } catch (const RunTimeError& e) {
+    s_.dialogs.SetBusy(false);
+    s_.dialogs.Message(e.what(), "Charts");
+  }
   busy_ = false;
   ShowView();
   picture1_->update();
@@ -477,8 +492,15 @@ void Chts::PlaceLegend() {
 
 void Chts::SizeChanged() {
   const StatusWidths widths = StatusBarWidths(width());
-  for (size_t i = 0; i < status_.size(); ++i)
-    if (status_[i]) status_[i]->setFixedWidth(i + 1 < status_.size() ? widths.each : widths.last);
+  // A price of three digits has room in every panel; where it has not, the letters are smaller.
+  QFont font = statusBar()->font();
+  const auto needed = [&] { return QFontMetricsF(font).horizontalAdvance("Close  000.00") + 8; };
+  while (needed() > widths.each && font.pointSizeF() > 6.5) font.setPointSizeF(font.pointSizeF() - 0.5);
+  for (size_t i = 0; i < status_.size(); ++i) {
+    if (!status_[i]) continue;
+    status_[i]->setFont(font);
+    status_[i]->setFixedWidth(i + 1 < status_.size() ? widths.each : widths.last);
+  }
   if (status_[0] == nullptr || window_.Loading) return;
   if (busy_) sizeWaits_ = true;
   LayOut(twoPanes_);
@@ -513,7 +535,10 @@ void Chts::SaveAs() {
                            "Documents (*.pdf)"});
     dialog.setDefaultSuffix("cht");
     QObject::connect(&dialog, &QFileDialog::filterSelected, &dialog, [&dialog](const QString& f) {
-      dialog.setDefaultSuffix(f.section("*.", 1).chopped(1));
+      const QString ending = f.section("*.", 1).chopped(1);
+      dialog.setDefaultSuffix(ending);
+      if (dialog.selectedFiles().isEmpty()) return;
+      dialog.selectFile(QFileInfo(dialog.selectedFiles().first()).completeBaseName() + "." + ending);
     });
     try {
       dialog.setDirectory(ToQt(s_.files.HostPath(paths.ChartSavePath)));

@@ -29,6 +29,7 @@ struct ChtSelServices {
   std::function<void()> showChart;     // the chart window's NextChart
   std::function<void()> showWindow;    // shows the chart window, on the way from the start
   std::function<void()> closed;        // the chart window closes, the menus come back
+  std::function<void()> secondDropped = {};  // the second chart of a pair was not chosen
   std::function<void()> openChtDef;    // chart defaults, modally
   std::function<bool()> openFinDate;   // true when a date was chosen
   std::function<void()> openChtBands;  // percentage bands, modally
