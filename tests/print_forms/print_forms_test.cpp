@@ -11,8 +11,10 @@
 #include "chart/forms/Page.h"
 #include "chart/forms/PrintKora.h"
 #include "chart/forms/PrinterSetup.h"
+#include "chart/forms/print_job.h"
 #include "platform/qt/qt_printer.h"
 #include "tests/forms/form_fixture.h"
+#include "tests/support/failing_io.h"
 #include "tests/support/recording_printer.h"
 
 namespace kora {
@@ -347,6 +349,94 @@ TEST_F(PrintForms, WithoutAPrinterTheCopyDialogAsksToChooseOne) {
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(dialogs.said[0].text, "There is no default printer.");
   EXPECT_TRUE(choice.PrintCancelled);
+}
+
+// ---- the menu entry
+
+class PrintJobs : public PrintForms {
+ protected:
+  // Opens the copy dialog over a caller, presses `button` after `prepare`, and waits for the end.
+  void Run(Printer& on, const char* button, std::function<void(PrintKora&)> prepare = {}) {
+    home.Put("drive_c/korawin/data/TCht.Tmp", script);
+    PrintServices services{session->files,   session->ini,     dialogs, session->settings,
+                           session->colours, session->printer, on};
+    bool done = false;
+    AskAndPrint(services, choice,
+                {.chart = kChart,
+                 .scriptPath = "c:\\korawin\\data\\TCht.Tmp",
+                 .swapCaption =
+                     [this](const std::string& caption) {
+                       captions.push_back(caption);
+                       return std::string("CHARTS");
+                     },
+                 .done = [&] { done = true; }},
+                nullptr);
+    auto* form = TopLevel<PrintKora>();
+    ASSERT_NE(form, nullptr);
+    if (prepare) prepare(*form);
+    Click(form, button);
+    EXPECT_TRUE(WaitFor([&] { return done; }));
+    EXPECT_EQ(home.Get("drive_c/korawin/data/TCht.Tmp"), script);
+  }
+
+  std::string script = "L,1,2,3,4,5\r\n";
+  PrintChoice choice;
+  std::vector<std::string> captions;
+};
+
+TEST_F(PrintJobs, EachCopyIsPrinted) {
+  printer.SetOrientation(kLandscape);
+  session->settings.page.Orient = 0;
+  Run(printer, "Command1", [&](PrintKora& form) { Find<QSpinBox>(&form, "Text1")->setValue(3); });
+  EXPECT_EQ(printer.sent.size(), 3u);
+  EXPECT_EQ(session->settings.page.Orient, kPortrait) << "none was chosen";
+  EXPECT_EQ(printer.Orientation(), kPortrait);
+  EXPECT_EQ(captions.size(), 6u);
+}
+
+TEST_F(PrintJobs, TheOrientationFollowsThePrinter) {
+  session->settings.page.Orient = kPortrait;
+  printer.SetOrientation(kLandscape);
+  Run(printer, "Command1");
+  EXPECT_EQ(session->settings.page.Orient, kLandscape);
+  EXPECT_EQ(printer.Orientation(), kLandscape);
+}
+
+TEST_F(PrintJobs, CancelPrintsNothing) {
+  Run(printer, "Command2");
+  EXPECT_TRUE(choice.PrintCancelled);
+  EXPECT_EQ(printer.started, 0);
+  EXPECT_TRUE(captions.empty());
+}
+
+TEST_F(PrintJobs, TheFirstCopyThatFailsIsTheLast) {
+  script = "L,1,2,3,4,5,6,7\r\n";
+  Run(printer, "Command1", [&](PrintKora& form) { Find<QSpinBox>(&form, "Text1")->setValue(3); });
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  EXPECT_TRUE(printer.sent.empty());
+}
+
+TEST_F(PrintJobs, APdfComesIntoItsFileAndAFullDiskLeavesTheOldOne) {
+  test::FailingIo io;  // the disk is full from the nth change on
+  const Files files(home.path(), io);
+  QtPrinter pdf([&](const std::string& bytes) { files.WriteAll(choice.pdfFile, bytes); });
+  pdf.SetDevice(QtPrinter::kPdfPrinter);
+  choice.pdfFile = "c:\\korawin\\chtsave\\AAA.pdf";
+  Run(pdf, "Command1");
+  EXPECT_TRUE(dialogs.said.empty());
+  const std::string made = home.Get("drive_c/korawin/chtsave/AAA.pdf");
+  EXPECT_EQ(made.substr(0, 5), "%PDF-");
+  io.lasting = true;
+  for (const int change : {1, 2, 3}) {
+    io.Reset(change);
+    dialogs.said.clear();
+    Run(pdf, "Command1");
+    ASSERT_EQ(dialogs.said.size(), 2u) << change;
+    EXPECT_EQ(dialogs.said[0].text, "c:\\korawin\\chtsave\\AAA.pdf already exists - Overwrite");
+    EXPECT_EQ(dialogs.said[1].text, "There is an unexpected error No. 61\nDisk full");
+    EXPECT_EQ(dialogs.said[1].title, "Chart Printing");
+    EXPECT_EQ(home.Get("drive_c/korawin/chtsave/AAA.pdf"), made) << change;
+  }
 }
 
 // ---- PrinterSetup
