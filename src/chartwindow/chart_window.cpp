@@ -117,6 +117,16 @@ void ChartWindow::RefreshTitle() {
                 std::string(Trim(services_.settings.paths.CurrentDataPath));
 }
 
+std::string ChartWindow::ScriptOnShow() const {
+  return ChartFromFile ? SavedChartFile : ScriptPath();
+}
+
+void ChartWindow::StartPrinting(bool print) {
+  CancelChartTools();
+  state().SuppressScript = true;
+  if (print) state().ChartTask = kTaskPrinting;
+}
+
 std::string ChartWindow::ScriptPath() const {
   return services_.settings.paths.CurrentDataPath + "TCht.Tmp";
 }
@@ -378,7 +388,7 @@ bool ChartWindow::DrawAgain(Surface& price, Surface* panel) {
       price.SetBackColour(services_.colours[kBackground]);
       price.Cls();
       return PlayChartScript(
-          services_.files.ReadAll(ChartFromFile ? SavedChartFile : ScriptPath()), price,
+          services_.files.ReadAll(ScriptOnShow()), price,
           services_.settings.fonts, services_.colours);
     }
   } catch (const RunTimeError&) {

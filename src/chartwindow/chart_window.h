@@ -164,6 +164,10 @@ class ChartWindow {
                    const std::function<std::string(const std::string&)>& makePicture = {});
   // Trimmed code + ".cht".
   std::string SuggestedName() const;
+  // The script of the chart on show: TCht.Tmp, or the saved chart's file.
+  std::string ScriptOnShow() const;
+  // Before the forms of page set-up and printing: tools left, the script kept as it is.
+  void StartPrinting(bool print);
   // Plays a saved chart in place of the composed one.
   void ShowSaved(const std::string& path);
   // Draws what stands on the window once more, on surfaces of the same sizes. `panel` may be
@@ -207,6 +211,7 @@ class ChartWindow {
   Composition Chart;
 
  private:
+  std::string ScriptPath() const;
   bool Move(int step, bool filtered);
   bool FindRecord(int step, bool filtered);
   bool FindNextChtIC(const std::vector<NameRec>& names);
@@ -231,7 +236,6 @@ class ChartWindow {
   void MoveTo(double x, double y, std::int32_t column);
   void EraseCross();
   void CrossToColumn(std::int32_t column);
-  std::string ScriptPath() const;
 
   ChartWindowServices services_;
   ChartWindowView view_;

@@ -258,6 +258,20 @@ TEST_F(ChtsTest, WithoutANameFileItSaysSoOnceAndStands) {
   EXPECT_EQ(dialogs.said.size(), 3u);
 }
 
+TEST_F(ChtsTest, PageSetUpAndPrintOpenTheirFormsOverTheChart) {
+  Chts& charts = OpenCharts();
+  for (const auto& [entry, name] : {std::pair{"cmPageSetup", "Page"}, {"cmPrintChart", "PrintKora"}}) {
+    Find<QAction>(&charts, entry)->trigger();
+    auto* dialog = Find<QDialog>(&charts, name);
+    ASSERT_NE(dialog, nullptr) << name;
+    EXPECT_TRUE(dialog->isVisible());
+    EXPECT_TRUE(session->charts.SuppressScript);
+    dialog->reject();
+    ASSERT_TRUE(WaitFor([&] { return charts.findChild<QDialog*>(name) == nullptr; })) << name;
+  }
+  EXPECT_TRUE(home.Exists("drive_c/korawin/data/TCht.Tmp"));
+}
+
 TEST_F(ChtsTest, AChartThatFailsIsNotToldAgainAtEverySize) {
   home.Put("drive_c/korawin/data/AAA.WDT", "torn");
   OpenCharts();

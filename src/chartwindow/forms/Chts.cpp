@@ -376,6 +376,8 @@ void Chts::OpenForm(const std::string& entry) {
     if (entry == "cmColours" || entry == "cmSLInd") window_.CancelChartTools();
     if (entry == "cmColours") state.ChartTask = kTaskColours;
     if (entry == "cmChtDef") state.ChartTask = kTaskChartDefaults;
+    if (entry == "cmPageSetup" || entry == "cmPrintChart")
+      window_.StartPrinting(entry == "cmPrintChart");
   });
   // The form may ask for a chart, or close this window with it.
   const QPointer<Chts> alive(this);
@@ -398,6 +400,13 @@ void Chts::Command2() {
 
 void Chts::Refresh() {
   Do([this] { window_.Refresh(); });
+}
+
+QSizeF Chts::ChartSize() const {
+  const Surface& price = picture1_->surface();
+  const Surface& panel = picture2_->surface();
+  const bool below = picture2_->isVisibleTo(area_);
+  return {price.ScaleWidth(), price.ScaleHeight() + (below ? panel.ScaleHeight() : 0)};
 }
 
 void Chts::RefreshTitle() {
@@ -684,6 +693,7 @@ void Chts::keyPressEvent(QKeyEvent* event) {
   if (OpenMenuByKey(event, true)) return;
   if (event == QKeySequence::Save) return Trigger("cmSaveAs");
   if (event == QKeySequence::Copy) return CopyPicture();
+  if (event == QKeySequence::Print) return Trigger("cmPrintChart");
   const auto cross = [this](auto work) {
     if (busy_ || !window_.HasChart()) return;
     work();

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QMainWindow>
+#include <QSizeF>
 #include <QTimer>
 #include <array>
 #include <functional>
@@ -63,6 +64,8 @@ class Chts : public QMainWindow {
   void Refresh();
   // After the data folder changed.
   void RefreshTitle();
+  // Size of the chart on show in its units, the oscillator below it included.
+  QSizeF ChartSize() const;
   // The chart as a picture: both panes.
   QImage Picture();
 

@@ -79,6 +79,8 @@ void Main::SetOpeners() {
   SetOpener("mnuChartDisplay", [this] { desk_.OpenCharts(); });
   SetOpener("mnuChartDefaults", [this] { desk_.OpenDefaults(); });
   SetOpener("mnFnts", [this] { desk_.OpenFonts(); });
+  SetOpener("mnTPSU", [this] { desk_.OpenTextPage(); });
+  SetOpener("mnPrSU", [this] { desk_.OpenPrinterSetup(); });
   SetOpener("mnuLists", [this] { desk_.OpenLists(); });
   SetOpener("mnuListsUte", [this] { desk_.OpenListUtilities(); });
   SetOpener("mnuRenameCL", [this] { desk_.OpenListNames(); });

@@ -5,6 +5,11 @@
 #include <QMdiSubWindow>
 
 #include "base/dates.h"
+#include "base/runtime_error.h"
+#include "chart/forms/CHTPage.h"
+#include "chart/forms/Page.h"
+#include "chart/forms/PrinterSetup.h"
+#include "chart/forms/print_job.h"
 #include "chartwindow/forms/Chart2.h"
 #include "chartwindow/forms/ChtSel.h"
 #include "indicators/forms/ChtBands.h"
@@ -51,7 +56,10 @@ ChartDesk::ChartDesk(Session& session, QWidget* over, QMdiArea* mdi,
                   .ini = session.ini,
                   .user = session.user,
                   .state = session.charts,
-                  .current = session.current}) {}
+                  .current = session.current}),
+      printer_([this](const std::string& bytes) {
+        session_.files.WriteAll(printChoice_.pdfFile, bytes);
+      }) {}
 
 QWidget* ChartDesk::Over() const {
   return chts_ ? static_cast<QWidget*>(chts_.data()) : over_;
@@ -120,6 +128,8 @@ void ChartDesk::WireWindow() {
   w.SetForm("OscFrm", [this] { OpenOscFrm(); });
   w.SetForm("cmChtDef", [this] { OpenChtDef(true, false); });
   w.SetForm("cmChtSpaces", [this] { OpenChtSp(); });
+  w.SetForm("cmPageSetup", [this] { OpenPage(); });
+  w.SetForm("cmPrintChart", [this] { PrintChart(); });
   w.SetForm("cmColours", [this] {
     ColNew form({.files = session_.files,
                  .systemPath = session_.settings.paths.SystemPath,
@@ -164,6 +174,47 @@ void ChartDesk::OpenChtSp() {
              session_.charts.ChartStyle, Over());
   form.exec();
 }
+
+// ---- Printing
+
+PrintServices ChartDesk::Printing() {
+  return {session_.files,   session_.ini,     session_.dialogs, session_.settings,
+          session_.colours, session_.printer, printer_};
+}
+
+void ChartDesk::OpenPage() {
+  const QSizeF size = chts_->ChartSize();
+  std::string script;
+  try {
+    script = session_.files.ReadAll(chts_->window().ScriptOnShow());
+  } catch (const RunTimeError&) {
+    // Nothing was charted yet: the sheet shows an empty box.
+  }
+  Show(new Page(Printing(), {size.width(), size.height()}, std::move(script), chts_))
+      ->CheckPrinter();
+}
+
+void ChartDesk::PrintChart() {
+  const QSizeF size = chts_->ChartSize();
+  const std::string code(session_.current.Rec.Code.trimmed());
+  printChoice_.pdfFile = session_.settings.paths.ChartSavePath + code + ".pdf";
+  const QPointer<Chts> window = chts_;
+  AskAndPrint(Printing(), printChoice_,
+              {.chart = {size.width(), size.height()},
+               .scriptPath = window->window().ScriptOnShow(),
+               .swapCaption = [window](const std::string& caption) {
+                 if (!window) return std::string();
+                 const std::string before = window->windowTitle().toStdString();
+                 window->setWindowTitle(QString::fromStdString(caption));
+                 return before;
+               },
+               .done = {}},
+              chts_);
+}
+
+void ChartDesk::OpenTextPage() { Show(new CHTPage(Printing(), over_))->CheckPrinter(); }
+
+void ChartDesk::OpenPrinterSetup() { Show(new PrinterSetup(Printing(), over_)); }
 
 // ---- Chart selection
 

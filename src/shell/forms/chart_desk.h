@@ -3,9 +3,11 @@
 #include <QPointer>
 #include <functional>
 
+#include "chart/forms/PrintKora.h"
 #include "chartwindow/chart_selection.h"
 #include "chartwindow/forms/Chts.h"
 #include "chartwindow/forms/selection_form.h"
+#include "platform/qt/qt_printer.h"
 #include "shell/session.h"
 #include "store/forms/look_services.h"
 
@@ -29,6 +31,8 @@ class ChartDesk {
   void OpenLists();          // SubList
   void OpenListUtilities();  // SubList2
   void OpenListNames();      // CLNames
+  void OpenTextPage();       // CHTPage
+  void OpenPrinterSetup();   // PrinterSetup
 
   Chts* window() const { return chts_; }
   // After other folders were chosen.
@@ -48,6 +52,9 @@ class ChartDesk {
   bool OpenFinDate();
   void OpenChtBands();
   void OpenChtSp();
+  PrintServices Printing();
+  void OpenPage();
+  void PrintChart();
 
   Session& session_;
   QWidget* over_;
@@ -56,6 +63,8 @@ class ChartDesk {
   ChartSelection selection_;
   QPointer<Chts> chts_;
   QPointer<QDialog> selectionForm_;
+  PrintChoice printChoice_;
+  QtPrinter printer_;
   float boxValue_ = 0;  // of the point-and-figure chart, as its settings box left it
 };
 
