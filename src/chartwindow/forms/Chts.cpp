@@ -689,6 +689,8 @@ bool Chts::event(QEvent* event) {
 }
 
 void Chts::keyPressEvent(QKeyEvent* event) {
+  // Some window managers leave the keyboard here when a message over a form is closed.
+  if (QApplication::activeModalWidget()) return;
   const bool plain = (event->modifiers() & ~Qt::KeypadModifier) == Qt::NoModifier;
   if (OpenMenuByKey(event, true)) return;
   if (event == QKeySequence::Save) return Trigger("cmSaveAs");
