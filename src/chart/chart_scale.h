@@ -46,7 +46,7 @@ struct PriceMap {
 struct VolumeMap {
   bool Logarithmic = false;
   double VolBase = 0, VolPeak = 0, VolMean = 0;
-  double VolPerY = 1;
+  float VolPerY = 1;
   float VolLogBase = 0;  // ln VolBase; set on logarithmic price charts alone and kept otherwise
   float VolLogFactor = 1;
   std::int16_t VolTop = 0, VolBottom = 0;

@@ -19,6 +19,12 @@ void ChartScript::Open(bool append) {
   if (!append || files_) buffer_.clear();
   append_ = append;
   open_ = true;
+  opened_ = buffer_.size();
+}
+
+void ChartScript::Abandon() {
+  if (open_) buffer_.resize(opened_);
+  open_ = false;
 }
 
 void ChartScript::Close() {

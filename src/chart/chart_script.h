@@ -26,6 +26,9 @@ class ChartScript {
   // Writes what was gathered. Errors of the file system leave the script closed.
   void Close();
 
+  // Forgets what was gathered since Open; nothing is written.
+  void Abandon();
+
   // Lines gathered since Open; for a script in memory, the whole script.
   const std::string& text() const { return buffer_; }
   // Where a line is put together: the writer appends letter, fields and "\r\n".
@@ -37,6 +40,7 @@ class ChartScript {
   std::string buffer_;
   bool open_ = false;
   bool append_ = false;
+  size_t opened_ = 0;  // length of the buffer then
 };
 
 // A line split into its six fields. text[0] is the letter as it stands in the file.

@@ -48,6 +48,9 @@ class Composer {
   std::string FailureText(int number, const std::string& detail) const;
   // Leaves no file behind in use. The script keeps what was drawn until then.
   void CloseFiles();
+  // The same after a failure, which is the one to tell.
+  void GiveUpFiles();
+  void DropScript();
 
  private:
   void PrepareSurface();
@@ -90,6 +93,7 @@ class Composer {
 void Composer::Run() {
   chart_.ChartDrawn = false;
   chart_.ScaleMissing = false;
+  chart_.Bars.CurrentDataRec = 0;
   chart_.CloseY.clear();
   chart_.DataFile = std::string(request_.Name.Code.trimmed()) + ".WDT";
   if (script_) {
@@ -123,8 +127,12 @@ void Composer::LoadBars() {
     LoadChartBars(*file_, request_.ChartPeriod, request_.VolumeOption, request_.Name.RecType,
                   chart_.Bars);
   } catch (const RunTimeError&) {
-    if (const std::int16_t record = chart_.Bars.CurrentDataRec; record != 0)
-      barDate_ = FromAnsi(file_->Read(record).RecDate.trimmed());
+    try {
+      if (const std::int16_t record = chart_.Bars.CurrentDataRec; record != 0)
+        barDate_ = FromAnsi(file_->Read(record).RecDate.trimmed());
+    } catch (const RunTimeError&) {
+      // The first failure is the one to tell, without its date.
+    }
     throw;
   }
   chart_.Bars.CurrentDataRec = 0;
@@ -133,6 +141,18 @@ void Composer::LoadBars() {
 void Composer::CloseFiles() {
   file_.reset();
   if (script_) script_->Close();
+}
+
+void Composer::GiveUpFiles() {
+  try {
+    CloseFiles();
+  } catch (const RunTimeError&) {
+    // The script that can't be written is the failure being told, or a lesser one.
+  }
+}
+
+void Composer::DropScript() {
+  if (script_) script_->Abandon();
 }
 
 void Composer::PrepareSurface() {
@@ -387,6 +407,7 @@ void Composer::DrawBars() {
       request_.OscName != "MACD" && request_.OscName != "PARA" && request_.OscName != "PARAV";
   const bool outside = bars && request_.OutsideMarks;
   BarY previous, beforePrevious;
+  const ChartBar* previousBar = nullptr;  // the last one that was drawn
   int seen = 0;
   std::int16_t x = chart_.FirstBarX;
   for (int i = 0; i <= chart_.Bars.BarCount; ++i, x = CInt(double(x) + chart_.BarSpacing)) {
@@ -404,7 +425,7 @@ void Composer::DrawBars() {
     chart_.CloseY.push_back(y.Close);
     const auto volumeY = VolumeY(bar);
     int entry = kChartLines;
-    if (outside && i > 0) entry = stop.Next(bar, chart_.Bars[static_cast<size_t>(i) - 1], x);
+    if (outside && previousBar) entry = stop.Next(bar, *previousBar, x);
     if (outside && i == chart_.Bars.BarCount && request_.StopLossShown) DrawStop(stop);
     DrawAdjustment(bar, x);
     axis.Bar(bar.date(), x);
@@ -415,6 +436,7 @@ void Composer::DrawBars() {
     if (smooths) Smooth(y.Close, x);
     beforePrevious = previous;
     previous = y;
+    previousBar = &bar;
     ++seen;
   }
   chart_.LastBarX = x;
@@ -586,7 +608,7 @@ bool ComposeChart(const ChartServices& services, const ChartRequest& request, Co
       dialogs.SetBusy(false);
       return true;
     } catch (const Refusal& refusal) {
-      composer.CloseFiles();
+      composer.GiveUpFiles();
       dialogs.SetBusy(false);
       dialogs.Message(refusal.text, refusal.title);
       return false;
@@ -596,18 +618,17 @@ bool ComposeChart(const ChartServices& services, const ChartRequest& request, Co
     } catch (const std::bad_alloc&) {
       number = kOutOfMemory;
     }
-    try {
-      composer.CloseFiles();
-    } catch (const RunTimeError&) {
-      // The script that can't be written is the failure being told, or a lesser one.
-    }
     dialogs.SetBusy(false);
     if (number == kDiskNotReady) {
       if (dialogs.Ask("Disk Not ready. Close drive door", kTitle, Buttons::kOkCancel) ==
-          Answer::kOk)
+          Answer::kOk) {
+        composer.DropScript();  // the next try writes all of it
         continue;
+      }
+      composer.GiveUpFiles();
       return false;
     }
+    composer.GiveUpFiles();
     dialogs.Message(composer.FailureText(number, detail), kTitle);
     return false;
   }

@@ -68,10 +68,10 @@ void SetVolumeMap(const ChartRequest& request, bool lineChart, bool logarithmicP
   map.VolMean *= lineChart ? 3 : request.VolHeight;
   if (map.VolMean <= 10) map.VolMean = 10;
   const double height = RoundHalfEven(map.VolBottom - map.VolTop * 1.03);
-  map.VolPerY = Divide(map.VolMean - map.VolBase, height);
+  map.VolPerY = CSng(Divide(map.VolMean - map.VolBase, height));
   // A mean that is no larger than the least volume gives no scale; the largest then stands at
   // the top.
-  if (!(map.VolPerY > 0)) map.VolPerY = Divide(map.VolPeak - map.VolBase, height);
+  if (!(map.VolPerY > 0)) map.VolPerY = CSng(Divide(map.VolPeak - map.VolBase, height));
 }
 
 void DrawVolumePanel(const ChartCanvas& canvas) {

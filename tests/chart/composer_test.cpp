@@ -264,6 +264,16 @@ TEST(ComposerTest, OutsideBarSetsAStopThatShowsOnTheLastBar) {
   EXPECT_TRUE(found);
 }
 
+TEST(ComposerTest, BarWithHigh0TakesNoPartInOutsideBars) {
+  ComposerFixture f;
+  f.request.OutsideMarks = true;
+  f.Day("20240312", 10, 10.5f, 9.5f, 10);
+  f.Day("20240313", 0, 0, 0, 0);
+  f.Day("20240314", 10, 11, 9, 10);  // outside the bar before the hole
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("H,46,104,46,399,28"));
+}
+
 TEST(ComposerTest, BrokenStopIsToldOnlyWhereTheLastBarBreaksIt) {
   ComposerFixture f;
   f.request.OutsideMarks = true;
@@ -657,6 +667,48 @@ TEST(ComposerFailureTest, DiskNotReadyIsTriedAgainAsLongAsTheUserWants) {
   EXPECT_FALSE(f.Compose());
   EXPECT_EQ(f.dialogs.said.size(), 3u);
   EXPECT_EQ(f.dialogs.said[0].text, "Disk Not ready. Close drive door");
+}
+
+TEST(ComposerFailureTest, SecondTryAfterTheDiskWasNotReadyWritesTheScriptOnce) {
+  ComposerFixture f;
+  f.Day("20240315", 10, 11, 9, 10);
+  f.chart.OscPanel = 1;
+  ASSERT_TRUE(f.Compose());
+  f.chart.OscPanel = 2;  // goes on behind the first
+  ASSERT_TRUE(f.Compose());
+  const std::string once = f.script.text();
+
+  ComposerFixture g;
+  g.Day("20240315", 10, 11, 9, 10);
+  g.chart.OscPanel = 1;
+  ASSERT_TRUE(g.Compose());
+  struct Slow : test::RecordingSurface {
+    using RecordingSurface::RecordingSurface;
+    int left = 0;
+    void Line(double a, double b, double c, double d, Colour e) override {
+      if (--left == 0) throw RunTimeError(kDiskNotReady);
+      RecordingSurface::Line(a, b, c, d, e);
+    }
+  };
+  Slow slow(638, 452);
+  g.dialogs.answers = {Answer::kOk};
+  g.chart.OscPanel = 2;
+  slow.left = 1;
+  ChartServices services{g.home.files(), g.dialogs, g.paths, g.fonts, g.colours,
+                         slow,           nullptr,   &g.script, {}};
+  EXPECT_TRUE(ComposeChart(services, g.request, g.chart));
+  EXPECT_EQ(g.dialogs.said.size(), 1u);
+  EXPECT_EQ(g.script.text(), once);
+}
+
+TEST(ComposerFailureTest, ScriptThatCanNotBeWrittenHidesNoMessage) {
+  ComposerFixture f;
+  f.home.Put("drive_c/korawin/data/TCht.Tmp/x", "");  // a folder in its place
+  ChartScript file(f.home.files(), "c:\\korawin\\data\\TCht.Tmp");
+  f.services.script = &file;
+  EXPECT_FALSE(f.Compose());
+  ASSERT_EQ(f.dialogs.said.size(), 1u);
+  EXPECT_EQ(f.dialogs.said[0].text, "No Data for TEST.WDT");
 }
 
 TEST(ComposerFailureTest, RefusedFontIsNamedInUpperCase) {
