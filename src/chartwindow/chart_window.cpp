@@ -148,9 +148,9 @@ bool ChartWindow::StepChart() {
     HideFrame();
   }
   s.PFBoxSize = 0;
-  if (!s.OscShown) LayOut(false);
   if (!Move(s.ChartDirection == 1 ? 1 : -1, s.ChartListNo == kFullList && s.ICFilterOn))
-    return false;
+    return false;  // what stands on the window stays
+  if (!s.OscShown) LayOut(false);
   if (s.DateLimitOn) TakeChosenLimit();
   return DrawChart();
 }
@@ -168,7 +168,7 @@ bool ChartWindow::Refresh() {
 
 bool ChartWindow::Resized() {
   ForgetCross();
-  if (Loading || !HasChart()) return false;
+  if (Loading || (!HasChart() && !ChartFromFile)) return false;
   if (ChartFromFile) {
     LayOut(false);
     return ShowSavedChart(services_.files, services_.dialogs, services_.price,
@@ -366,7 +366,10 @@ bool ChartWindow::Compose(const ChartRequest& request) {
   script_.emplace(services_.files, ScriptPath());
   const bool drawn = ComposeChart(Services(services_.price, &services_.panel, &*script_), Request,
                                   Chart);
-  if (!drawn) Chart.TwoCharts = false;
+  if (!drawn) {
+    Chart.TwoCharts = false;
+    s.MultiOscOn = 0;
+  }
   s.SplitScreen = Chart.TwoCharts;
   if (!s.SplitScreen) Chart.ChartSlot = 0;
   if (second || !drawn) Chart.OscPanel = 0;
@@ -489,6 +492,7 @@ void ChartWindow::PickOscillator(std::string_view code, bool slow) {
   const auto never = [&](bool hindered) { return hindered || s.ChartStyle == 'P'; };
   if (code == "PARA" || code == "PARAV") {
     if (never(false)) return;
+    if (code == "PARAV") CancelChartTools();
     s.OscCode = code;
     LayOut(false);
     if (!Compose()) return;
@@ -615,7 +619,12 @@ void ChartWindow::StartSplitScreen() {
 
 void ChartWindow::DropSecondChart() {
   CancelChartTools();
-  state().SplitScreen = false;
+  EndPair();
+}
+
+void ChartWindow::EndPair() {
+  ChartState& s = state();
+  s.SplitScreen = s.SplitShown = s.Superimposed = false;
   Chart.TwoCharts = false;
   Chart.ChartSlot = 0;
 }
@@ -675,6 +684,7 @@ void ChartWindow::ShowSaved(const std::string& path) {
     services_.dialogs.Message("File extension must be .cht", "Saved Charts");
     return;
   }
+  EndPair();
   LayOut(false);
   state().OscCode.clear();
   SavedChartFile = path;
@@ -752,7 +762,6 @@ void ChartWindow::StartNewChart() {
   if (Chart.OscPanel > 3) s.MultiOscOn = 0;
   CancelChartTools();
   s.SuppressScript = false;
-  s.SplitScreen = false;
   EmptyDrawnLines();
   if (superimposing) services_.price.Cls();
   services_.price.SetAutoRedraw(false);
@@ -820,7 +829,7 @@ void ChartWindow::MoveTo(double x, double y, std::int32_t column) {
     ClearStatusBar();
     return;
   }
-  const std::int16_t type = services_.current.Rec.RecType;
+  const std::int16_t type = Request.Name.RecType;
   if (Request.ChartStyle == 'P') {
     view_.Panels[3] = Format(PFPixelToPrice(Chart, Boxes, y), ReadoutFormat(type));
     return;

@@ -211,6 +211,7 @@ class ChartWindow {
   Composition Chart;
 
  private:
+  void EndPair();
   std::string ScriptPath() const;
   bool Move(int step, bool filtered);
   bool FindRecord(int step, bool filtered);

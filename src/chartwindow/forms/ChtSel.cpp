@@ -9,10 +9,12 @@
 #include <QPushButton>
 #include <QScrollBar>
 #include <cmath>
+#include <utility>
 
 #include "chartwindow/forms/ChtOptions.h"
 #include "lists/forms/IndClass.h"
 #include "lists/forms/Search.h"
+
 
 namespace kora {
 namespace {
@@ -285,6 +287,9 @@ bool ChtSel::FieldEnter(QObject* field) {
 }
 
 bool ChtSel::FieldMouse(QObject* field, QEvent::Type type) {
+  // The release that ends a double click is no click of its own.
+  if (type == QEvent::MouseButtonRelease && std::exchange(doubleClicked_, false)) return true;
+  if (type == QEvent::MouseButtonDblClick) doubleClicked_ = true;
   if (type == QEvent::MouseButtonRelease && static_cast<QWidget*>(field)->isEnabled()) {
     if (field == text6_) ClickFinishDate();
     else if (field == text7_) FieldEnter(text7_);

@@ -31,6 +31,7 @@ class ChtSel : public SelectionForm {
   QLineEdit *text6_, *text7_, *text8_;
   QComboBox *combo2_, *combo3_;
   QCheckBox *oAve1_, *oAve2_, *check16_;
+  bool doubleClicked_ = false;
   QPushButton *command1_, *command6_, *command7_;
 };
 

@@ -402,6 +402,11 @@ void Chts::Refresh() {
   Do([this] { window_.Refresh(); });
 }
 
+void Chts::DropSecondChart() {
+  Do([this] { window_.DropSecondChart(); });
+  Refresh();
+}
+
 QSizeF Chts::ChartSize() const {
   const Surface& price = picture1_->surface();
   const Surface& panel = picture2_->surface();

@@ -62,6 +62,8 @@ class Chts : public QMainWindow {
   // the current one once more.
   void Command2();
   void Refresh();
+  // The second chart of a pair was not chosen: the first is drawn alone again.
+  void DropSecondChart();
   // After the data folder changed.
   void RefreshTitle();
   // Size of the chart on show in its units, the oscillator below it included.

@@ -1,5 +1,6 @@
 #include "chartwindow/forms/selection_form.h"
 
+#include <QMouseEvent>
 #include <QComboBox>
 #include <QGridLayout>
 #include <QKeyEvent>
@@ -161,6 +162,8 @@ void SelectionForm::FocusCode() {
 }
 
 void SelectionForm::ShowChart() {
+  // A mnemonic presses the button without taking the focus from the spacing.
+  if (text3_->hasFocus()) services_.selection.LeaveSpacing();
   if (!services_.selection.OK()) return;
   // Closing this form may delete it: what is still called must not live in it.
   const ChtSelServices services = services_;
@@ -198,7 +201,8 @@ bool SelectionForm::eventFilter(QObject* object, QEvent* event) {
   } else if (object == text3_ && event->type() == QEvent::FocusOut) {
     services_.selection.LeaveSpacing();
     Refresh();
-  } else if (FieldMouse(object, event->type())) {
+  } else if (const auto* mouse = dynamic_cast<QMouseEvent*>(event);
+             mouse && mouse->button() == Qt::LeftButton && FieldMouse(object, event->type())) {
     return true;
   }
   return QDialog::eventFilter(object, event);

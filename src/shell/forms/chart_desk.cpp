@@ -250,19 +250,28 @@ void ChartDesk::OpenSelection() {
     selectionForm_->activateWindow();
     return;
   }
+  // One form at a time works on the selection.
+  if (secondForm_) delete secondForm_;
   selectionForm_ = Show(new ChtSel(SelectionServices(), over_));
 }
 
 void ChartDesk::OpenSecondChart() {
+  if (secondForm_) {
+    secondForm_->activateWindow();
+    return;
+  }
   ChtSelServices services = SelectionServices();
   // Leaving it leaves the first chart alone: the next one has the surface to itself.
   services.closed = {};
-  services.secondDropped = [this] {
-    if (chts_) chts_->window().DropSecondChart();
+  services.secondDropped = [this, index = session_.charts.ChartIndex,
+                            current = session_.current] {
+    session_.charts.ChartIndex = index;
+    session_.current = current;
+    if (chts_) chts_->DropSecondChart();
   };
-  auto* form = new Chart2(std::move(services), Over());
-  form->setAttribute(Qt::WA_DeleteOnClose);
-  form->show();
+  secondForm_ = new Chart2(std::move(services), Over());
+  secondForm_->setAttribute(Qt::WA_DeleteOnClose);
+  secondForm_->show();
 }
 
 bool ChartDesk::OpenFinDate() {

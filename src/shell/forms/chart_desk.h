@@ -62,7 +62,7 @@ class ChartDesk {
   std::function<void()> readSettings_, menusBack_;
   ChartSelection selection_;
   QPointer<Chts> chts_;
-  QPointer<QDialog> selectionForm_;
+  QPointer<QDialog> selectionForm_, secondForm_;
   PrintChoice printChoice_;
   QtPrinter printer_;
   float boxValue_ = 0;  // of the point-and-figure chart, as its settings box left it
