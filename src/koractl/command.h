@@ -42,5 +42,7 @@ void AddScale(CLI::App& app, CommandLine& line);
 void AddChart(CLI::App& app, CommandLine& line);
 void AddPlay(CLI::App& app, CommandLine& line);
 void AddImport(CLI::App& app, CommandLine& line);
+void AddDownloads(CLI::App& app, CommandLine& line);
+void AddUpdate(CLI::App& app, CommandLine& line);
 
 }  // namespace kora
