@@ -44,5 +44,6 @@ void AddPlay(CLI::App& app, CommandLine& line);
 void AddImport(CLI::App& app, CommandLine& line);
 void AddDownloads(CLI::App& app, CommandLine& line);
 void AddUpdate(CLI::App& app, CommandLine& line);
+void AddMaster(CLI::App& app, CommandLine& line);
 
 }  // namespace kora

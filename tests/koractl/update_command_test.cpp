@@ -214,3 +214,63 @@ TEST_F(UpdateCommand, FortyRealDaysComeOutAsAnImportOfTheSameRows) {
     }
   }
 }
+
+TEST_F(UpdateCommand, MakesTheMasterList) {
+  ASSERT_EQ(Run({"init"}).code, 0);
+  home.Put("list.csv", "Code,Type,Category,Class,Name,Details\nORE,4,1,121,Ore Ltd,\nBHP,4,1,,Big,\n");
+  EXPECT_EQ(Out({"master", home.path() + "/list.csv"}), "2 securities\n");
+  EXPECT_EQ(home.Get("kora/drive_c/korawin/KoraName.Mas").size(), 124u);
+  home.Put("list.csv", "../X,4,1,121,Ore Ltd,\n");
+  const auto before = AllFiles();
+  const ProgramResult result = Run({"master", home.path() + "/list.csv"});
+  EXPECT_EQ(result.code, 1);
+  EXPECT_NE(result.err.find("list.csv line 1: "), std::string::npos) << result.err;
+  EXPECT_EQ(AllFiles(), before);
+}
+
+// A process that is killed in the middle leaves whole records and its file on the list, and
+// the next run brings what an undisturbed one does.
+TEST_F(UpdateCommand, TakesUpAgainAfterAKilledProcess) {
+  constexpr int kSecurities = 1500;
+  ASSERT_EQ(Run({"init"}).code, 0);
+  std::string history, day;
+  const auto code = [](int n) { return "C" + std::to_string(1000 + n); };
+  for (int n = 0; n < kSecurities; ++n) {
+    const std::string tail = ",1,2,1,1." + std::to_string(n) + "," + std::to_string(n) + ",";
+    if (n % 3 != 2)  // each third is new
+      history += code(n) + ",19980911" + tail + "0\n" + code(n) + ",19980914" + tail + "0\n";
+    day += code(n) + ",19980915" + tail + (n % 5 == 0 ? "77" : "0") + "\r\n";
+  }
+  home.Put("history.csv", history);
+  ASSERT_EQ(Run({"import", home.path() + "/history.csv"}).code, 0);
+  Download("15SEP98.d", day);
+  const std::string root = home.path() + "/";
+  fs::copy(root + "kora", root + "whole", fs::copy_options::recursive);
+  const Words update{"--set", "Download.InternetDLfmt=DDMMMYY.D", "update"};
+  ASSERT_EQ(Run(update, "whole").code, 0);
+
+  const std::string data = "kora/drive_c/korawin/data/";
+  const std::string middle = root + data + code(kSecurities / 2) + ".WDT";
+  Words words{"--home", root + "kora"};
+  words.insert(words.end(), update.begin(), update.end());
+  const std::uintmax_t size = fs::file_size(middle);
+  std::error_code ignored;
+  const ProgramResult cut = RunProgram(KORA_BIN_DIR "/koractl", words, {}, [&] {
+    return fs::file_size(middle, ignored) != size;
+  });
+  if (cut.code == 0) GTEST_SKIP() << "it was done before it could be killed";
+  ASSERT_EQ(cut.code, 128 + 9);
+  ASSERT_TRUE(Waits("15SEP98.d"));
+  for (const auto& e : fs::directory_iterator(root + data))
+    if (e.path().extension() == ".WDT") {
+      EXPECT_EQ(e.file_size() % 50, 0u) << e.path();
+    }
+  EXPECT_EQ(home.Get(data + "Names.dat").size() % 96, 0u);
+
+  const ProgramResult again = Run(update);
+  EXPECT_EQ(again.code, 0) << again.err;
+  for (const auto& e : fs::directory_iterator(root + "whole/drive_c/korawin/data")) {
+    const std::string name = e.path().filename().string();
+    EXPECT_TRUE(home.Get(data + name) == home.Get("whole/drive_c/korawin/data/" + name)) << name;
+  }
+}
