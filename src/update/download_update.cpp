@@ -214,7 +214,8 @@ bool DayUpdate::UpdateFile() {
   names_ = ReadNames(run_.files, TargetPath_);
   for (size_t i = 0; i < names_.size(); ++i)
     places_.try_emplace(std::string(Trim(names_[i].Code.trimmed())), i);
-  for (const std::string& name : run_.files.List(TargetPath_))
+  // Not the sorted listing: thousands of names are wanted in no order.
+  for (const std::string& name : run_.files.io().List(run_.files.HostPath(TargetPath_)))
     if (std::string upper = UCase(name); upper.ends_with(".WDT"))
       priceFiles_.insert(std::move(upper));
   run_.current.NameCount = CInt(double(names_.size()));
