@@ -240,7 +240,7 @@ TEST_F(DownloadUpdate, ServiceOneLooksTheCodeUp) {
             UpdateEnd::kUpdated);
   // 10 rises, 4 falls on a total of 1.
   EXPECT_EQ(Shown("XAD"), "19980911 2 9; 19980914 1 9; 19980915 7 50");
-  EXPECT_EQ(PricesOf("XAD")[2].Open, 0);
+  EXPECT_EQ(float(PricesOf("XAD")[2].Open), 0);
   EXPECT_EQ(Shown("CLO"), "19980914 1 0; 19980915 1 0");
   EXPECT_EQ(Shown("ORE"), "19980914 1 0; 19980915 1 88");
 }
@@ -264,7 +264,7 @@ TEST_F(DownloadUpdate, AReplacedTotalRunsOnToTheEnd) {
                  Day("19980916", 0, 6, 1, 6)});
   ASSERT_EQ(Take("XAD,19980915,0,10,4,0,12,0\n,19980915,,,,,,\n"), UpdateEnd::kUpdated);
   EXPECT_EQ(Shown("XAD"), "19980911 2 0; 19980915 8 12; 19980916 13 0");  // 2+10-4, 8+6-1
-  EXPECT_EQ(PricesOf("XAD")[1].Open, 3);
+  EXPECT_EQ(float(PricesOf("XAD")[1].Open), 3);
 }
 
 // ---- No-trade pass
@@ -410,7 +410,7 @@ TEST_F(DownloadUpdate, TakesTwoHundredThousandLines) {
   ASSERT_EQ(Take(text), UpdateEnd::kUpdated);
   EXPECT_EQ(NamesOf().size(), 10u);
   EXPECT_EQ(PricesOf("C3").size(), 20000u);
-  EXPECT_EQ(PricesOf("C3").back().Volume, 199993);
+  EXPECT_EQ(int(PricesOf("C3").back().Volume), 199993);
 }
 
 TEST_F(DownloadUpdate, APriceFileDoesNotGrowBeyondWhatChartsCanNumber) {
@@ -505,12 +505,12 @@ TEST_F(WholeMarket, EachFileGoesToItsOwnFolder) {
   };
   EXPECT_EQ(only("sum").Id.raw(), "A");
   EXPECT_EQ(only("idx").Id.raw(), "X");
-  EXPECT_EQ(only("idx").RecType, kIndex);
+  EXPECT_EQ(int(only("idx").RecType), int(kIndex));
   EXPECT_EQ(only("ovs").Id.raw(), "V");
   EXPECT_EQ(only("sfe").Id.raw(), "F");
   EXPECT_EQ(only("opt").Id.raw(), "P");
   EXPECT_EQ(only("opt").OtherDetails.trimmed(), "0P25/9/98");  // 15 September and 10 days
-  EXPECT_EQ(only("opt").RecType, kShare);
+  EXPECT_EQ(int(only("opt").RecType), int(kShare));
   std::vector<int> categories;
   for (const NameRec& rec : NamesOf(dosOf("asx"))) categories.push_back(rec.Category);
   EXPECT_EQ(categories, (std::vector<int>{86, 87, 84, 88, 1}));
@@ -524,7 +524,7 @@ TEST_F(WholeMarket, EachFileGoesToItsOwnFolder) {
 TEST_F(WholeMarket, SixCharactersInTheExtraStocksAreOfCategoryOne) {
   Download("15SEP98.das", "ABCWXX,19980915,1,1,1,1,1,0\n");
   ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
-  EXPECT_EQ(NamesOf(dosOf("sum")).at(0).Category, 1);
+  EXPECT_EQ(int(NamesOf(dosOf("sum")).at(0).Category), 1);
 }
 
 TEST_F(WholeMarket, PassesOnOverAFileWithoutData) {
