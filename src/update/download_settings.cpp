@@ -120,8 +120,8 @@ bool SaveWmPaths(const Files& files, const std::string& systemPath,
 }
 
 std::array<std::string, 6> WizardFolders(const WmPaths& lines) {
-  return {lines[kWmAsx],     lines[kWmIndices], lines[kWmOverseas],
-          lines[kWmFutures], lines[kWmOptions], lines[kWmSum]};
+  return {lines[kWmAsx],      lines[kWmIndices], lines[kWmFutures],
+          lines[kWmOverseas], lines[kWmOptions], lines[kWmSum]};
 }
 
 bool SaveWizardFolders(const Files& files, const std::string& systemPath,
@@ -133,8 +133,8 @@ bool SaveWizardFolders(const Files& files, const std::string& systemPath,
   WmPaths lines = ReadWmPaths(files, systemPath);
   lines[kWmAsx] = boxes[0];
   lines[kWmIndices] = boxes[1];
-  lines[kWmFutures] = boxes[3];
-  lines[kWmOverseas] = boxes[2];
+  lines[kWmFutures] = boxes[2];
+  lines[kWmOverseas] = boxes[3];
   lines[kWmOptions] = boxes[4];
   lines[kWmSum] = boxes[0];
   WriteWmPaths(files, systemPath, lines);

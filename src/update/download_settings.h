@@ -45,7 +45,7 @@ std::string WmChosenFolder(const WmPaths& lines);
 bool SaveWmPaths(const Files& files, const std::string& systemPath,
                  std::span<const std::string, 6> folders, int chosen, Dialogs& dialogs);
 
-// The folders of the form `DLWizard` in the order of its boxes: ASX, IDX, OVS, SFE, OPT and the
+// The folders of the form `DLWizard` in the order of its boxes: ASX, IDX, SFE, OVS, OPT and the
 // sixth, which shows line 7.
 std::array<std::string, 6> WizardFolders(const WmPaths& lines);
 // Saves them as the form does: line 7 takes box 0, line 6 stays. As SaveWmPaths otherwise.

@@ -52,14 +52,14 @@ TEST_F(DownloadSettingsTest, AllFoldersMustBeEntered) {
   EXPECT_FALSE(home.Exists(kHostSystem + "WMPaths.lst"));
 }
 
-TEST_F(DownloadSettingsTest, TheWizardHasItsOwnOrder) {
+TEST_F(DownloadSettingsTest, TheWizardRepeatsItsFirstBoxAndKeepsTheChoice) {
   home.Put(kHostSystem + "WMPaths.lst", "a\r\nb\r\nc\r\nd\r\ne\r\n4\r\ng\r\n");
   EXPECT_EQ(WizardFolders(ReadWmPaths(home.files(), kSystem)),
-            (std::array<std::string, 6>{"a", "b", "d", "c", "e", "g"}));
+            (std::array<std::string, 6>{"a", "b", "c", "d", "e", "g"}));
   ASSERT_TRUE(SaveWizardFolders(home.files(), kSystem, kFolders, dialogs));
   EXPECT_EQ(LastSaid(), "Directory c:\\6\\ does not exist. Create folder?");
   EXPECT_EQ(home.Get(kHostSystem + "WMPaths.lst"),
-            "c:\\1\\\r\nc:\\2\\\r\nc:\\4\\\r\nc:\\3\\\r\nc:\\5\\\r\n4\r\nc:\\1\\\r\n");
+            "c:\\1\\\r\nc:\\2\\\r\nc:\\3\\\r\nc:\\4\\\r\nc:\\5\\\r\n4\r\nc:\\1\\\r\n");
 }
 
 TEST_F(DownloadSettingsTest, KeepsTheTicksOfTheWizard) {
