@@ -1,6 +1,7 @@
 #include "update/download_update.h"
 
 #include "base/record_file.h"
+#include "tests/support/mutate.h"
 #include "update/price_write.h"
 #include "tests/update/update_fixture.h"
 
@@ -714,4 +715,77 @@ TEST_F(CutRun, AFullDiskIsToldAndTheFileStaysListed) {
   EXPECT_EQ(LastTitle(), "Error");
   EXPECT_EQ(LastSaid(), "There is an unexpected error - Disk full");
   EXPECT_TRUE(Waits("15SEP98.d"));
+}
+
+// The file is off the list once its lines are written; flat records that were not reached stay
+// away.
+TEST_F(CutRun, ARunThatDiesAmongTheFlatRecordsLeavesWholeFiles) {
+  settings.download.DataService = 5;
+  const std::string text = "ORE,19980915,1,2,1,1,11,0\nORE,19980915,1,2,1,1,11,0\n";
+  int renamed = 0;
+  for (int at = 1;; ++at) {
+    LayDown();
+    Download("15SEP98.d", text);
+    const auto before = Everything();
+    current = {};
+    io.Reset(at);
+    io.lasting = true;
+    DownloadEntries waiting{"15SEP98.d"};
+    UpdateOneDay(Run(), waiting, 0);
+    const bool cut = io.calls >= at;
+    io.Reset();
+    if (!cut) break;
+    EXPECT_NE(Waits("15SEP98.d"), Waits("15SEP98.dX")) << at;
+    if (Waits("15SEP98.dX")) {
+      ++renamed;
+      EXPECT_EQ(PricesOf("ORE").size(), 4u);
+    }
+    for (const auto& [name, bytes] : Everything()) {
+      if (!name.ends_with(".WDT")) continue;
+      EXPECT_EQ(bytes.size() % 50, 0u) << name << " at " << at;
+      EXPECT_EQ(bytes.substr(0, before.at(name).size()), before.at(name)) << name << " at " << at;
+    }
+  }
+  EXPECT_EQ(renamed, 1);  // ZAP alone did not trade
+}
+
+// ---- Damaged files
+
+// Whatever stands in a file: it is taken in or refused with a message, and the store stays one
+// of whole records.
+TEST_F(DownloadUpdate, DamagedFilesNeverHarmTheStore) {
+  const std::vector<std::string> corpus{
+      kBothDays, "ORE,19980916,1,2,0.5,1.5,100,50\nPRN,19980916,3,4,2,3,200,0\n",
+      "NEW,19981231,1,1,1,1,1,0\r\n,19981231,,,,,,\r\nZAP,19981231,9,9,9,9,9,9\r\n"};
+  Names({Security("ORE"), Security("ZAP")});
+  int taken = 0, refused = 0;
+  Mutator(7).Run(corpus, 600, [&](const std::string& text) {
+    Prices("ORE", {Flat("19980911", 1, 1), Flat("19980914", 2, 2)});
+    Prices("ZAP", {Flat("19980915", 1, 1)});
+    Download("15SEP98.d", text);
+    dialogs.said.clear();
+    DownloadEntries waiting{"15SEP98.d"};
+    const UpdateEnd end = UpdateOneDay(Run(), waiting, 0);
+    if (end == UpdateEnd::kUpdated) {
+      ++taken;
+      EXPECT_FALSE(Waits("15SEP98.d"));
+    } else {
+      ++refused;
+      EXPECT_EQ(end, UpdateEnd::kAbandoned);
+      EXPECT_FALSE(dialogs.said.empty());
+      EXPECT_EQ(Shown("ORE"), "19980911 1 1; 19980914 2 2");
+    }
+    for (const auto& e : std::filesystem::directory_iterator(home.path() + "/" + kHostData)) {
+      const std::string name = e.path().filename().string();
+      const size_t record = name == "Names.dat" ? 96 : 50;
+      EXPECT_TRUE(name == "Names.dat" || name.ends_with(".WDT")) << name;
+      EXPECT_EQ(e.file_size() % record, 0u) << name;
+    }
+  });
+  EXPECT_GT(taken, 20);
+  EXPECT_GT(refused, 200);
+  // Nothing was written outside the data folder.
+  for (const auto& [name, bytes] : Everything())
+    EXPECT_TRUE(name.starts_with("korawin/data/") || name.starts_with("korawin/download/15SEP98.d"))
+        << name;
 }

@@ -54,6 +54,7 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   ss1_->setObjectName("SS1");
   ss1_->setHorizontalHeaderLabels({"ASX Code", "CAT.", "Name"});
   ss1_->horizontalHeader()->setStretchLastSection(true);
+  ss1_->setMinimumWidth(fontMetrics().averageCharWidth() * 55);
   ss1_->setSelectionBehavior(QAbstractItemView::SelectRows);
   list1_ = new QListWidget(this);
   list1_->setObjectName("List1");
@@ -64,8 +65,8 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   grid->addWidget(ss1_, 3, 0, 2, 1);
   grid->addWidget(list1_, 3, 1);
   grid->addWidget(add, 4, 1);
-  grid->setColumnStretch(0, 1);
-  grid->setColumnStretch(1, 1);
+  grid->setColumnStretch(0, 3);
+  grid->setColumnStretch(1, 2);
   connect(add, &QPushButton::clicked, this, [this] { AddChecked(); });
   connect(ss1_, &QTableWidget::itemChanged, this, [this] {
     if (!loading_) changed_ = true;
