@@ -151,6 +151,7 @@ void CrossHair::Flip() const {
     line.surface->Line(line.x1, line.y1, line.x2, line.y2, colour_);
     line.surface->SetDrawStyle(DrawStyle::kSolid);
     line.surface->SetDrawMode(DrawMode::kCopy);
+    if (Touched) Touched(*line.surface, line.x1, line.y1, line.x2, line.y2);
   }
 }
 

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -88,6 +89,10 @@ class CrossHair {
   void Forget() { lines_.clear(); }
 
   bool Drawn() const { return !lines_.empty(); }
+  // Called for each line as it is drawn or taken away, so that only there a picture is shown
+  // anew. May be empty.
+  std::function<void(const Surface&, double x1, double y1, double x2, double y2)> Touched;
+
   double GridX() const { return x_; }
   double GridY() const { return y_; }
 

@@ -82,6 +82,8 @@ OscPanel::OscPanel(OscHost& hostIn, double units)
     PanelTop = CInt(0.02 * height);
     PanelBottom = CInt(0.98 * height);
   }
+  host.PanelTop = PanelTop;
+  host.PanelBottom = PanelBottom;
   PanelRight = host.chart.ChartRight;
   PlotX = PanelLeft;
   pen.SetScriptY(host.PrintScale,

@@ -36,6 +36,8 @@ struct OscHost {
   double PanelOffsetY = 0;         // y of the panel on the script page when not in the chart window
   double PrintScale = 1;           // panel y is divided by it on its way to the script
 
+  std::int16_t PanelTop = 0, PanelBottom = 0;  // of the panel drawn last, for the pointer
+
   bool InChartWindow() const { return OscCaller == "CHTS"; }
   bool SecondPass() const { return chart.OscPanel == -1; }
   // The daily period for "A", otherwise its twin.

@@ -41,6 +41,7 @@ void AddBars(CLI::App& app, CommandLine& line);
 void AddScale(CLI::App& app, CommandLine& line);
 void AddChart(CLI::App& app, CommandLine& line);
 void AddPlay(CLI::App& app, CommandLine& line);
+void AddPrint(CLI::App& app, CommandLine& line);
 void AddImport(CLI::App& app, CommandLine& line);
 void AddDownloads(CLI::App& app, CommandLine& line);
 void AddUpdate(CLI::App& app, CommandLine& line);

@@ -14,7 +14,6 @@ namespace kora {
 namespace {
 
 constexpr std::string_view kLetters = "ABCDEFGHJKZ";  // no I
-constexpr std::string_view kUserSection = "KORA Charting System";
 
 char LetterOf(std::int16_t ChartListNo) {
   if (ChartListNo < kFirstChartList || ChartListNo > kResultList) throw RunTimeError(kBadCall);

@@ -12,6 +12,9 @@ namespace kora {
 // What a missing key reads as; every reader tests for it.
 inline constexpr std::string_view kUnknown = "unknown";
 
+// The section of the per-user store.
+inline constexpr std::string_view kUserSection = "KORA Charting System";
+
 // A sectioned key file:
 //
 //   [Section]

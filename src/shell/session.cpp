@@ -8,7 +8,6 @@ namespace kora {
 namespace {
 
 constexpr std::string_view kWindowsPath = "C:\\WINDOWS\\";
-constexpr std::string_view kUserSection = "KORA Charting System";
 
 }  // namespace
 

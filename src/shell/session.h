@@ -4,6 +4,7 @@
 #include <string_view>
 
 #include "base/files.h"
+#include "chart/chart_state.h"
 #include "platform/clock.h"
 #include "platform/dialogs.h"
 #include "platform/processes.h"
@@ -32,6 +33,7 @@ struct Session {
   ChartColours colours{};
   PrinterColours printer;
   CurrentName current;
+  ChartState charts;
 
   // Per-user values, empty when there is none.
   std::string UserSetting(std::string_view key) const;

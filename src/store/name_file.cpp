@@ -87,4 +87,21 @@ bool LocateCurrentCode(const Files& files, const std::string& dataPath, Dialogs&
   return true;
 }
 
+void RewriteCurrentName(const Files& files, const std::string& dataPath, CurrentName& current,
+                        const std::function<void(NameRec&)>& change) {
+  if (current.NameRecNo < 1) throw RunTimeError(kBadRecordNumber);
+  NameFile names(files, NameFilePath(dataPath), OpenMode::kReadWrite);
+  std::int16_t number = current.NameRecNo;
+  NameRec record{};
+  if (number <= names.count()) record = names.Read(number);
+  if (record.Code != current.Rec.Code) {
+    number = FindCode(names, current.Rec.Code.raw(), record);
+    if (number == 0) throw RunTimeError(kBadRecordNumber);
+  }
+  change(record);
+  names.Write(number, record);
+  current.NameRecNo = number;
+  current.Rec = record;
+}
+
 }  // namespace kora

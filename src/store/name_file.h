@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <span>
 #include <string>
@@ -52,6 +53,13 @@ struct CurrentName {
 // Also returns whether it was found. Errors 53, 75, 76 when Names.dat can't be opened.
 bool LocateCurrentCode(const Files& files, const std::string& dataPath, Dialogs& dialogs,
                        CurrentName& current);
+
+// Writes the current security's record in its place, with what `change` does to it; the rest
+// stays as the file has it now, and current.Rec becomes what was written. A record that has
+// moved meanwhile is found by its code. Error 63 when the security is no longer in the file, or
+// none is current; 53, 75, 76 when the file can't be opened.
+void RewriteCurrentName(const Files& files, const std::string& dataPath, CurrentName& current,
+                        const std::function<void(NameRec&)>& change);
 
 enum class NameSort {
   kCategory,  // Category "000", RecType, Code: the order after a save

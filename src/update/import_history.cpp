@@ -19,7 +19,7 @@
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "platform/dialogs.h"
-#include "store/list_rec.h"
+#include "lists/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_rec.h"
 
@@ -406,8 +406,8 @@ void StageLists(const Files& files, const std::string& dataPath,
   std::map<std::string_view, std::int16_t> numbers;
   for (size_t i = 0; i < names.size(); ++i)
     numbers.try_emplace(names[i].Code.raw(), std::int16_t(i + 1));
-  for (const char letter : kListLetters) {
-    const std::string path = ListFilePath(dataPath, letter);
+  for (std::int16_t list = kFirstChartList; list <= kResultList; ++list) {
+    const std::string path = ListFilePath(dataPath, list);
     const auto old = ReadRecords<ListRec>(files, path);
     std::vector<ListRec> fresh;
     for (ListRec rec : old) {

@@ -40,7 +40,7 @@ TEST(RecordFileTest, RecordsAreNumberedFromOne) {
   TempHome home;
   home.Put("drive_c/p.dat", std::string("abc\x01\x02" "def\x03\x04", 10));
   const PairFile file(home.files(), kPath);
-  EXPECT_EQ(file.Read(1).value, 0x0201);  // little-endian
+  EXPECT_EQ(int(file.Read(1).value), 0x0201);  // little-endian
   EXPECT_EQ(std::string_view(file.Read(2).name, 3), "def");
 }
 
@@ -130,7 +130,7 @@ TEST(RecordFileTest, FileOfGigabytesIsNotReadIntoMemory) {
   const std::string host = home.path() + "/drive_c/p.dat";
   ASSERT_EQ(::truncate(host.c_str(), 5'000'000'000), 0);  // a hole, no blocks on the disk
   EXPECT_EQ(ErrorOf([&] { PairFile(home.files(), kPath).ReadAll(); }), 7);
-  EXPECT_EQ(PairFile(home.files(), kPath).Read(1'000'000'000).value, 0);
+  EXPECT_EQ(int(PairFile(home.files(), kPath).Read(1'000'000'000).value), 0);
   ASSERT_EQ(::truncate(host.c_str(), 5ll * 0x80000000), 0);
   EXPECT_EQ(ErrorOf([&] { PairFile(home.files(), kPath); }), 6);  // more than 31 bits of records
 }

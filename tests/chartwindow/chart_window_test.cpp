@@ -2,6 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
+#include "base/dates.h"
+#include "lists/chart_list.h"
 #include "tests/support/recording_surface.h"
 #include "tests/support/records.h"
 #include "tests/support/scripted_dialogs.h"
@@ -51,10 +55,16 @@ class ChartWindowTest : public testing::Test {
       window_ = std::make_unique<ChartWindow>(ChartWindowServices{.files = home.files(),
                                                                   .dialogs = dialogs,
                                                                   .settings = settings,
+                                                                  .ini = ini,
+                                                                  .user = user,
                                                                   .colours = colours,
                                                                   .current = current,
-                                                                  .price = surface});
-      window_->Loading = false;
+                                                                  .state = state,
+                                                                  .price = surface,
+                                                                  .panel = panel});
+      window_->Load();
+      surface.ops.clear();
+      panel.ops.clear();
     }
     return *window_;
   }
@@ -66,7 +76,10 @@ class ChartWindowTest : public testing::Test {
   Settings settings;
   ChartColours colours{};
   CurrentName current;
-  RecordingSurface surface{638, 452};
+  SettingsFile ini{home.files(), "C:\\WINDOWS\\Kora.ini"};
+  SettingsFile user{home.files(), "C:\\WINDOWS\\KoraUser.ini"};
+  ChartState state;
+  RecordingSurface surface{638, 452}, panel{638, 144};
 
  private:
   std::unique_ptr<ChartWindow> window_;
@@ -75,7 +88,7 @@ class ChartWindowTest : public testing::Test {
 TEST_F(ChartWindowTest, TheFirstChartIsTheFirstSecurityOfTheNameFile) {
   PutThree();
   EXPECT_TRUE(window().NextChart());
-  EXPECT_EQ(window().ChartIndex, 1);
+  EXPECT_EQ(state.ChartIndex, 1);
   EXPECT_EQ(shown(), "AAA.WDT");
   EXPECT_EQ(current.NameCount, 3);
   EXPECT_EQ(current.NameRecNo, 1);
@@ -91,19 +104,19 @@ TEST_F(ChartWindowTest, ForwardFromTheLastChartGoesToRecordOne) {
     EXPECT_TRUE(window().NextChart());
     EXPECT_EQ(shown(), expected);
   }
-  EXPECT_EQ(window().ChartIndex, 1);
+  EXPECT_EQ(state.ChartIndex, 1);
 }
 
 TEST_F(ChartWindowTest, BackwardFromRecordOneGoesToTheLast) {
   PutThree();
   window().NextChart();
-  window().ChartDirection = 0;
+  state.ChartDirection = 0;
   EXPECT_TRUE(window().StepChart());
   EXPECT_EQ(shown(), "CCC.WDT");
-  EXPECT_EQ(window().ChartIndex, 3);
+  EXPECT_EQ(state.ChartIndex, 3);
   EXPECT_TRUE(window().StepChart());
   EXPECT_EQ(shown(), "BBB.WDT");
-  window().ChartDirection = 1;
+  state.ChartDirection = 1;
   EXPECT_TRUE(window().StepChart());
   EXPECT_EQ(shown(), "CCC.WDT");
 }
@@ -112,7 +125,7 @@ TEST_F(ChartWindowTest, ARedrawStaysOnTheChart) {
   PutThree();
   window().NextChart();
   EXPECT_TRUE(window().Redraw());
-  EXPECT_EQ(window().ChartIndex, 1);
+  EXPECT_EQ(state.ChartIndex, 1);
   EXPECT_EQ(shown(), "AAA.WDT");
   window().NextChart();
   EXPECT_TRUE(window().Redraw());
@@ -122,7 +135,7 @@ TEST_F(ChartWindowTest, ARedrawStaysOnTheChart) {
 TEST_F(ChartWindowTest, ThereIsNothingToRedrawBeforeTheFirstChart) {
   PutThree();
   EXPECT_FALSE(window().Redraw());
-  EXPECT_EQ(window().ChartIndex, 0);
+  EXPECT_EQ(state.ChartIndex, 0);
   EXPECT_TRUE(surface.ops.empty());
 }
 
@@ -132,33 +145,33 @@ TEST_F(ChartWindowTest, NothingIsComposedWhileLoading) {
   EXPECT_FALSE(window().NextChart());
   EXPECT_FALSE(window().StepChart());
   EXPECT_FALSE(window().DrawChart());
-  EXPECT_EQ(window().ChartIndex, 0);
+  EXPECT_EQ(state.ChartIndex, 0);
   EXPECT_TRUE(surface.ops.empty());
 }
 
 TEST_F(ChartWindowTest, DataWithoutBarsComesUpAsALineAndTheStyleStays) {
   PutNames({Security("AAA"), Security("CLO", 1, kCloseOnly), Security("CCC")});
   window().NextChart();
-  EXPECT_EQ(window().Request.ChartStyle, 'B');
+  EXPECT_EQ(state.ChartStyle, 'B');
   window().NextChart();
-  EXPECT_EQ(window().Request.ChartStyle, 'L');
+  EXPECT_EQ(state.ChartStyle, 'L');
   window().NextChart();
-  EXPECT_EQ(window().Request.ChartStyle, 'L');
+  EXPECT_EQ(state.ChartStyle, 'L');
   EXPECT_EQ(shown(), "CCC.WDT");
 }
 
 TEST_F(ChartWindowTest, EveryTypeWithoutBarsTurnsCandlesIntoALine) {
   for (const std::int16_t type : {kCloseVolume, kCloseOnly, kAdvanceDecline}) {
     PutNames({Security("CLO", 1, type)});
-    window().Request.ChartStyle = 'C';
+    state.ChartStyle = 'C';
     window().NextChart();
-    EXPECT_EQ(window().Request.ChartStyle, 'L') << type;
+    EXPECT_EQ(state.ChartStyle, 'L') << type;
   }
   for (const std::int16_t type : {kShare, kIndex}) {
     PutNames({Security("BAR", 1, type)});
-    window().Request.ChartStyle = 'C';
+    state.ChartStyle = 'C';
     window().NextChart();
-    EXPECT_EQ(window().Request.ChartStyle, 'C') << type;
+    EXPECT_EQ(state.ChartStyle, 'C') << type;
   }
 }
 
@@ -169,7 +182,7 @@ TEST_F(ChartWindowTest, AMissingNameFileIsToldAndNothingIsShown) {
   EXPECT_EQ(dialogs.said[0].text.find(
                 "There is a file access problem. Check directory paths option."), 0u);
   EXPECT_NE(dialogs.said[0].text.find("c:\\korawin\\data\\Names.dat"), std::string::npos);
-  EXPECT_EQ(window().ChartIndex, 0);
+  EXPECT_EQ(state.ChartIndex, 0);
 }
 
 TEST_F(ChartWindowTest, AnEmptyNameFileIsTold) {
@@ -180,7 +193,7 @@ TEST_F(ChartWindowTest, AnEmptyNameFileIsTold) {
     EXPECT_FALSE(window().NextChart());
     ASSERT_EQ(dialogs.said.size(), 1u);
     EXPECT_EQ(dialogs.said[0].text, " There are no records in Names.Dat for this folder.");
-    EXPECT_EQ(window().ChartIndex, 0);
+    EXPECT_EQ(state.ChartIndex, 0);
   }
 }
 
@@ -223,17 +236,925 @@ TEST_F(ChartWindowTest, ANameFileThatShrankWhileTheWindowStoodWrapsToItsStart) {
 TEST_F(ChartWindowTest, DrawnLinesAreEmptiedAtEachNewChartUnlessTwoShareTheSurface) {
   PutThree();
   home.Put("drive_c/korawin/data/ChtLns.Tmp", "H,1,2,3,4,5\r\n");
-  window().SplitScreen = true;
+  state.SplitScreen = true;
   window().NextChart();
   EXPECT_NE(home.Get("drive_c/korawin/data/ChtLns.Tmp"), "");
-  window().SplitScreen = false;
+  state.SplitScreen = false;
   window().NextChart();
   EXPECT_TRUE(home.Exists("drive_c/korawin/data/ChtLns.Tmp"));
   EXPECT_EQ(home.Get("drive_c/korawin/data/ChtLns.Tmp"), "");
 }
 
+// ---- Lists
+
+std::string ListBytes(const std::vector<std::pair<int, std::string>>& records) {
+  std::vector<ListRec> list;
+  for (const auto& [number, code] : records) {
+    ListRec rec{};
+    rec.ListRecNo = std::int16_t(number);
+    rec.ListCode.set(code);
+    list.push_back(rec);
+  }
+  return Bytes(list);
+}
+
+TEST_F(ChartWindowTest, AListIsPagedInItsOwnOrderAndWrapsBothWays) {
+  PutThree();
+  home.Put("drive_c/korawin/data/SubListB.Dat", ListBytes({{3, "CCC"}, {1, "AAA"}}));
+  window();
+  state.ChartListNo = 3;
+  for (const char* expected : {"CCC.WDT", "AAA.WDT", "CCC.WDT"}) {
+    EXPECT_TRUE(window().NextChart());
+    EXPECT_EQ(shown(), expected);
+  }
+  EXPECT_EQ(state.ChartListCount, 2);
+  EXPECT_EQ(state.ChartIndex, 1);
+  EXPECT_EQ(current.NameRecNo, 3);
+  state.ChartDirection = 0;
+  EXPECT_TRUE(window().StepChart());
+  EXPECT_EQ(shown(), "AAA.WDT");
+  EXPECT_EQ(state.ChartIndex, 2);
+}
+
+TEST_F(ChartWindowTest, ARedrawAtTheFirstPlaceOfAListReturnsToIt) {
+  PutThree();
+  home.Put("drive_c/korawin/data/SubListA.Dat", ListBytes({{2, "BBB"}, {1, "AAA"}}));
+  window();
+  state.ChartListNo = 2;
+  window().NextChart();
+  EXPECT_TRUE(window().Refresh());
+  EXPECT_EQ(state.ChartIndex, 1);
+  EXPECT_EQ(shown(), "BBB.WDT");
+}
+
+TEST_F(ChartWindowTest, ImpossibleRecordNumbersOfAListAreToldAndPassed) {
+  PutThree();
+  home.Put("drive_c/korawin/data/SubListA.Dat",
+           ListBytes({{0, "X"}, {-5, "Y"}, {4, "Z"}, {32767, "W"}, {2, "BBB"}}) + "torn");
+  window();
+  state.ChartListNo = 2;
+  for (size_t i = 1; i <= 4; ++i) {
+    EXPECT_FALSE(window().NextChart());
+    ASSERT_EQ(dialogs.said.size(), i);
+    EXPECT_NE(dialogs.said.back().text.find("SubListA.Dat"), std::string::npos);
+    EXPECT_EQ(state.ChartIndex, std::int16_t(i));
+  }
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_EQ(state.ChartListCount, 5) << "the torn record does not count";
+}
+
+TEST_F(ChartWindowTest, AListThatVanishedIsTold) {
+  PutThree();
+  window();
+  state.ChartListNo = 2;
+  EXPECT_FALSE(window().NextChart());
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].text, " There are no records in Chart List A for this folder.");
+  EXPECT_EQ(state.ChartIndex, 0);
+}
+
+// ---- Industry filter
+
+class IndustryTest : public ChartWindowTest {
+ protected:
+  IndustryTest() {
+    PutNames({Security("AAA", 1, kShare, "011"), Security("BBB", 1, kShare, "020"),
+              Security("CCC", 1, kShare, "012"), Security("DDD", 1, kShare, "01"),
+              Security("EEE", 1, kShare, "")});
+    window().NextChart();
+    state.ICFilterOn = true;
+  }
+  std::string Step(int direction) {
+    state.ChartDirection = std::int16_t(direction);
+    EXPECT_TRUE(window().StepChart());
+    return shown();
+  }
+};
+
+TEST_F(IndustryTest, AGroupIsEveryClassOfThreeDigitsThatBeginsAlike) {
+  state.ICFilter = "010";
+  EXPECT_EQ(Step(1), "CCC.WDT");
+  EXPECT_EQ(Step(1), "AAA.WDT") << "DDD has two digits; the walk starts once more at the first";
+  EXPECT_EQ(Step(0), "CCC.WDT") << "backward it starts once more at the last";
+  EXPECT_EQ(Step(0), "AAA.WDT");
+}
+
+TEST_F(IndustryTest, AClassMustBeEqual) {
+  state.ICFilter = " 012 ";
+  EXPECT_EQ(Step(1), "CCC.WDT");
+  EXPECT_EQ(Step(1), "CCC.WDT");
+  EXPECT_EQ(Step(0), "CCC.WDT");
+}
+
+TEST_F(IndustryTest, WithoutAMatchItSaysSoAndShowsTheFirst) {
+  for (const char* filter : {"099", ""}) {
+    state.ICFilter = filter;
+    dialogs.said.clear();
+    EXPECT_EQ(Step(1), "AAA.WDT");
+    ASSERT_EQ(dialogs.said.size(), 1u);
+    EXPECT_EQ(dialogs.said[0].text,
+              "No records on file for that Industry classification or group");
+    EXPECT_EQ(dialogs.said[0].title, "Industry Classification");
+    EXPECT_EQ(state.ChartIndex, 1);
+  }
+}
+
+TEST_F(IndustryTest, TheFilterDoesNotHoldForTheNextChartOrInAList) {
+  state.ICFilter = "012";
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_EQ(shown(), "BBB.WDT");
+  home.Put("drive_c/korawin/data/SubListA.Dat", ListBytes({{2, "BBB"}, {5, "EEE"}}));
+  state.ChartListNo = 2;
+  state.ChartIndex = 1;
+  EXPECT_EQ(Step(1), "EEE.WDT");
+}
+
+// ---- Date limit
+
+TEST_F(ChartWindowTest, TheDateLimitShowsItsStepsAndEndsTheChart) {
+  PutThree();
+  window();
+  state.DateLimitOn = true;
+  state.ChosenLimitText = "15/02/2026";
+  state.ChosenLimitDate = "20260215";
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_EQ(window().Chart.Bars.BarCount, 14);
+  EXPECT_TRUE(window().view().FrameShown);
+  EXPECT_EQ(window().view().Panels[0], "Date Limit ON");
+  EXPECT_TRUE(window().view().PanelShown[0]);
+  state.DateLimitOn = false;
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_EQ(window().Chart.Bars.BarCount, 27);
+  EXPECT_FALSE(window().view().FrameShown);
+  EXPECT_EQ(window().view().Panels[0], "");
+}
+
+TEST_F(ChartWindowTest, TheLimitStepsByTheCalendarAndTheNextChartGoesBackToTheChosenOne) {
+  PutThree();
+  window();
+  state.DateLimitOn = true;
+  state.ChosenLimitText = "31/01/2024";
+  state.ChosenLimitDate = "20240131";
+  window().NextChart();
+  dialogs.said.clear();
+  const struct {
+    int index;
+    const char* text;
+  } steps[] = {{2, "29/02/2024"}, {1, "07/03/2024"}, {0, "08/03/2024"},
+               {3, "07/03/2024"}, {4, "29/02/2024"}, {5, "29/01/2024"}};
+  for (const auto& step : steps) {
+    window().StepDateLimit(step.index);
+    EXPECT_EQ(state.DateLimitText, step.text);
+    EXPECT_EQ(state.DateLimitDate, DateToFile(step.text));
+    EXPECT_EQ(state.ChosenLimitText, "31/01/2024");
+    EXPECT_FALSE(state.DateLimitMoved);
+  }
+  EXPECT_EQ(shown(), "AAA.WDT");
+  state.ChartDirection = 1;
+  window().StepChart();
+  EXPECT_EQ(state.DateLimitText, "31/01/2024");
+}
+
+TEST_F(ChartWindowTest, AStepBeyondTheDataOrOfNoDateIsHarmless) {
+  PutThree();
+  window();
+  state.DateLimitOn = true;
+  state.ChosenLimitText = "01/02/2026";
+  state.ChosenLimitDate = "20260201";
+  window().NextChart();
+  window().StepDateLimit(5);  // before the data
+  EXPECT_EQ(state.DateLimitDate, "20260101");
+  window().StepDateLimit(2);
+  EXPECT_EQ(state.DateLimitDate, "20260201");
+  state.DateLimitText = "rubbish";
+  EXPECT_FALSE(window().StepDateLimit(0));
+  EXPECT_EQ(state.DateLimitText, "rubbish");
+  state.DateLimitText = "31/12/9999";
+  EXPECT_FALSE(window().StepDateLimit(0));
+  EXPECT_EQ(state.DateLimitText, "31/12/9999");
+}
+
+TEST_F(ChartWindowTest, TheFrameIsKeptWhereItWasDropped) {
+  PutThree();
+  window();
+  state.DateLimitOn = true;
+  state.ChosenLimitText = "15/02/2026";
+  state.ChosenLimitDate = "20260215";
+  window().NextChart();
+  EXPECT_FALSE(window().view().Frame) << "never kept";
+  window().DropFrame(200, 100, 60, 40);
+  EXPECT_EQ(user.GetSetting(kUserSection, "BDFrame"), "120,170") << "top, left";
+  window().Load();
+  window().NextChart();
+  ASSERT_TRUE(window().view().Frame);
+  EXPECT_EQ(window().view().Frame->top, 120);
+  EXPECT_EQ(window().view().Frame->left, 170);
+  for (const char* bad : {"x,y", "12", "1,2,3", ",", "nan,inf"}) {
+    user.PutSetting(kUserSection, "BDFrame", bad);
+    ChartWindow fresh({.files = home.files(), .dialogs = dialogs, .settings = settings, .ini = ini,
+                       .user = user, .colours = colours, .current = current, .state = state,
+                       .price = surface, .panel = panel});
+    fresh.Load();
+    EXPECT_TRUE(fresh.NextChart());
+    EXPECT_FALSE(fresh.view().Frame) << bad;
+  }
+}
+
+// ---- Style, period and switches
+
+TEST_F(ChartWindowTest, StyleAndPeriodRedrawTheChartOnShow) {
+  PutThree();
+  window().NextChart();
+  window().NextChart();
+  EXPECT_TRUE(window().SetStyle('C'));
+  EXPECT_EQ(window().Request.ChartStyle, 'C');
+  EXPECT_TRUE(window().SetPeriod("W"));
+  EXPECT_EQ(window().Request.ChartPeriod, "W");
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_EQ(state.ChartIndex, 2);
+  EXPECT_LT(window().Chart.Bars.BarCount, 6) << "28 days are at most five weeks";
+}
+
+TEST_F(ChartWindowTest, GridLinesAreWrittenAndDrawn) {
+  PutThree();
+  window().NextChart();
+  EXPECT_FALSE(window().Request.GridLines);
+  EXPECT_TRUE(window().ToggleGridLines());
+  EXPECT_TRUE(window().Request.GridLines);
+  EXPECT_EQ(ini.GetSetting("Charts", "Grid"), "True");
+  EXPECT_TRUE(window().ToggleGridLines());
+  EXPECT_FALSE(window().Request.GridLines);
+  EXPECT_EQ(ini.GetSetting("Charts", "Grid"), "False");
+  EXPECT_EQ(state.ChartIndex, 1);
+}
+
+TEST_F(ChartWindowTest, AutomaticBoxesMoveOnToTheNextChart) {
+  PutThree();
+  window().NextChart();
+  EXPECT_TRUE(state.PFAutoBox);
+  EXPECT_TRUE(window().TogglePFAuto());
+  EXPECT_FALSE(state.PFAutoBox);
+  EXPECT_EQ(shown(), "BBB.WDT");
+}
+
+TEST_F(ChartWindowTest, TheLegendShowsForReversalsOfABarChartAlone) {
+  PutThree();
+  window().NextChart();
+  EXPECT_TRUE(window().ToggleReversals());
+  EXPECT_TRUE(window().Request.ColourMarks);
+  EXPECT_TRUE(window().view().LegendShown);
+  window().SetStyle('C');
+  EXPECT_FALSE(window().view().LegendShown);
+  surface.ops.clear();
+  EXPECT_FALSE(window().ToggleReversals());
+  EXPECT_FALSE(surface.Has("cls")) << "nothing to draw anew";
+}
+
+TEST_F(ChartWindowTest, MultipleAveragesAreDrawnAndWritten) {
+  PutThree();
+  settings.osc.MMASet = {3, 5};
+  window().NextChart();
+  const std::string plain = script();
+  EXPECT_TRUE(window().ToggleMMA());
+  EXPECT_GT(script().size(), plain.size());
+  EXPECT_EQ(shown(), "AAA.WDT");
+  EXPECT_TRUE(window().ToggleMMA());
+  EXPECT_EQ(script(), plain);
+}
+
+TEST_F(ChartWindowTest, NoToggleComposesBeforeTheFirstChart) {
+  PutThree();
+  window();
+  EXPECT_FALSE(window().SetStyle('L'));
+  EXPECT_FALSE(window().ToggleGridLines());
+  EXPECT_FALSE(window().ToggleReversals());
+  EXPECT_FALSE(window().ToggleMMA());
+  EXPECT_FALSE(window().TogglePFAuto());
+  EXPECT_FALSE(window().StepDateLimit(0));
+  EXPECT_FALSE(window().Resized());
+  window().PickOscillator("RSI");
+  window().StartSuperimpose();
+  window().StartSplitScreen();
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_FALSE(surface.Has("cls"));
+}
+
+// ---- Oscillators
+
+class OscillatorTest : public ChartWindowTest {
+ protected:
+  OscillatorTest() {
+    PutThree();
+    OscSettings& osc = settings.osc;
+    for (const OscKey& key : OscKeys()) osc.*(key.value) = {5, 6};
+    window().NextChart();
+    dialogs.said.clear();
+    panel.ops.clear();
+  }
+};
+
+TEST_F(OscillatorTest, APickedOscillatorTakesTheLowerPaneAndTheScript) {
+  EXPECT_FALSE(panel.Visible());
+  const size_t before = script().size();
+  window().PickOscillator("RSI");
+  EXPECT_TRUE(panel.Visible());
+  EXPECT_EQ(state.OscCode, "RSI");
+  EXPECT_FALSE(panel.ops.empty());
+  EXPECT_GT(script().size(), before);
+}
+
+TEST_F(OscillatorTest, ASecondOneReplacesTheFirstOnPaneAndScript) {
+  window().PickOscillator("RSI");
+  const std::string rsi = script();
+  window().PickOscillator("MOM");
+  window().PickOscillator("RSI");
+  EXPECT_EQ(script(), rsi);
+}
+
+TEST_F(OscillatorTest, ItIsNotPartOfTheNextChartButStaysAtAnotherSize) {
+  window().PickOscillator("RSI");
+  EXPECT_TRUE(window().Resized());
+  EXPECT_TRUE(panel.Visible());
+  EXPECT_EQ(state.OscCode, "RSI");
+  window().NextChart();
+  EXPECT_FALSE(panel.Visible());
+  EXPECT_EQ(state.OscCode, "");
+}
+
+TEST_F(OscillatorTest, OneThatChartSelectionChoseIsPartOfEveryChart) {
+  state.OscShown = true;
+  state.OscCode = state.OscSelected = "MACD";
+  window().NextChart();
+  EXPECT_TRUE(panel.Visible());
+  EXPECT_EQ(window().Request.OscName, "MACD");
+  window().NextChart();
+  EXPECT_TRUE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, TheParabolicHasNoPane) {
+  state.OscShown = true;
+  state.OscCode = state.OscSelected = "PARA";
+  window().NextChart();
+  EXPECT_FALSE(panel.Visible());
+  state.OscShown = false;
+  window().NextChart();
+  const std::string plain = script();
+  window().Redraw();
+  ASSERT_EQ(script(), plain);
+  window().PickOscillator("PARA");
+  EXPECT_NE(script(), plain);
+  EXPECT_FALSE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, APeriodOfZeroIsRefusedAsTheFirstOfAPairAndLegalAsTheSecond) {
+  settings.osc.StochD.daily = 0;
+  window().PickOscillator("STO");
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_TRUE(panel.Visible());
+  window().NextChart();
+  settings.osc.StochK.daily = 0;
+  window().PickOscillator("STO");
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].text, "STO Oscillator values not valid");
+  EXPECT_EQ(dialogs.said[0].title, "Oscillator Values");
+  EXPECT_FALSE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, EveryPeriodLiesInOneToTwoHundred) {
+  const struct {
+    const char* code;
+    PeriodPair OscSettings::*value;
+    bool zeroIsLegal;
+  } checks[] = {
+      {"STO", &OscSettings::StochK, false}, {"STO", &OscSettings::StochD, true},
+      {"FX", &OscSettings::FXF, false},     {"FX", &OscSettings::FXX, true},
+      {"R/F", &OscSettings::FXF, false},    {"R/F", &OscSettings::FXX, true},
+      {"R/F", &OscSettings::RocP, false},   {"ROC", &OscSettings::RocP, false},
+      {"RSI", &OscSettings::RsiP, false},   {"MACD", &OscSettings::Md1, false},
+      {"MACD", &OscSettings::Md2, false},   {"MACD", &OscSettings::Md3, false},
+      {"WMS", &OscSettings::WmsA, false},   {"ERY", &OscSettings::ERA, false},
+      {"DM", &OscSettings::DMA, false},     {"MOM", &OscSettings::MMA, false},
+      {"COP", &OscSettings::CopD, false},   {"JHG", &OscSettings::HolyD, false},
+      {"VTY", &OscSettings::VtyD, false}};
+  for (const auto& check : checks) {
+    PeriodPair& pair = settings.osc.*check.value;
+    const PeriodPair standing = pair;
+    for (const int value : {0, 1, 200, 201, -1}) {
+      pair.daily = std::int16_t(value);
+      dialogs.said.clear();
+      window().PickOscillator(check.code);
+      const bool refused = value < (check.zeroIsLegal ? 0 : 1) || value > 200;
+      bool told = false;
+      for (const auto& said : dialogs.said)
+        told |= said.text == std::string(check.code) + " Oscillator values not valid";
+      EXPECT_EQ(told, refused) << check.code << " " << value;
+    }
+    pair = standing;
+  }
+}
+
+TEST_F(OscillatorTest, MonthlyChartsCheckTheWeeklyPeriods) {
+  settings.osc.RsiP = {0, 5};
+  window().SetPeriod("M");
+  window().PickOscillator("RSI");
+  EXPECT_TRUE(dialogs.said.empty());
+  settings.osc.RsiP = {5, 0};
+  window().PickOscillator("RSI");
+  EXPECT_EQ(dialogs.said.size(), 1u);
+}
+
+TEST_F(OscillatorTest, RmoIsForDailyChartsOnly) {
+  window().SetPeriod("W");
+  window().PickOscillator("RMO");
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].text, "RMO only available on Daily Charts");
+  EXPECT_EQ(dialogs.said[0].title, "RMO");
+  state.OscShown = true;
+  state.OscCode = state.OscSelected = "RMO";
+  EXPECT_TRUE(window().DrawChart());
+  EXPECT_EQ(dialogs.said.size(), 2u);
+  EXPECT_FALSE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, AMissingCompareFileIsTold) {
+  settings.osc.CompFile = "c:\\korawin\\data\\XAO.WDT";
+  window().PickOscillator("RMX");
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].title, "RMX Compare ");
+  EXPECT_EQ(dialogs.said[0].text, " Oscillator values not valid");
+  window().PickOscillator("RMO");
+  ASSERT_EQ(dialogs.said.size(), 2u);
+  EXPECT_EQ(dialogs.said[1].text, "c:\\korawin\\data\\XAO.WDT is not available. Use your code "
+                                  "for the All Ordinaries Index");
+  EXPECT_FALSE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, VolumesThatAreNotShownHaveNoBalance) {
+  state.VolumeOption = false;
+  window().Redraw();
+  window().PickOscillator("OBV");
+  EXPECT_FALSE(panel.Visible());
+  state.VolumeOption = true;
+  window().Redraw();
+  window().PickOscillator("OBV");
+  EXPECT_TRUE(panel.Visible());
+  EXPECT_TRUE(dialogs.said.empty());
+}
+
+TEST_F(OscillatorTest, TheSettingsBoxComesFirstWhenItIsAskedFor) {
+  int opened = 0;
+  window().SetOscFrm([&] {
+    ++opened;
+    window().ShowOscillator();
+  });
+  window().PickOscillator("RSI");
+  EXPECT_EQ(opened, 0);
+  settings.osc.ShowOsc = true;
+  window().PickOscillator("MOM");
+  EXPECT_EQ(opened, 1);
+  EXPECT_TRUE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, NothingIsDrawnWhileChartSelectionStartsTheWindow) {
+  state.ChartStartup = true;
+  state.OscCode = "RSI";
+  EXPECT_FALSE(window().ShowOscillator());
+  EXPECT_FALSE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, AChartThatFailsLeavesNoPanelOfAnother) {
+  state.OscShown = true;
+  state.OscCode = state.OscSelected = "RSI";
+  window().NextChart();
+  home.files().Remove("c:\\korawin\\data\\CCC.WDT");
+  panel.ops.clear();
+  EXPECT_FALSE(window().NextChart());
+  EXPECT_EQ(panel.ops, std::vector<std::string>{"cls"});
+}
+
+// ---- Two charts
+
+TEST_F(ChartWindowTest, ASecondChartIsLaidOverTheFirst) {
+  PutThree();
+  window().NextChart();
+  int asked = 0;
+  window().SetChart2([&] { ++asked; });
+  window().StartSuperimpose();
+  EXPECT_EQ(asked, 1);
+  EXPECT_EQ(state.ChartTask, kTaskSuperimpose);
+  EXPECT_TRUE(state.Superimposed);
+  surface.ops.clear();
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_FALSE(surface.Has("cls")) << "the first chart stays";
+  EXPECT_TRUE(state.Superimposed);
+  EXPECT_EQ(window().Chart.OscPanel, 0);
+  window().NextChart();
+  EXPECT_TRUE(surface.Has("cls"));
+  EXPECT_FALSE(state.Superimposed);
+}
+
+TEST_F(ChartWindowTest, ASplitScreenTakesTheNextChartBelowAndEnds) {
+  PutThree();
+  window().NextChart();
+  window().StartSplitScreen();
+  EXPECT_TRUE(state.SplitScreen);
+  EXPECT_TRUE(state.SplitShown);
+  EXPECT_EQ(window().Chart.ChartSlot, 2);
+  EXPECT_LT(window().Chart.ChartBottom, 226) << "the upper half";
+  surface.ops.clear();
+  window().NextChart();
+  EXPECT_FALSE(surface.Has("cls"));
+  EXPECT_GT(window().Chart.ChartTop, 226) << "the lower half";
+  EXPECT_FALSE(state.SplitScreen);
+  EXPECT_TRUE(state.SplitShown);
+  window().NextChart();
+  EXPECT_FALSE(state.SplitShown);
+  EXPECT_TRUE(surface.Has("cls"));
+}
+
+TEST_F(ChartWindowTest, APairIsDrawnAgainAtAnotherSize) {
+  PutThree();
+  for (const bool split : {true, false}) {
+    state.ChartIndex = 0;
+    window().NextChart();
+    if (split) window().StartSplitScreen();
+    else window().StartSuperimpose();
+    EXPECT_TRUE(window().Resized()) << "the second is still to come";
+    const std::string first = script();
+    surface.ops.clear();
+    EXPECT_TRUE(window().NextChart());
+    const auto second = surface.ops;
+    const std::string pair = script();
+    surface.ops.clear();
+    EXPECT_TRUE(window().Resized());
+    EXPECT_EQ(script(), pair);
+    EXPECT_GT(pair.size(), first.size());
+    EXPECT_EQ(std::count(surface.ops.begin(), surface.ops.end(), "cls"), 1);
+    ASSERT_GT(surface.ops.size(), second.size());
+    EXPECT_TRUE(std::equal(second.rbegin(), second.rend(), surface.ops.rbegin()));
+    EXPECT_EQ(state.SplitShown, split);
+    EXPECT_EQ(state.Superimposed, !split);
+    EXPECT_EQ(shown(), "BBB.WDT");
+    window().NextChart();
+    EXPECT_FALSE(state.SplitShown || state.Superimposed);
+  }
+}
+
+TEST_F(ChartWindowTest, ASecondChartThatIsNotChosenLeavesOneChart) {
+  PutThree();
+  window().NextChart();
+  for (const bool split : {true, false}) {
+    if (split) window().StartSplitScreen();
+    else window().StartSuperimpose();
+    window().DropSecondChart();
+    surface.ops.clear();
+    window().NextChart();
+    EXPECT_TRUE(surface.Has("cls"));
+    EXPECT_FALSE(state.SplitShown);
+    EXPECT_FALSE(state.Superimposed);
+  }
+}
+
+// ---- Saving
+
+class SaveTest : public ChartWindowTest {
+ protected:
+  SaveTest() {
+    PutThree();
+    home.files().MakeFolder("c:\\korawin\\chtsave");
+    window().NextChart();
+  }
+  std::string Save(const std::string& name) {
+    dialogs.said.clear();
+    window().StartSaving();
+    EXPECT_EQ(state.ChartTask, kTaskSaving);
+    window().SaveChartAs("c:\\korawin\\chtsave\\" + name);
+    EXPECT_EQ(state.ChartTask, kTaskNone);
+    return dialogs.said.empty() ? "" : dialogs.said.back().text;
+  }
+  std::string saved(const char* name) { return home.Get(std::string("drive_c/korawin/chtsave/") + name); }
+};
+
+TEST_F(SaveTest, TheScriptIsCopied) {
+  EXPECT_EQ(window().SuggestedName(), "AAA.cht");
+  EXPECT_EQ(Save("mine.CHT"), " CHART SAVED ");
+  EXPECT_EQ(dialogs.said[0].title, "Save Chart");
+  EXPECT_EQ(saved("mine.CHT"), script());
+}
+
+TEST_F(SaveTest, AnotherEndingIsRefused) {
+  for (const char* name : {"a.txt", "cht", "a.cht.bak", "a"}) {
+    EXPECT_EQ(Save(name), "File extension must be .cht") << name;
+    EXPECT_FALSE(home.Exists(std::string("drive_c/korawin/chtsave/") + name));
+  }
+}
+
+TEST_F(SaveTest, AFileThatIsThereIsReplacedOnlyOnOk) {
+  home.Put("drive_c/korawin/chtsave/a.cht", "old");
+  dialogs.answers = {Answer::kCancel};
+  EXPECT_EQ(Save("a.cht"), " CHART NOT SAVED ");
+  EXPECT_EQ(dialogs.said[0].text,
+            "c:\\korawin\\chtsave\\a.cht already exists - Overwrite");
+  EXPECT_EQ(saved("a.cht"), "old");
+  dialogs.answers = {Answer::kOk};
+  EXPECT_EQ(Save("a.cht"), " CHART SAVED ");
+  EXPECT_EQ(saved("a.cht"), script());
+}
+
+TEST_F(SaveTest, ANameThatCanBeNoneIsTold) {
+  EXPECT_EQ(Save(std::string("a\0b.cht", 7)), "File name invalid");
+  home.files().MakeFolder("c:\\korawin\\chtsave\\dir.cht");
+  EXPECT_EQ(Save("dir.cht"), "File name invalid");
+}
+
+TEST_F(SaveTest, AFileThatCannotBeWrittenIsNotSaved) {
+  EXPECT_EQ(Save("nowhere\\a.cht"), " CHART NOT SAVED ");
+}
+
+TEST_F(SaveTest, CancelDrawsTheChartAgain) {
+  surface.ops.clear();
+  dialogs.said.clear();
+  window().StartSaving();
+  window().SaveChartAs(std::nullopt);
+  EXPECT_TRUE(surface.Has("cls"));
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_EQ(shown(), "AAA.WDT");
+}
+
+TEST_F(SaveTest, PicturesAreOfferedWhereTheyCanBeMade) {
+  window().SaveChartAs("c:\\korawin\\chtsave\\a.svg",
+                       [](const std::string& path) { return "picture of " + path; });
+  EXPECT_EQ(dialogs.said.back().text, " CHART SAVED ");
+  EXPECT_EQ(saved("a.svg"), "picture of c:\\korawin\\chtsave\\a.svg");
+  window().SaveChartAs("c:\\korawin\\chtsave\\b.png",
+                       [](const std::string&) -> std::string { throw RunTimeError(kNoPicture); });
+  EXPECT_EQ(dialogs.said.back().text, " CHART NOT SAVED ");
+  EXPECT_FALSE(home.Exists("drive_c/korawin/chtsave/b.png"));
+}
+
+TEST_F(SaveTest, ASavedChartIsPlayedInPlaceOfTheComposedOne) {
+  Save("a.cht");
+  surface.ops.clear();
+  dialogs.said.clear();
+  window().ShowSaved("c:\\korawin\\chtsave\\A.CHT");
+  EXPECT_TRUE(window().ChartFromFile);
+  EXPECT_TRUE(surface.Has("cls"));
+  EXPECT_GT(surface.ops.size(), 30u);
+  EXPECT_TRUE(dialogs.said.empty());
+  window().Redraw();
+  EXPECT_FALSE(window().ChartFromFile);
+  EXPECT_EQ(shown(), "AAA.WDT");
+}
+
+TEST_F(SaveTest, ThePointerReadsNothingFromASavedChart) {
+  Save("a.cht");
+  window().ShowSaved("c:\\korawin\\chtsave\\a.cht");
+  window().ToggleGrid();
+  surface.ops.clear();
+  window().MouseMove(100, 200);
+  EXPECT_TRUE(surface.ops.empty());
+  EXPECT_EQ(window().view().Panels[2], "");
+}
+
+TEST_F(SaveTest, WhatIsNoSavedChartIsTold) {
+  dialogs.said.clear();
+  window().ShowSaved("c:\\korawin\\chtsave\\a.txt");
+  EXPECT_EQ(dialogs.said.back().text, "File extension must be .cht");
+  EXPECT_EQ(dialogs.said.back().title, "Saved Charts");
+  home.Put("drive_c/korawin/chtsave/bad.cht", std::string("\x01\x02\0,,,,,,,,\r\n", 14));
+  window().ShowSaved("c:\\korawin\\chtsave\\bad.cht");
+  EXPECT_EQ(dialogs.said.back().text,
+            "There is problem displaying this chart - format invalid.");
+  EXPECT_FALSE(window().ChartFromFile);
+}
+
+TEST_F(SaveTest, TheChartIsDrawnAgainElsewhereWithoutTouchingTheScript) {
+  settings.osc.RsiP = {5, 5};
+  window().PickOscillator("RSI");
+  const std::string before = script();
+  surface.ops.clear();
+  window().Redraw();
+  window().PickOscillator("RSI");
+  RecordingSurface price(638, 452), lower(638, 144);
+  const auto tops = panel.ops;
+  EXPECT_TRUE(window().DrawAgain(price, &lower));
+  EXPECT_EQ(script(), before);
+  EXPECT_FALSE(price.ops.empty());
+  EXPECT_FALSE(lower.ops.empty());
+  EXPECT_EQ(price.ops.back(), surface.ops.back());
+}
+
+// ---- Read-out
+
+class GridTest : public ChartWindowTest {
+ protected:
+  GridTest() {
+    PutThree();
+    window().NextChart();
+    window().ToggleGrid();
+    surface.ops.clear();
+  }
+  const auto& panels() { return window().view().Panels; }
+};
+
+TEST_F(GridTest, TheToolShowsThePanelsAndItsButton) {
+  EXPECT_EQ(window().view().TB, kButtonGrid);
+  EXPECT_EQ(panels()[1], "GRID");
+  for (const bool shown : window().view().PanelShown) EXPECT_TRUE(shown);
+  EXPECT_EQ(state.ChartTask, kTaskGrid);
+  window().ToggleGrid();
+  EXPECT_EQ(window().view().TB, kNoButton);
+  for (const bool shown : window().view().PanelShown) EXPECT_FALSE(shown);
+  EXPECT_EQ(state.ChartTask, kTaskNone);
+}
+
+TEST_F(GridTest, ThePanelsShowTheBarOfThePriceFile) {
+  const double x = window().Chart.ChartLeft + 3.0 * window().Chart.BarSpacing;
+  window().MouseMove(x, 200);
+  // The fourth day: close 10 + 4 % 5.
+  EXPECT_EQ(panels()[2], "04-02-26");
+  EXPECT_EQ(panels()[3], "Open  14.00");
+  EXPECT_EQ(panels()[4], "High  15.00");
+  EXPECT_EQ(panels()[5], "Low  13.00");
+  EXPECT_EQ(panels()[6], "Close  14.00");
+  EXPECT_EQ(panels()[7].find("Vol  40"), 0u) << panels()[7];
+}
+
+TEST_F(GridTest, EveryColumnReadsItsDayOfThePriceFile) {
+  const PriceFile prices(home.files(), "c:\\korawin\\data\\AAA.WDT");
+  const auto& chart = window().Chart;
+  ASSERT_EQ(prices.count(), 28);
+  for (std::int32_t record = 1; record <= 28; ++record) {
+    const PriceRec day = prices.Read(record);
+    window().MouseMove(chart.ChartLeft + (record - 1) * double(chart.BarSpacing), 200);
+    const std::string date(day.RecDate.raw());
+    EXPECT_EQ(panels()[2], date.substr(6, 2) + "-" + date.substr(4, 2) + "-" + date.substr(2, 2));
+    EXPECT_EQ(panels()[4], "High  " + std::to_string(int(day.High)) + ".00");
+    EXPECT_EQ(panels()[6], "Close  " + std::to_string(int(day.Close)) + ".00");
+  }
+}
+
+TEST_F(GridTest, BeyondTheLastBarItShowsTheLast) {
+  window().MouseMove(window().Chart.ChartRight, 200);
+  EXPECT_EQ(panels()[2], "28-02-26");
+}
+
+TEST_F(GridTest, OutsideThePlotThePanelsAreClearAndThereIsNoCrossHair) {
+  window().MouseMove(100, 200);
+  ASSERT_NE(panels()[2], "");
+  surface.ops.clear();
+  window().MouseMove(5, 200);
+  EXPECT_EQ(panels()[2], "");
+  EXPECT_EQ(panels()[1], "GRID");
+  EXPECT_EQ(surface.ops.size(), 2u) << "the two lines are taken away";
+}
+
+TEST_F(GridTest, AClickEndsIt) {
+  window().MouseMove(100, 200);
+  surface.ops.clear();
+  window().MouseClick();
+  EXPECT_EQ(surface.ops.size(), 2u);
+  EXPECT_FALSE(window().GridOn());
+  window().MouseMove(120, 200);
+  EXPECT_EQ(surface.ops.size(), 2u);
+}
+
+TEST_F(GridTest, AMoveComposesNothing) {
+  const std::string before = script();
+  home.Put("drive_c/korawin/data/TCht.Tmp", "untouched");
+  for (int x = 50; x < 600; x += 7) window().MouseMove(x, 200);
+  EXPECT_EQ(script(), "untouched");
+  for (const std::string& op : surface.ops) EXPECT_EQ(op.find("xor dot"), 0u) << op;
+}
+
+TEST_F(GridTest, TheKeysGoFromBarToBar) {
+  window().MoveCross(-1);
+  EXPECT_EQ(panels()[2], "28-02-26") << "it begins at the last bar";
+  window().MoveCross(-1);
+  EXPECT_EQ(panels()[2], "27-02-26");
+  window().MoveCross(-1);
+  EXPECT_EQ(panels()[2], "26-02-26");
+  window().MoveCross(1);
+  EXPECT_EQ(panels()[2], "27-02-26");
+  window().CrossToEnd(false);
+  EXPECT_EQ(panels()[2], "01-02-26");
+  window().MoveCross(-1);
+  EXPECT_EQ(panels()[2], "01-02-26");
+  window().CrossToEnd(true);
+  EXPECT_EQ(panels()[2], "28-02-26");
+  window().MoveCross(1);
+  EXPECT_EQ(panels()[2], "28-02-26");
+}
+
+TEST_F(GridTest, AKeyStartsTheTool) {
+  window().ToggleGrid();
+  window().MoveCross(-1);
+  EXPECT_TRUE(window().GridOn());
+  EXPECT_EQ(panels()[2], "28-02-26");
+}
+
+TEST_F(GridTest, ItOutlivesAPageAndLeavesNoLineBehind) {
+  window().MouseMove(100, 200);
+  state.ChartDirection = 1;
+  window().StepChart();
+  EXPECT_TRUE(window().GridOn());
+  surface.ops.clear();
+  window().MouseMove(110, 200);
+  EXPECT_EQ(surface.ops.size(), 2u) << "nothing to take away from the new picture";
+}
+
+TEST_F(GridTest, TwoChartsKeepTheLastText) {
+  window().MouseMove(window().Chart.ChartLeft, 200);
+  const auto before = panels()[2];
+  ASSERT_EQ(before, "01-02-26");
+  state.Superimposed = true;
+  window().MouseMove(window().Chart.ChartLeft + 20, 200);
+  EXPECT_EQ(panels()[2], before);
+}
+
+TEST_F(GridTest, NothingToReadAfterAChartThatFailed) {
+  home.files().Remove("c:\\korawin\\data\\BBB.WDT");
+  EXPECT_FALSE(window().NextChart());
+  surface.ops.clear();
+  window().MouseMove(100, 200);
+  EXPECT_TRUE(surface.ops.empty());
+  window().MoveCross(-1);
+  window().CrossToEnd(true);
+  EXPECT_TRUE(surface.ops.empty());
+}
+
+// ---- The rest
+
+TEST_F(ChartWindowTest, CancellingTheToolsLeavesNothingOn) {
+  PutThree();
+  window().NextChart();
+  window().ToggleGrid();
+  window().Chart.OscPanel = 2;
+  window().CancelChartTools();
+  EXPECT_FALSE(window().GridOn());
+  EXPECT_EQ(window().Chart.OscPanel, 0);
+  EXPECT_EQ(window().view().TB, kNoButton);
+  EXPECT_EQ(state.ChartTask, kTaskNone);
+  EXPECT_EQ(window().view().Panels[1], "");
+}
+
+TEST_F(ChartWindowTest, ANewChartLeavesTheToolsAndEmptiesTheDrawnLines) {
+  PutThree();
+  window().NextChart();
+  home.Put("drive_c/korawin/data/ChtLns.Tmp", "H,1,2,3,4,5\r\n");
+  state.SuppressScript = true;
+  window().StartSuperimpose();
+  surface.ops.clear();
+  window().StartNewChart();
+  EXPECT_EQ(home.Get("drive_c/korawin/data/ChtLns.Tmp"), "");
+  EXPECT_FALSE(state.SuppressScript);
+  EXPECT_TRUE(surface.Has("cls")) << "half of a pair goes";
+  EXPECT_EQ(state.ChartTask, kTaskNewChart);
+}
+
+TEST_F(ChartWindowTest, ScrollingEndsTheDateLimitAtTheNextStep) {
+  PutThree();
+  window();
+  state.DateLimitOn = true;
+  state.ChosenLimitText = "15/02/2026";
+  state.ChosenLimitDate = "20260215";
+  window().NextChart();
+  state.ScrollInUse = true;
+  window().StepChart();
+  EXPECT_FALSE(state.DateLimitOn);
+  EXPECT_FALSE(window().view().FrameShown);
+}
+
+TEST(PanesTest, OneTakesTheFormAndTwoShareIt) {
+  const PaneLayout one = LayOutPanes(640, 454, 30, 25, false);
+  EXPECT_EQ(one.width, 638);
+  EXPECT_EQ(one.price, 397);
+  EXPECT_EQ(one.panel, 0);
+  const PaneLayout two = LayOutPanes(640, 454, 24, 25, true);  // 430 to share
+  EXPECT_EQ(two.price, 281);
+  EXPECT_EQ(two.panelTop, 283);
+  EXPECT_EQ(two.panel, 98);
+  EXPECT_EQ(LayOutPanes(640, 90, 30, 25, true).panel, 0) << "too low for two";
+  EXPECT_GE(LayOutPanes(0, 0, 30, 25, true).price, 1);
+}
+
+TEST(StatusBarTest, PanelsAreANinthAndTheLastAQuarterMore) {
+  EXPECT_EQ(StatusBarWidths(640).each, 71);
+  EXPECT_EQ(StatusBarWidths(640).last, 88);
+  EXPECT_EQ(StatusBarWidths(647.9).each, 71);
+}
+
+TEST(ToolBarTest, ForwardIsTheFifthOfTwenty) {
+  EXPECT_STREQ(ToolButtonOf(kButtonForward).key, "fwd");
+  EXPECT_EQ(kButtonForward, 5);
+  EXPECT_EQ(kButtonGrid, 13);
+  EXPECT_EQ(kToolButtons, 20);
+  EXPECT_STREQ(ToolButtonOf(20).key, "sZoom");
+}
+
 TEST_F(ChartWindowTest, TheTitleTellsTheDataFolder) {
-  EXPECT_EQ(window().Title(), "KORA Charting 7F   -  CHARTS  c:\\korawin\\data\\");
+  EXPECT_EQ(window().view().Title, "KORA Charting 7F   -  CHARTS  c:\\korawin\\data\\");
 }
 
 }  // namespace

@@ -11,6 +11,7 @@
 #include <QTextBrowser>
 #include <QTimer>
 
+#include "chartwindow/forms/Chart2.h"
 #include "platform/qt/single_instance.h"
 #include "shell/forms/AbtKora.h"
 #include "shell/forms/HelpWindow.h"
@@ -51,9 +52,10 @@ TEST_F(MainTest, EveryEntryIsThereUnderItsNameWithItsCaption) {
 
 TEST_F(MainTest, AnEntryWhoseFormIsNotThereIsGreyed) {
   Open();
-  for (const char* there : {"mnuChartDisplay", "mnuPaths", "mnuExit", "mnSHlp", "mnuAboutKora"})
+  for (const char* there : {"mnuChartDisplay", "mnuChartDefaults", "mnuPaths", "mnFnts", "mnuExit",
+                            "mnuLists", "mnuListsUte", "mnuRenameCL", "mnSHlp", "mnuAboutKora"})
     EXPECT_TRUE(Entry(there)->isEnabled()) << there;
-  for (const char* notYet : {"mnFnts", "mnuKBUpdate", "mnuTextFile", "mnStats"})
+  for (const char* notYet : {"mnuKBUpdate", "mnuTextFile", "mnStats"})
     EXPECT_FALSE(Entry(notYet)->isEnabled()) << notYet;
   form->SetOpener("mnStats", [] {});
   EXPECT_TRUE(Entry("mnStats")->isEnabled());
@@ -150,9 +152,17 @@ class ChtsTest : public MainTest {
  protected:
   Chts& OpenCharts() {
     Open();
-    Entry("mnuChartDisplay")->trigger();
+    Choose();
     EXPECT_NE(form->charts(), nullptr);
     return *form->charts();
+  }
+  // The entry opens the window with chart selection over it; SHOW CHART shows the first.
+  void Choose() {
+    Entry("mnuChartDisplay")->trigger();
+    auto* selection = Find<QDialog>(form.get(), "ChtSel");
+    ASSERT_NE(selection, nullptr);
+    QTest::mouseClick(Find<QPushButton>(selection, "OK"), Qt::LeftButton);
+    ASSERT_TRUE(WaitFor([&] { return form->findChild<QDialog*>("ChtSel") == nullptr; }));
   }
   PictureBox* Picture() { return dynamic_cast<PictureBox*>(Find<QWidget>(form.get(), "Picture1")); }
   // Pixels that are not the background.
@@ -202,7 +212,7 @@ TEST_F(ChtsTest, ANewSizeRecomposesTheSameChart) {
   form->resize(form->width() - 150, form->height() - 90);
   ASSERT_TRUE(WaitFor([&] { return charts.window().Chart.ChartRight < before && Ink() > 1000; }));
   EXPECT_EQ(shown(), "BBB.WDT");
-  EXPECT_EQ(charts.window().ChartIndex, 2);
+  EXPECT_EQ(charts.window().state().ChartIndex, 2);
   EXPECT_EQ(Picture()->surface().Width(), Picture()->width());
 }
 
@@ -213,25 +223,53 @@ TEST_F(ChtsTest, TheEntryBringsTheStandingWindowBack) {
   EXPECT_EQ(Find<QMdiArea>(form.get(), "MDI")->subWindowList().size(), 1);
 }
 
+TEST_F(ChtsTest, ASecondChartThatIsNotChosenLeavesTheNextOneAlone) {
+  Chts& charts = OpenCharts();
+  Entry("cmSplitScreen")->trigger();
+  Chart2* second = nullptr;
+  ASSERT_TRUE(WaitFor([&] { return (second = TopLevel<Chart2>()) != nullptr; }));
+  EXPECT_TRUE(session->charts.SplitScreen);
+  Click(second, "Command2");
+  EXPECT_FALSE(session->charts.SplitScreen);
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_FALSE(session->charts.SplitShown);
+  EXPECT_TRUE(charts.window().Chart.ChartDrawn);
+}
+
 TEST_F(ChtsTest, ClosingAndOpeningStartsAnew) {
   OpenCharts();
   QTest::keyClick(Picture(), Qt::Key_PageDown);
   form->charts()->parentWidget()->close();
   ASSERT_TRUE(WaitFor([&] { return form->charts() == nullptr; }));
-  Entry("mnuChartDisplay")->trigger();
+  Choose();
   EXPECT_EQ(shown(), "AAA.WDT");
 }
 
 TEST_F(ChtsTest, WithoutANameFileItSaysSoOnceAndStands) {
   session->files.Remove("c:\\korawin\\data\\Names.dat");
   Chts& charts = OpenCharts();
-  EXPECT_EQ(dialogs.said.size(), 1u);
-  EXPECT_EQ(charts.window().ChartIndex, 0);
+  EXPECT_EQ(dialogs.said.size(), 2u);  // chart selection says so, and then the window
+  EXPECT_EQ(charts.window().state().ChartIndex, 0);
   form->resize(form->width() - 100, form->height() - 50);
   QCoreApplication::processEvents();
-  EXPECT_EQ(dialogs.said.size(), 1u);
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
   EXPECT_EQ(dialogs.said.size(), 2u);
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  EXPECT_EQ(dialogs.said.size(), 3u);
+}
+
+TEST_F(ChtsTest, PageSetUpAndPrintOpenTheirFormsOverTheChart) {
+  Chts& charts = OpenCharts();
+  for (const auto& [entry, name] : {std::pair{"cmPageSetup", "Page"}, {"cmPrintChart", "PrintKora"}}) {
+    Find<QAction>(&charts, entry)->trigger();
+    auto* dialog = Find<QDialog>(&charts, name);
+    ASSERT_NE(dialog, nullptr) << name;
+    EXPECT_TRUE(dialog->isVisible());
+    EXPECT_TRUE(session->charts.SuppressScript);
+    dialog->reject();
+    ASSERT_TRUE(WaitFor([&] { return charts.findChild<QDialog*>(name) == nullptr; })) << name;
+  }
+  EXPECT_TRUE(home.Exists("drive_c/korawin/data/TCht.Tmp"));
 }
 
 TEST_F(ChtsTest, AChartThatFailsIsNotToldAgainAtEverySize) {

@@ -374,6 +374,79 @@ TEST_F(KoractlTest, PlayShowsASavedChartAndRefusesWhatIsNone) {
   ExpectUsage({"play", saved, "--out", home.path() + "/a.cht"}, "--out");
 }
 
+namespace {
+// The drawing of a PDF's first page, without the dates around it.
+std::string Drawing(const std::string& pdf) {
+  const size_t page = pdf.find("/Contents");
+  const size_t from = pdf.find("stream", page == pdf.npos ? 0 : page);
+  return from == pdf.npos ? "" : pdf.substr(from, pdf.find("endstream", from) - from);
+}
+}  // namespace
+
+TEST_F(KoractlTest, PrintMakesAPdfOfOnePage) {
+  MakeHome();
+  const std::string out = home.path() + "/a.pdf";
+  EXPECT_EQ(Out({"print", "abc", "--out", out}), "");
+  const std::string upright = home.Get("a.pdf");
+  EXPECT_EQ(upright.substr(0, 5), "%PDF-");
+  EXPECT_NE(upright.find("/MediaBox [0 0 595"), std::string::npos);
+  EXPECT_NE(upright.find("/Count 1"), std::string::npos);
+  EXPECT_EQ(Out({"print", "ABC", "--set", "ChtPage.Orient=2", "--osc", "MACD", "--out", out}), "");
+  EXPECT_NE(home.Get("a.pdf").find("/MediaBox [0 0 842"), std::string::npos);
+  EXPECT_FALSE(home.Exists("kora/" + kHostData + "TCht.Tmp"));
+}
+
+TEST_F(KoractlTest, ASavedChartPrintsAsTheChartItself) {
+  MakeHome();
+  const std::string saved = home.path() + "/a.CHT";
+  EXPECT_EQ(Out({"chart", "ABC", "--style", "C", "--out", saved}), "");
+  EXPECT_EQ(Out({"print", saved, "--out", home.path() + "/saved.pdf"}), "");
+  EXPECT_EQ(Out({"print", "ABC", "--style", "C", "--out", home.path() + "/own.pdf"}), "");
+  const std::string own = Drawing(home.Get("own.pdf"));
+  EXPECT_GT(own.size(), 1000u);
+  EXPECT_EQ(Drawing(home.Get("saved.pdf")), own);
+  EXPECT_EQ(Out({"print", "ABC", "--style", "L", "--out", home.path() + "/line.pdf"}), "");
+  EXPECT_NE(Drawing(home.Get("line.pdf")), own);
+}
+
+TEST_F(KoractlTest, PrintFollowsThePrintersSettings) {
+  MakeHome();
+  const auto print = [&](const Words& more) {
+    Words words{"print", "ABC", "--out", home.path() + "/p.pdf"};
+    words.insert(words.end(), more.begin(), more.end());
+    EXPECT_EQ(Out(words), "");
+    return Drawing(home.Get("p.pdf"));
+  };
+  const std::string plain = print({});
+  EXPECT_EQ(print({}), plain);
+  for (const char* setting : {"Charts.Line Width=9", "Charts.EFact=0.8", "Chart Fonts.CFontSize=20"})
+    EXPECT_NE(print({"--set", setting}), plain) << setting;
+  EXPECT_NE(print({"--switch", "N"}), plain);
+  home.Put("kora/drive_c/korawin/koraprn.dat", std::string("\1\0\0\0", 4));
+  EXPECT_NE(print({}), plain) << "in colour";
+}
+
+TEST_F(KoractlTest, AChartThatCannotBePrintedLeavesTheOldFile) {
+  MakeHome();
+  const std::string out = home.path() + "/p.pdf";
+  home.Put("p.pdf", "old");
+  home.Put("empty.cht", "");
+  home.Put("seven.cht", "L,1,2,3,4,5\r\nL,1,2,3,4,5,6\r\n");
+  home.Put("cut.cht", "L,1,2,3,4,5\r\nL,1,2");
+  const std::string said = "[Chart Printing] There is an unexpected error No. ";
+  ExpectAbandoned({"print", home.path() + "/empty.cht", "--out", out}, said + "5\n");
+  ExpectAbandoned({"print", home.path() + "/seven.cht", "--out", out}, said + "9\n");
+  ExpectAbandoned({"print", home.path() + "/cut.cht", "--out", out}, said + "5\n");
+  ExpectAbandoned({"print", home.path() + "/gone.cht", "--out", out}, said + "53\n");
+  ExpectAbandoned({"print", "ABC", "--out", home.path() + "/no/p.pdf"}, said);
+  ExpectAbandoned({"print", "XYZ", "--out", out}, kNoFile);
+  PutData("ABC.WDT", "");
+  ExpectAbandoned({"print", "ABC", "--out", out}, "[Chart Display] No Data for ABC.WDT");
+  ExpectUsage({"print", "ABC", "--out", home.path() + "/p.png"}, "does not end in .pdf");
+  ExpectUsage({"print", "ABC", "--out", "-"}, "does not end in .pdf");
+  ExpectUsage({"print", "ABC"}, "--out");
+}
+
 TEST_F(KoractlTest, WhatCannotBeChartedYetIsRefused) {
   MakeHome();
   for (const Words& more :

@@ -27,8 +27,12 @@ const std::map<std::string, std::set<std::string>>& Allowed() {
     t["store"] = {"base", "platform", "settings"};
     t["chart"] = {"base", "platform", "settings", "store"};
     t["indicators"] = {"base", "platform", "settings", "store", "chart"};
-    t["chartwindow"] = {"base", "platform", "settings", "store", "chart", "indicators"};
-    for (const char* room : {"update", "maintenance", "lists"}) t[room] = t["chart"];
+    t["lists"] = t["chart"];
+    t["chartwindow"] = {"base", "platform", "settings", "store", "chart", "indicators", "lists"};
+    for (const char* room : {"update", "maintenance"}) {
+      t[room] = t["chart"];
+      t[room].insert("lists");
+    }
     t["scans"] = t["indicators"];  // the bars of the chart
     for (const auto& [room, below] : std::map(t)) t["shell"].insert(room);
     for (const char* program : {"kora", "koractl"}) {

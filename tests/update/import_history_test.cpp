@@ -7,7 +7,7 @@
 
 #include "base/dates.h"
 #include "base/record_file.h"
-#include "store/list_rec.h"
+#include "lists/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_rec.h"
 #include "tests/support/failing_io.h"
@@ -245,7 +245,7 @@ TEST_F(ImportTest, SortsTheNameFileAndGivesTheListsTheNewNumbers) {
   EXPECT_EQ(names[1].Code.trimmed(), "BBB");
   EXPECT_EQ(names[2].Code.trimmed(), "DDD");
   const ListRec now =
-      RecordFile<ListRec>(home.files(), ListFilePath(kData, 'B')).Read(1);
+      RecordFile<ListRec>(home.files(), ListFilePath(kData, kFirstChartList + 1)).Read(1);
   EXPECT_EQ(now.ListRecNo, 3);
   EXPECT_EQ(now.ListCode.trimmed(), "DDD");
 }

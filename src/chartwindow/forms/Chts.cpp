@@ -1,86 +1,735 @@
 #include "chartwindow/forms/Chts.h"
 
+#include <QAction>
+#include <QApplication>
+#include <QClipboard>
 #include <QCloseEvent>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QFontMetricsF>
+#include <QFrame>
+#include <QGridLayout>
 #include <QKeyEvent>
+#include <QLabel>
+#include <QMdiSubWindow>
+#include <QMenu>
+#include <QMenuBar>
+#include <QMouseEvent>
+#include <QPainter>
+#include <QPointer>
+#include <QPushButton>
+#include <QStatusBar>
+#include <QToolBar>
+#include <QToolButton>
+#include <algorithm>
+#include <cmath>
+#include <tuple>
+#include <utility>
+#include <vector>
+
+#include "base/runtime_error.h"
+#include "base/text.h"
+#include "indicators/price_overlays.h"
+#include "platform/qt/picture.h"
+
+// Resources of a library are taken in by hand, outside of any namespace.
+static void TakeIcons() { Q_INIT_RESOURCE(chts_icons); }
 
 namespace kora {
 namespace {
 
-PictureBox* MakePicture(QWidget* parent) {
-  auto* picture = new PictureBox(parent);
-  picture->setObjectName("Picture1");
-  picture->setAccessibleName("Chart");
-  return picture;
+QString ToQt(std::string_view text) {
+  return QString::fromUtf8(text.data(), qsizetype(text.size()));
+}
+
+struct Entry {
+  const char* name;     // empty: a separator
+  const char* caption;
+  const char* code = "";  // of an oscillator
+};
+struct Menu {
+  const char* name;
+  const char* caption;
+  std::vector<Entry> entries;
+};
+
+const std::vector<Menu>& Menus() {
+  static const std::vector<Menu> menus = {
+      {"cmFile", "&File",
+       {{"cmSaveAs", "&Save Chart as"},
+        {"cmSSavedCht", "Show Sa&ved Chart"},
+        {"cmPageSetup", "Pa&ge Setup"},
+        {"cmPrintChart", "&Print Chart"},
+        {"cmExit", "&Close"}}},
+      {"cmTools", "&Tools",
+       {{"cmChtDef", "&Chart Defaults"},
+        {"cmStkDetails", "Show &Stock Details"},
+        {"cmSuperimpose", "&Superimpose"},
+        {"cmSplitScreen", "S&plit Screen"},
+        {"cmInd", "&Indicators (reversal)"},
+        {"cmChtScroll", "Chart Scroll &Bar"},
+        {"cmGridLines", "&Grid Lines"},
+        {"cmGLSpaces", "Grid &Line spacing "},
+        {"cmText", "&Text"},
+        {"cmRText", "&Remove Text"},
+        {"cmRemAllTrend", "Remove &All Trendlines"},
+        {"cmPFAuto", "Auto &Point and Figure Box Value "},
+        {"cmChtSpaces", "&Change Chart Spacing"},
+        {"cmInsOuts", "Highlight &Outside days on Bar Chart"},
+        {"cmSLInd", "Stop Loss Indicator"}}},
+      {"cmOptions", "O&ptions",
+       {{"cmColours", "&Colours"},
+        {"cmfonts", "&Fonts"},
+        {"cmVHeight", "&Volume Height"},
+        {"cmLineWidth", "&Line Width (Printing)"},
+        {"cmBSpaces", "&Blank space at end of chart"}}},
+      {"cmOscillators", "&Oscillators",
+       {{"cmDirect", "&Directional Movement", "DM"},
+        {"cmCoppock", "&Coppock Indicator", "COP"},
+        {"cmElderRay", "&Elder Ray", "ERY"},
+        {"cmFX", "&FX", "FX"},
+        {"cmJHGrail", "Jones Holy Grail", "JHG"},
+        {"cmMacD", "&MACD Histogram and Classic", "MACD"},
+        {"cmMomentum", "Momen&tum", "MOM"},
+        {"cmMMA", "MM&A (Multiple Moving Averages)"},
+        {"cmOBV", "OB&V (On Balance Volume)", "OBV"},
+        {"cmPara", "&Parabolic", "PARA"},
+        {"cmParaAve", "Parabolic on Average 1", "PARAV"},
+        {"cmROC", "&ROC (Rate of Change)", "ROC"},
+        {"cmROCFX", "RO&C and  FX", "R/F"},
+        {"cmRMO", "RM&O (Relative Movement - all data)", "RMO"},
+        {"cmRMX", "RM&X (Relative Movement - chart data)", "RMX"},
+        {"cmRelStrength", "RS&I (Relative Strength Index)", "RSI"},
+        {"cmStochastic", "&Stochastic (Fast)", "STO"},
+        {"cmSlowStoch", "Stoc&hastic (Slow)", "STO"},
+        {"cmVolt", "Volatility", "VTY"},
+        {"cmWilliams", "&Williams %R", "WMS"},
+        {"cmSwing", "Swin&g"},
+        {"", ""},
+        {"cmMMASet", "MMA Se&ttings"},
+        {"cmuSwingsettings", "Swi&ng Settings"},
+        {"cmuMOS", "Multi-Oscillator Display Selections"}}},
+  };
+  return menus;
+}
+
+const char* CodeOf(const std::string& entry) {
+  for (const Entry& e : Menus().back().entries)
+    if (entry == e.name) return e.code;
+  return "";
+}
+
+int ButtonOf(const std::string& entry) {
+  for (int button = 1; button <= kToolButtons; ++button)
+    if (entry == ToolButtonOf(button).key) return button;
+  return kNoButton;
 }
 
 }  // namespace
 
-Chts::Chts(const ChtsServices& s, QWidget* parent)
+// The client area: a size of its own for each form size, pictures placed by the panes' rules.
+struct Chts::Area : QWidget {
+  Area(Chts* owner) : QWidget(owner), form(owner) { setObjectName("Area"); }
+  QSize minimumSizeHint() const override { return {160, 100}; }
+  QSize sizeHint() const override { return {640, 400}; }
+  void resizeEvent(QResizeEvent*) override { form->SizeChanged(); }
+  // What the pictures leave free looks like them.
+  void paintEvent(QPaintEvent* event) override {
+    QPainter(this).fillRect(event->rect(), QtSurface::Rgb(form->colours()[kBackground]));
+  }
+  Chts* form;
+};
+
+Chts::Chts(const ChtsServices& services, QWidget* parent)
     : QMainWindow(parent),
-      picture_(MakePicture(this)),
-      window_({.files = s.files,
-               .dialogs = s.dialogs,
-               .settings = s.settings,
-               .colours = s.colours,
-               .current = s.current,
-               .price = picture_->surface()}),
-      colours_(s.colours) {
+      s_(services),
+      area_(new Area(this)),
+      picture1_(new PictureBox(area_)),
+      picture2_(new PictureBox(area_)),
+      picture4_(new PictureBox(area_)),
+      window_({.files = services.files,
+               .dialogs = services.dialogs,
+               .settings = services.settings,
+               .ini = services.ini,
+               .user = services.user,
+               .colours = services.colours,
+               .current = services.current,
+               .state = services.state,
+               .price = picture1_->surface(),
+               .panel = picture2_->surface(),
+               .layOut = [this](bool two) { LayOut(two); }}) {
   setObjectName("Chts");
   setAttribute(Qt::WA_DeleteOnClose);
-  setCentralWidget(picture_);
-  setFocusProxy(picture_);
-  RefreshTitle();
-  picture_->Resized = [this] { SurfaceResized(); };
-  picture_->surface().SetBackColour(colours_[kBackground]);
-  picture_->surface().Cls();
+  setContextMenuPolicy(Qt::NoContextMenu);
+  setCentralWidget(area_);
+  for (const auto& [picture, name, text] :
+       {std::tuple{picture1_, "Picture1", "Chart"}, {picture2_, "Picture2(0)", "Oscillator"},
+        {picture4_, "Picture4", "Legend of the reversal marks"}}) {
+    picture->setObjectName(name);
+    picture->setAccessibleName(text);
+    picture->surface().SetBackColour(s_.colours[kBackground]);
+    picture->surface().Cls();
+    if (picture != picture1_) picture->setFocusPolicy(Qt::NoFocus);
+  }
+  picture1_->setMouseTracking(true);
+  picture1_->installEventFilter(this);
+  picture2_->hide();
+  picture2_->surface().SetVisible(false);
+  picture4_->hide();
+  setFocusProxy(picture1_);
+  window_.CrossTouched = [this](const Surface& surface, double x1, double y1, double x2,
+                                double y2) { TouchLine(surface, x1, y1, x2, y2); };
+  BuildMenus();
+  BuildToolBar();
+  BuildStatusBar();
+  BuildFrame();
   // A drag of the frame is many sizes: the chart is composed for the last one that waits.
-  redraw_.setSingleShot(true);
-  redraw_.setInterval(0);
-  redraw_.callOnTimeout(this, [this] {
-    if (composing_ || window_.ChartIndex == 0) return;
-    composing_ = true;
-    window_.Redraw();
-    composing_ = false;
-    picture_->update();
+  resized_.setSingleShot(true);
+  resized_.setInterval(0);
+  resized_.callOnTimeout(this, [this] {
+    if (busy_) sizeWaits_ = true;
+    // A chart that could not be drawn would only say so again at every size.
+    else if (window_.Chart.ChartDrawn || window_.ChartFromFile) Do([this] { window_.Resized(); });
+  });
+  for (PictureBox* picture : {picture1_, picture2_})
+    picture->Resized = [this, picture] {
+      picture->surface().SetBackColour(s_.colours[kBackground]);
+      picture->surface().Cls();
+      window_.ForgetCross();
+      // A hidden panel takes its size when it is needed.
+      if (picture->isVisibleTo(area_) && !window_.Loading && !busy_) resized_.start();
+    };
+  window_.Load();
+  SetForm("OscFrm", s_.forms["OscFrm"]);
+  SetForm("Chart2", s_.forms["Chart2"]);
+  EnableEntries();
+  ShowView();
+}
+
+Chts::~Chts() {
+  window_.CrossTouched = nullptr;
+  window_.Unload();
+}
+
+// ---- What stands on the form
+
+void Chts::BuildMenus() {
+  for (const Menu& each : Menus()) {
+    QMenu* menu = menuBar()->addMenu(each.caption);
+    menu->setObjectName(each.name);
+    for (const Entry& entry : each.entries) {
+      if (!*entry.name) {
+        menu->addSeparator();
+        continue;
+      }
+      const std::string name = entry.name;
+      QAction* action = menu->addAction(entry.caption);
+      action->setObjectName(entry.name);
+      entries_[name] = action;
+      connect(action, &QAction::triggered, this, [this, name] { Trigger(name); });
+    }
+  }
+  for (const char* name : {"cmInd", "cmGridLines", "cmPFAuto", "cmInsOuts", "cmMMA", "cmSwing"})
+    entries_[name]->setCheckable(true);
+}
+
+void Chts::BuildToolBar() {
+  TakeIcons();
+  toolbar1_ = addToolBar("Tool bar");
+  toolbar1_->setObjectName("Toolbar1");
+  toolbar1_->setMovable(false);
+  toolbar1_->setContextMenuPolicy(Qt::PreventContextMenu);
+  toolbar1_->setIconSize({20, 20});
+  for (int button = 1; button <= kToolButtons; ++button) {
+    const ToolButtonText& text = ToolButtonOf(button);
+    for (const int first : {kButtonBack, kButtonBar, kButtonDaily, kButtonGrid, kButtonMulti1})
+      if (button == first) toolbar1_->addSeparator();
+    QAction* action =
+        toolbar1_->addAction(QIcon(QString(":/chts/%1.svg").arg(text.key)), text.tip);
+    action->setToolTip(text.tip);
+    action->setObjectName(text.key);
+    action->setCheckable(true);
+    QWidget* widget = toolbar1_->widgetForAction(action);
+    widget->setObjectName(text.key);
+    widget->setAccessibleName(text.tip);
+    widget->setFocusPolicy(Qt::TabFocus);
+    const std::string name = text.key;
+    entries_[name] = action;
+    connect(action, &QAction::triggered, this, [this, name] { Trigger(name); });
+  }
+}
+
+void Chts::BuildStatusBar() {
+  QStatusBar* bar = statusBar();
+  bar->setObjectName("StatusBar1");
+  bar->setSizeGripEnabled(false);
+  for (size_t i = 0; i < status_.size(); ++i) {
+    status_[i] = new QLabel(bar);
+    status_[i]->setObjectName(QString("StatusBar1(%1)").arg(i + 1));
+    status_[i]->setFrameStyle(QFrame::Panel | (i == 0 ? QFrame::Raised : QFrame::Sunken));
+    // Of one size in both directions: a text that changes lays nothing out.
+    status_[i]->setFixedHeight(status_[i]->sizeHint().height() + 2);
+    bar->addWidget(status_[i]);
+  }
+  // As high with panels as without.
+  bar->setMinimumHeight(status_[0]->height() + 4);
+}
+
+void Chts::BuildFrame() {
+  frame1_ = new QFrame(area_);
+  frame1_->setObjectName("Frame1");
+  frame1_->setAccessibleName("Date limit");
+  frame1_->setFrameStyle(QFrame::StyledPanel | QFrame::Raised);
+  frame1_->setAutoFillBackground(true);
+  frame1_->setCursor(Qt::SizeAllCursor);
+  auto* grid = new QGridLayout(frame1_);
+  grid->setContentsMargins(6, 10, 6, 6);
+  grid->setSpacing(3);
+  static constexpr const char* kUnits[] = {"Day", "Week", "Month"};
+  for (int i = 0; i < 6; ++i) {
+    const bool forward = i < 3;
+    auto* button = new QPushButton(QString("%1 %2").arg(kUnits[i % 3], forward ? "+" : "-"), frame1_);
+    button->setObjectName(QString("Command31(%1)").arg(i));
+    button->setToolTip(QString("The chart ends one %1 %2")
+                           .arg(QString(kUnits[i % 3]).toLower(), forward ? "later" : "earlier"));
+    button->setCursor(Qt::ArrowCursor);
+    button->setAutoDefault(false);
+    grid->addWidget(button, forward ? 0 : 1, i % 3);
+    connect(button, &QPushButton::clicked, this,
+            [this, i] { Do([&] { window_.StepDateLimit(i); }); });
+  }
+  frame1_->installEventFilter(this);
+  frame1_->hide();
+}
+
+void Chts::SetForm(const std::string& entry, std::function<void()> open) {
+  s_.forms[entry] = std::move(open);
+  const std::function<void()>& form = s_.forms[entry];
+  if (entry == "OscFrm") window_.SetOscFrm(form);
+  // Opens once the first chart stands and the window is free for the second.
+  if (entry == "Chart2")
+    window_.SetChart2(!form ? form : [this] { QTimer::singleShot(0, this, s_.forms["Chart2"]); });
+  EnableEntries();
+}
+
+// ---- What the entries do
+
+std::function<void()> Chts::DeedOf(const std::string& entry) {
+  using Deed = std::function<void()>;
+  ChartWindow& w = window_;
+  const auto deed = [this](auto work) -> Deed { return [this, work] { Do(work); }; };
+  const bool xs = s_.settings.words.OptionXS;
+  if (entry == "cmSaveAs") return [this] { SaveAs(); };
+  if (entry == "cmSSavedCht") return [this] { ShowSaved(); };
+  if (entry == "cmExit") return [this] { CloseWindow(); };
+  if (entry == "cmGridLines") return deed([&w] { w.ToggleGridLines(); });
+  if (entry == "cmInd") return deed([&w] { w.ToggleReversals(); });
+  if (entry == "cmInsOuts" && xs) return deed([&w] { w.ToggleOutsideDays(); });
+  if (entry == "cmMMA") return deed([&w] { w.ToggleMMA(); });
+  if (entry == "cmPFAuto") return deed([&w] { w.TogglePFAuto(); });
+  if (entry == "cmSuperimpose" && s_.forms["Chart2"]) return deed([&w] { w.StartSuperimpose(); });
+  if (entry == "cmSplitScreen" && s_.forms["Chart2"]) return deed([&w] { w.StartSplitScreen(); });
+  if (entry == "cmParaAve" && !s_.settings.words.OptionXT) return {};
+  if (const char* code = CodeOf(entry); *code)
+    return deed([&w, code, slow = entry == "cmSlowStoch"] { w.PickOscillator(code, slow); });
+  switch (ButtonOf(entry)) {
+    case kButtonRefresh: return deed([&w] { w.Refresh(); });
+    case kButtonBack:
+    case kButtonForward:
+      return deed([&w, forward = entry == "fwd"] {
+        w.state().ChartDirection = forward ? 1 : 0;
+        w.SetTB(w.GridOn() ? kButtonGrid : kNoButton);
+        if (w.HasChart()) w.StepChart();
+        else w.NextChart();
+      });
+    case kButtonBar: return deed([&w] { w.SetStyle('B'); });
+    case kButtonCandle: return deed([&w] { w.SetStyle('C'); });
+    case kButtonLine: return deed([&w] { w.SetStyle('L'); });
+    case kButtonDaily: return deed([&w] { w.SetPeriod("A"); });
+    case kButtonWeekly: return deed([&w] { w.SetPeriod("W"); });
+    case kButtonMonthly: return deed([&w] { w.SetPeriod("M"); });
+    case kButtonGrid: return deed([&w] { w.ToggleGrid(); });
+    default: break;
+  }
+  const std::string form = entry == "cspace" ? "cmChtSpaces" : entry;
+  if (entry == "cmSLInd" && !xs) return {};
+  if (!s_.forms[form]) return {};
+  return [this, form] { OpenForm(form); };
+}
+
+void Chts::EnableEntries() {
+  for (const auto& [name, action] : entries_) action->setEnabled(bool(DeedOf(name)));
+}
+
+void Chts::Trigger(const std::string& entry) {
+  const QPointer<Chts> alive(this);
+  if (const auto deed = DeedOf(entry); deed && !busy_) deed();
+  // A click has flipped the tick of the entry already; what it says is the window's to tell.
+  if (alive) ShowView();
+}
+
+void Chts::OpenForm(const std::string& entry) {
+  ChartState& state = window_.state();
+  if (entry == "cmChtSpaces" && state.ChartStyle == 'P') return;
+  Do([&] {
+    if (entry == "new") window_.StartNewChart();
+    if (entry == "cmColours" || entry == "cmSLInd") window_.CancelChartTools();
+    if (entry == "cmColours") state.ChartTask = kTaskColours;
+    if (entry == "cmChtDef") state.ChartTask = kTaskChartDefaults;
+    if (entry == "cmPageSetup" || entry == "cmPrintChart")
+      window_.StartPrinting(entry == "cmPrintChart");
+  });
+  // The form may ask for a chart, or close this window with it.
+  const QPointer<Chts> alive(this);
+  s_.forms[entry]();
+  if (!alive) return;
+  if (entry == "cmChtDef" || entry == "cmColours") state.ChartTask = kTaskNone;
+  Do([&] {
+    if (entry == "cmSLInd") window_.Recompose();
   });
 }
 
-void Chts::RefreshTitle() { setWindowTitle(QString::fromStdString(window_.Title())); }
-
 void Chts::Start() {
-  window_.Loading = false;
-  if (window_.ChartIndex == 0) Step(1);
+  if (window_.HasChart()) return;
+  Do([this] { window_.NextChart(); });
 }
 
-void Chts::Step(int direction) {
-  // A message of the chart before may still stand.
-  if (composing_) return;
-  composing_ = true;
-  window_.ChartDirection = std::int16_t(direction);
-  if (window_.ChartIndex == 0) window_.NextChart();
-  else window_.StepChart();
-  composing_ = false;
-  redraw_.stop();
-  picture_->update();
+void Chts::Command2() {
+  Do([this] { window_.NextChart(); });
 }
 
-void Chts::SurfaceResized() {
-  picture_->surface().SetBackColour(colours_[kBackground]);
-  picture_->surface().Cls();
-  // A chart that could not be drawn would only say so again at every size.
-  if (!window_.Loading && window_.Chart.ChartDrawn) redraw_.start();
+void Chts::Refresh() {
+  Do([this] { window_.Refresh(); });
+}
+
+QSizeF Chts::ChartSize() const {
+  const Surface& price = picture1_->surface();
+  const Surface& panel = picture2_->surface();
+  const bool below = picture2_->isVisibleTo(area_);
+  return {price.ScaleWidth(), price.ScaleHeight() + (below ? panel.ScaleHeight() : 0)};
+}
+
+void Chts::RefreshTitle() {
+  window_.RefreshTitle();
+  ShowView();
+}
+
+template <typename Deed>
+void Chts::Do(Deed deed) {
+  if (busy_) return;
+  busy_ = true;
+  try {
+    deed();
+  } catch (const RunTimeError& e) {
+    s_.dialogs.SetBusy(false);
+    s_.dialogs.Message(e.what(), "Charts");
+  }
+  busy_ = false;
+  ShowView();
+  picture1_->update();
+  picture2_->update();
+  if (std::exchange(sizeWaits_, false)) resized_.start();
+}
+
+// ---- Showing
+
+void Chts::ShowView() {
+  const ChartWindowView& view = window_.view();
+  const ChartState& state = window_.state();
+  setWindowTitle(ToQt(view.Title));
+  ShowStatus();
+  for (int button = 1; button <= kToolButtons; ++button)
+    entries_[ToolButtonOf(button).key]->setChecked(button == view.TB);
+  entries_["cmInd"]->setChecked(state.ReversalsOn);
+  entries_["cmGridLines"]->setChecked(s_.settings.charts.GridLines);
+  entries_["cmPFAuto"]->setChecked(state.PFAutoBox);
+  entries_["cmInsOuts"]->setChecked(state.OutsideDaysOn);
+  entries_["cmMMA"]->setChecked(state.MMAOn);
+  entries_["cmSwing"]->setChecked(state.SwingOn);
+  PlaceLegend();
+  if (view.FrameShown) {
+    frame1_->adjustSize();
+    QPoint place = frame1_->pos();
+    if (view.Frame) place = QPoint(int(std::lround(view.Frame->left)), int(std::lround(view.Frame->top)));
+    else if (!frameStood_) place = QPoint(60, 60);
+    // Within reach, whatever was kept.
+    place.setX(std::clamp(place.x(), 0, std::max(0, area_->width() - frame1_->width())));
+    place.setY(std::clamp(place.y(), 0, std::max(0, area_->height() - frame1_->height())));
+    frame1_->move(place);
+    frameStood_ = true;
+  }
+  frame1_->setEnabled(view.FrameShown);
+  frame1_->setVisible(view.FrameShown);
+}
+
+void Chts::ShowStatus() {
+  const ChartWindowView& view = window_.view();
+  for (size_t i = 0; i < status_.size(); ++i) {
+    const QString text = ToQt(view.Panels[i]);
+    if (status_[i]->text() != text) status_[i]->setText(text);
+    if (status_[i]->isVisibleTo(statusBar()) != view.PanelShown[i])
+      status_[i]->setVisible(view.PanelShown[i]);
+  }
+}
+
+void Chts::LayOut(bool twoPanes) {
+  twoPanes_ = twoPanes;
+  const PaneLayout panes =
+      LayOutPanes(area_->width(), area_->height() + statusBar()->height(), 0,
+                  statusBar()->height(), twoPanes);
+  picture1_->Place(QRect(0, 0, int(panes.width), int(panes.price)));
+  const bool second = panes.panel > 0;
+  if (second) picture2_->Place(QRect(0, int(panes.panelTop), int(panes.width), int(panes.panel)));
+  picture2_->setVisible(second);
+  picture2_->surface().SetVisible(second);
+  PlaceLegend();
+}
+
+void Chts::PlaceLegend() {
+  const bool shown = window_.view().LegendShown;
+  if (shown) {
+    picture4_->Place(QRect(picture1_->geometry().right() + 1 - int(kLegendWidth),
+                           picture1_->geometry().bottom() + 1 - int(kLegendHeight),
+                           int(kLegendWidth), int(kLegendHeight)));
+    picture4_->surface().SetBackColour(s_.colours[kBackground]);
+    picture4_->surface().Cls();
+    DrawReversalLegend(picture4_->surface(), s_.settings.fonts, s_.colours);
+    picture4_->update();
+  }
+  picture4_->setVisible(shown);
+}
+
+void Chts::SizeChanged() {
+  const StatusWidths widths = StatusBarWidths(width());
+  // A price of three digits has room in every panel; where it has not, the letters are smaller.
+  QFont font = statusBar()->font();
+  const auto needed = [&] { return QFontMetricsF(font).horizontalAdvance("Close  000.00") + 8; };
+  while (needed() > widths.each && font.pointSizeF() > 6.5) font.setPointSizeF(font.pointSizeF() - 0.5);
+  for (size_t i = 0; i < status_.size(); ++i) {
+    if (!status_[i]) continue;
+    status_[i]->setFont(font);
+    status_[i]->setFixedWidth(i + 1 < status_.size() ? widths.each : widths.last);
+  }
+  if (status_[0] == nullptr || window_.Loading) return;
+  if (busy_) sizeWaits_ = true;
+  LayOut(twoPanes_);
+}
+
+void Chts::TouchLine(const Surface& surface, double x1, double y1, double x2, double y2) {
+  PictureBox* picture = &surface == &picture1_->surface() ? picture1_ : picture2_;
+  // The panel may have a scale of its own.
+  const double fx = picture->width() / surface.ScaleWidth();
+  const double fy = picture->height() / surface.ScaleHeight();
+  picture->update(QRectF(QPointF(std::min(x1, x2) * fx, std::min(y1, y2) * fy),
+                         QPointF(std::max(x1, x2) * fx, std::max(y1, y2) * fy))
+                      .adjusted(-2, -2, 3, 3)
+                      .toAlignedRect());
+}
+
+// ---- Files
+
+void Chts::SaveAs() {
+  Do([this] { window_.StartSaving(); });
+  std::optional<std::string> path;
+  const Paths& paths = s_.settings.paths;
+  if (s_.pickSaved) {
+    path = s_.pickSaved(window_.SuggestedName());
+  } else {
+    QFileDialog dialog(this, "Save Chart As ...");
+    dialog.setObjectName("SaveKora");
+    dialog.setAcceptMode(QFileDialog::AcceptSave);
+    dialog.setFileMode(QFileDialog::AnyFile);
+    dialog.setOption(QFileDialog::DontConfirmOverwrite);  // the question is the window's own
+    dialog.setNameFilters({"Saved charts (*.cht)", "Pictures (*.png)", "Drawings (*.svg)",
+                           "Documents (*.pdf)"});
+    dialog.setDefaultSuffix("cht");
+    QObject::connect(&dialog, &QFileDialog::filterSelected, &dialog, [&dialog](const QString& f) {
+      const QString ending = f.section("*.", 1).chopped(1);
+      dialog.setDefaultSuffix(ending);
+      if (dialog.selectedFiles().isEmpty()) return;
+      dialog.selectFile(QFileInfo(dialog.selectedFiles().first()).completeBaseName() + "." + ending);
+    });
+    try {
+      dialog.setDirectory(ToQt(s_.files.HostPath(paths.ChartSavePath)));
+    } catch (const RunTimeError&) {
+      // A folder that can't be one: the dialog opens where it likes.
+    }
+    dialog.selectFile(ToQt(window_.SuggestedName()));
+    if (dialog.exec() == QDialog::Accepted && !dialog.selectedFiles().isEmpty())
+      path = s_.files.DosPath(dialog.selectedFiles().first().toStdString());
+  }
+  Do([&] {
+    window_.SaveChartAs(path, [this](const std::string& file) { return MakePictureFile(file); });
+  });
+}
+
+std::string Chts::MakePictureFile(const std::string& path) {
+  const QtRasterSurface& price = picture1_->surface();
+  const bool panel = picture2_->isVisibleTo(area_);
+  const PictureSize size{price.Width(), price.Height(),
+                         panel ? picture2_->surface().Height() : 0, 2};
+  bool drawn = false;
+  std::string bytes = MakePicture(PictureKindOf(path), size, [&](Surface& upper, Surface* lower) {
+    drawn = window_.DrawAgain(upper, lower);
+  });
+  if (!drawn) throw RunTimeError(kNoPicture);
+  return bytes;
+}
+
+void Chts::ShowSaved() {
+  Do([this] { window_.CancelChartTools(); });
+  std::optional<std::string> path;
+  if (s_.pickToShow) {
+    path = s_.pickToShow();
+  } else {
+    QString folder;
+    try {
+      folder = ToQt(s_.files.HostPath(s_.settings.paths.ChartSavePath));
+    } catch (const RunTimeError&) {
+    }
+    const QString file = QFileDialog::getOpenFileName(this, "Display Saved Chart", folder,
+                                                      "Saved charts (*.cht)");
+    if (!file.isEmpty()) path = s_.files.DosPath(file.toStdString());
+  }
+  if (path) Do([&] { window_.ShowSaved(*path); });
+}
+
+QImage Chts::Picture() {
+  QImage both;
+  window_.WithoutCross([&] {
+    const QImage& upper = picture1_->surface().image();
+    if (!picture2_->isVisibleTo(area_)) {
+      both = upper.copy();
+      return;
+    }
+    const QImage& lower = picture2_->surface().image();
+    both = QImage(upper.width(), upper.height() + lower.height(), QImage::Format_RGB32);
+    both.fill(QtSurface::Rgb(s_.colours[kBackground]));
+    for (int y = 0; y < both.height(); ++y) {
+      const QImage& from = y < upper.height() ? upper : lower;
+      const int row = y < upper.height() ? y : y - upper.height();
+      std::copy_n(from.constScanLine(row), size_t(std::min(from.width(), both.width())) * 4,
+                  both.scanLine(y));
+    }
+  });
+  both.setDevicePixelRatio(1);
+  return both;
+}
+
+void Chts::CopyPicture() { QGuiApplication::clipboard()->setImage(Picture()); }
+
+// ---- Mouse and keys
+
+bool Chts::eventFilter(QObject* object, QEvent* event) {
+  if (object == picture1_ && PictureEvent(event)) return true;
+  if (object == frame1_ && FrameEvent(event)) return true;
+  return QMainWindow::eventFilter(object, event);
+}
+
+bool Chts::PictureEvent(QEvent* event) {
+  if (busy_) return false;
+  if (event->type() == QEvent::MouseMove) {
+    if (!window_.GridOn()) return false;
+    const QPointF at = static_cast<QMouseEvent*>(event)->position();
+    window_.MouseMove(std::floor(at.x()), std::floor(at.y()));
+    ShowStatus();
+  } else if (event->type() == QEvent::MouseButtonRelease &&
+             static_cast<QMouseEvent*>(event)->button() == Qt::LeftButton) {
+    if (window_.GridOn()) Do([this] { window_.MouseClick(); });
+  }
+  return false;
+}
+
+bool Chts::FrameEvent(QEvent* event) {
+  const auto mouse = [&] { return static_cast<QMouseEvent*>(event); };
+  if (event->type() == QEvent::MouseButtonPress && mouse()->button() == Qt::LeftButton) {
+    frameGrip_ = mouse()->position().toPoint();
+    frameDragged_ = false;
+    return true;
+  }
+  if (event->type() == QEvent::MouseMove && (mouse()->buttons() & Qt::LeftButton)) {
+    const QPoint at = mouse()->position().toPoint();
+    if (!frameDragged_ && (at - frameGrip_).manhattanLength() < QApplication::startDragDistance())
+      return true;
+    frameDragged_ = true;
+    frame1_->move(frame1_->mapToParent(at) - frameGrip_);
+    return true;
+  }
+  if (event->type() == QEvent::MouseButtonRelease && frameDragged_) {
+    frameDragged_ = false;
+    const QPoint at = frame1_->mapTo(area_, mouse()->position().toPoint());
+    Do([&] { window_.DropFrame(at.x(), at.y(), frame1_->width(), frame1_->height()); });
+    return true;
+  }
+  return false;
+}
+
+// The frame around this window has menus of its own, some under the same letters: where this
+// window has the keys, its own menus open.
+bool Chts::OpenMenuByKey(QKeyEvent* event, bool open) {
+  if (event->modifiers() != Qt::AltModifier || event->key() < Qt::Key_A ||
+      event->key() > Qt::Key_Z)
+    return false;
+  const QString mnemonic = QString("&") + QChar(event->key());
+  for (QAction* menu : menuBar()->actions())
+    if (menu->text().contains(mnemonic, Qt::CaseInsensitive)) {
+      if (open) menuBar()->setActiveAction(menu);
+      return true;
+    }
+  return false;
+}
+
+bool Chts::event(QEvent* event) {
+  if (event->type() == QEvent::ShortcutOverride &&
+      OpenMenuByKey(static_cast<QKeyEvent*>(event), false)) {
+    event->accept();
+    return true;
+  }
+  return QMainWindow::event(event);
 }
 
 void Chts::keyPressEvent(QKeyEvent* event) {
-  if (event->key() == Qt::Key_PageDown) Step(1);
-  else if (event->key() == Qt::Key_PageUp) Step(0);
-  else QMainWindow::keyPressEvent(event);
+  // Some window managers leave the keyboard here when a message over a form is closed.
+  if (QApplication::activeModalWidget()) return;
+  const bool plain = (event->modifiers() & ~Qt::KeypadModifier) == Qt::NoModifier;
+  if (OpenMenuByKey(event, true)) return;
+  if (event == QKeySequence::Save) return Trigger("cmSaveAs");
+  if (event == QKeySequence::Copy) return CopyPicture();
+  if (event == QKeySequence::Print) return Trigger("cmPrintChart");
+  const auto cross = [this](auto work) {
+    if (busy_ || !window_.HasChart()) return;
+    work();
+    ShowView();
+  };
+  switch (plain ? event->key() : 0) {
+    case Qt::Key_PageDown: return Trigger("fwd");
+    case Qt::Key_PageUp: return Trigger("rev");
+    case Qt::Key_F5: return Trigger("ref");
+    case Qt::Key_Left: return cross([this] { window_.MoveCross(-1); });
+    case Qt::Key_Right: return cross([this] { window_.MoveCross(1); });
+    case Qt::Key_Home: return cross([this] { window_.CrossToEnd(false); });
+    case Qt::Key_End: return cross([this] { window_.CrossToEnd(true); });
+    case Qt::Key_Escape: return Do([this] { window_.CancelChartTools(); });
+    default: QMainWindow::keyPressEvent(event);
+  }
+}
+
+void Chts::CloseWindow() {
+  if (busy_) return;
+  Do([this] { window_.CancelChartTools(); });
+  // Within the frame it is the subwindow that closes, and this form in it.
+  if (auto* sub = qobject_cast<QMdiSubWindow*>(parentWidget())) sub->close();
+  else close();
 }
 
 // A composition lets events run; the window has to outlive it.
 void Chts::closeEvent(QCloseEvent* event) {
-  if (composing_) event->ignore();
-  else QMainWindow::closeEvent(event);
+  if (busy_) {
+    event->ignore();
+    return;
+  }
+  QMainWindow::closeEvent(event);
+  if (event->isAccepted() && s_.closed) s_.closed();
 }
 
 }  // namespace kora

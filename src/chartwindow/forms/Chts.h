@@ -1,10 +1,21 @@
 #pragma once
 
 #include <QMainWindow>
+#include <QSizeF>
 #include <QTimer>
+#include <array>
+#include <functional>
+#include <map>
+#include <optional>
+#include <string>
 
 #include "chartwindow/chart_window.h"
 #include "platform/qt/picture_box.h"
+
+class QFrame;
+class QLabel;
+class QPushButton;
+class QToolBar;
 
 namespace kora {
 
@@ -12,35 +23,107 @@ namespace kora {
 struct ChtsServices {
   const Files& files;
   Dialogs& dialogs;
-  const Settings& settings;
+  Settings& settings;
+  SettingsFile& ini;
+  SettingsFile& user;
   const ChartColours& colours;
   CurrentName& current;
+  ChartState& state;
+
+  // The forms of others, by the entry that opens them: "cmChtDef", "cmColours", "cmfonts",
+  // "cmBSpaces", "cmGLSpaces", "cmLineWidth", "cmVHeight", "cmMMASet", "cmChtSpaces" (the tool
+  // bar's "cspace" too), "cmSLInd"; "new" for chart selection, "Chart2" for the second chart of
+  // a pair, "OscFrm" for the settings box. They run until the form is closed, but for Chart2
+  // which may stand beside the window, and call Refresh(), Command2() or, as OscFrm does,
+  // window().ShowOscillator() as their rules say. An entry without one is greyed.
+  std::map<std::string, std::function<void()>> forms = {};
+
+  // Ask for a file: DOS paths, nothing when cancelled. Empty: the platform's own dialogs.
+  std::function<std::optional<std::string>(const std::string& suggested)> pickSaved = {};
+  std::function<std::optional<std::string>()> pickToShow = {};
+  // The window was closed by its user.
+  std::function<void()> closed = {};
 };
 
 // The chart window, a child of the main window.
 class Chts : public QMainWindow {
  public:
   explicit Chts(const ChtsServices& services, QWidget* parent = nullptr);
+  ~Chts() override;
 
   ChartWindow& window() { return window_; }
+  const ChartColours& colours() const { return s_.colours; }
+  // Gives an entry its form, or takes it away.
+  void SetForm(const std::string& entry, std::function<void()> open);
+
   // Shows the first chart. To be called once the form has its size.
   void Start();
+  // The hidden buttons: the next chart (chart selection has put ChartIndex one before it), and
+  // the current one once more.
+  void Command2();
+  void Refresh();
   // After the data folder changed.
   void RefreshTitle();
+  // Size of the chart on show in its units, the oscillator below it included.
+  QSizeF ChartSize() const;
+  // The chart as a picture: both panes.
+  QImage Picture();
 
  protected:
+  bool event(QEvent* event) override;
+  bool eventFilter(QObject* object, QEvent* event) override;
   void keyPressEvent(QKeyEvent* event) override;
   void closeEvent(QCloseEvent* event) override;
 
  private:
-  void Step(int direction);
-  void SurfaceResized();
+  struct Area;
 
-  PictureBox* picture_;
+  void BuildMenus();
+  void BuildToolBar();
+  void BuildStatusBar();
+  void BuildFrame();
+  // What an entry does, if the window can do it by itself or by a form of others.
+  std::function<void()> DeedOf(const std::string& entry);
+  void EnableEntries();
+  void Trigger(const std::string& entry);
+
+  // Runs one thing that the user asked for and shows what came of it. While a message of it
+  // stands nothing else starts.
+  template <typename Deed>
+  void Do(Deed deed);
+  void ShowView();
+  void ShowStatus();
+  void LayOut(bool twoPanes);
+  void PlaceLegend();
+  void SizeChanged();
+  void OpenForm(const std::string& entry);
+  void SaveAs();
+  void ShowSaved();
+  void CopyPicture();
+  std::string MakePictureFile(const std::string& path);
+  void CloseWindow();
+  bool OpenMenuByKey(QKeyEvent* event, bool open);
+  bool PictureEvent(QEvent* event);
+  bool FrameEvent(QEvent* event);
+  void TouchLine(const Surface& surface, double x1, double y1, double x2, double y2);
+
+  ChtsServices s_;
+  QWidget* area_;
+  PictureBox* picture1_;
+  PictureBox* picture2_;
+  PictureBox* picture4_;
+  QFrame* frame1_ = nullptr;
+  QToolBar* toolbar1_ = nullptr;
+  std::array<QLabel*, ChartWindowView::kPanels> status_{};
+  std::map<std::string, QAction*> entries_;
   ChartWindow window_;
-  const ChartColours& colours_;
-  QTimer redraw_;
-  bool composing_ = false;
+  QTimer resized_;
+  bool twoPanes_ = false;
+  bool busy_ = false;
+  bool sizeWaits_ = false;
+  bool frameStood_ = false;  // it was shown where it is
+  QPoint frameGrip_;
+  bool frameDragged_ = false;
 };
 
 }  // namespace kora

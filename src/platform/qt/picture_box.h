@@ -13,6 +13,9 @@ class PictureBox : public QWidget {
   explicit PictureBox(QWidget* parent = nullptr);
 
   QtRasterSurface& surface() { return surface_; }
+  // Moves and sizes the widget, its surface with it at once, shown or not.
+  void Place(const QRect& place);
+
   // Called when the surface has taken a new size; it is blank then.
   std::function<void()> Resized;
 

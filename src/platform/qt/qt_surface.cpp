@@ -1,6 +1,5 @@
 #include "platform/qt/qt_surface.h"
 
-#include <QFontDatabase>
 #include <QFontMetricsF>
 #include <algorithm>
 #include <cmath>
@@ -8,6 +7,8 @@
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
+#include "platform/qt/chart_font.h"
+#include "platform/qt/line_cut.h"
 #include "platform/text_metrics.h"
 
 namespace kora {
@@ -20,13 +21,6 @@ constexpr double kMostPixels = 20000;
 
 bool Finite(double a, double b, double c, double d) {
   return std::isfinite(a) && std::isfinite(b) && std::isfinite(c) && std::isfinite(d);
-}
-
-bool CanBeFace(const SurfaceFont& font) {
-  if (font.name.size() > 200 || !(font.size >= 1 && font.size <= 2048)) return false;
-  return std::none_of(font.name.begin(), font.name.end(), [](char c) {
-    return static_cast<unsigned char>(c) < 32 || c == 127;
-  });
 }
 
 // 96 dots to the inch, so that a point is 96/72 units.
@@ -82,22 +76,12 @@ QtSurface::Face& QtSurface::face() const {
 
   auto made = std::make_unique<Face>();
   made->key = font_;
-  made->standard = HasStandardMetrics(font_) || !QFontDatabase::hasFamily(ToQt(font_.name));
-  QFont& font = made->font;
-  if (made->standard) {
-    font.setFamilies({"Liberation Sans", "Arial", "Helvetica", "sans-serif"});
-  } else {
-    font.setFamilies({ToQt(font_.name), "Liberation Sans", "Arial"});
-  }
-  font.setStyleHint(QFont::SansSerif);
-  font.setHintingPreference(QFont::PreferNoHinting);
-  font.setBold(font_.bold);
-  font.setItalic(font_.italic);
-  font.setKerning(false);
-  font.setPointSizeF(font_.size);
+  ChartFont font = MakeChartFont(font_);
+  made->standard = font.standard;
+  made->font = std::move(font.font);
   QImage dots(1, 1, QImage::Format_RGB32);
   SetDots(dots);
-  const QFontMetricsF metrics(font, &dots);
+  const QFontMetricsF metrics(made->font, &dots);
   made->qtAscent = metrics.ascent();
   made->ascent = made->standard ? StandardAscent(font_) : metrics.ascent();
   made->height = made->standard ? StandardTextHeight(font_) : std::ceil(metrics.height());
@@ -380,15 +364,8 @@ void QtPainterSurface::Line(double x1, double y1, double x2, double y2, Colour c
   double ax = x1 + 0.5 - ux, ay = y1 + 0.5 - uy;
   const double lx = dx + 2 * ux, ly = dy + 2 * uy;
 
-  // Cut to the surface, so that no medium meets coordinates that it can't write.
-  double from = 0, to = 1;
-  const auto cut = [&](double p, double q) {  // keeps t with p * t <= q
-    if (p == 0) return q >= 0;
-    if (p < 0) from = std::max(from, q / p);
-    else to = std::min(to, q / p);
-    return from < to;
-  };
-  if (!cut(-lx, ax) || !cut(lx, width_ - ax) || !cut(-ly, ay) || !cut(ly, height_ - ay)) return;
+  double from, to;
+  if (!CutLine(ax, ay, lx, ly, width_, height_, from, to)) return;
   const double length = std::hypot(lx, ly);
 
   QPen pen{QColor(Rgb(colour))};

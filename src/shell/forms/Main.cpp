@@ -31,7 +31,13 @@ QString ToQt(std::string_view text) {
 }  // namespace
 
 Main::Main(Session& session, std::string commandLine)
-    : session_(session), commandLine_(std::move(commandLine)), mdi_(new QMdiArea(this)) {
+    : session_(session),
+      commandLine_(std::move(commandLine)),
+      mdi_(new QMdiArea(this)),
+      desk_(
+          session, this, mdi_,
+          [this] { ReadPaths(session_.ini, session_.files, session_.dialogs, session_.settings); },
+          [this] { EnableMenus(); }) {
   setObjectName("Main");
   mdi_->setObjectName("MDI");
   mdi_->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
@@ -70,7 +76,14 @@ void Main::BuildMenu() {
 }
 
 void Main::SetOpeners() {
-  SetOpener("mnuChartDisplay", [this] { OpenCharts(); });
+  SetOpener("mnuChartDisplay", [this] { desk_.OpenCharts(); });
+  SetOpener("mnuChartDefaults", [this] { desk_.OpenDefaults(); });
+  SetOpener("mnFnts", [this] { desk_.OpenFonts(); });
+  SetOpener("mnTPSU", [this] { desk_.OpenTextPage(); });
+  SetOpener("mnPrSU", [this] { desk_.OpenPrinterSetup(); });
+  SetOpener("mnuLists", [this] { desk_.OpenLists(); });
+  SetOpener("mnuListsUte", [this] { desk_.OpenListUtilities(); });
+  SetOpener("mnuRenameCL", [this] { desk_.OpenListNames(); });
   SetOpener("mnuPaths", [this] { OpenPaths(); });
   SetOpener("mnuExit", [this] { EndProgram(); });
   SetOpener("mnuPntCol", [this] { AskPrinter(); });
@@ -132,7 +145,7 @@ void Main::EnableMenus() {
 
 void Main::SetTitle() {
   setWindowTitle(QString::fromStdString(MainTitle(session_.settings.paths)));
-  if (chts_) chts_->RefreshTitle();
+  desk_.PathsChanged();
 }
 
 void Main::TakeSize() {
@@ -154,27 +167,6 @@ void Main::KeepSize() {
   const QSize size = isMaximized() || isFullScreen() ? normalGeometry().size() : this->size();
   session_.SaveUserSetting("Height", Str(std::int32_t(size.height() * kTwipsPerPixel)));
   session_.SaveUserSetting("Width", Str(std::int32_t(size.width() * kTwipsPerPixel)));
-}
-
-void Main::OpenCharts() {
-  if (chts_) {
-    mdi_->setActiveSubWindow(qobject_cast<QMdiSubWindow*>(chts_->parentWidget()));
-    chts_->setFocus();
-    return;
-  }
-  chts_ = new Chts({.files = session_.files,
-                    .dialogs = session_.dialogs,
-                    .settings = session_.settings,
-                    .colours = session_.colours,
-                    .current = session_.current});
-  QMdiSubWindow* frame = mdi_->addSubWindow(chts_);
-  frame->setAttribute(Qt::WA_DeleteOnClose);
-  frame->setGeometry(mdi_->viewport()->rect());
-  frame->show();
-  chts_->setFocus();
-  // With the layout done the picture has its size.
-  QApplication::sendPostedEvents();
-  if (chts_) chts_->Start();
 }
 
 bool Main::OpenPaths() {

@@ -6,8 +6,8 @@
 #include <map>
 #include <string>
 
-#include "chartwindow/forms/Chts.h"
 #include "settings/forms/CPath.h"
+#include "shell/forms/chart_desk.h"
 #include "shell/session.h"
 
 class QMdiArea;
@@ -31,9 +31,8 @@ class Main : public QMainWindow {
   // The folder form, asking first where the paths are missing. False when the program ends
   // instead.
   bool OpenPaths();
-  void OpenCharts();
 
-  Chts* charts() const { return chts_; }
+  Chts* charts() const { return desk_.window(); }
 
  protected:
   void closeEvent(QCloseEvent* event) override;
@@ -54,7 +53,7 @@ class Main : public QMainWindow {
   Session& session_;
   std::string commandLine_;
   QMdiArea* mdi_;
-  QPointer<Chts> chts_;
+  ChartDesk desk_;
   QPointer<CPath> cpath_;
   QPointer<QWidget> help_;
   std::map<std::string, std::function<void()>> openers_;

@@ -1,0 +1,143 @@
+// Living in the chart window: paging through the demo market, moving the cross hair, playing a
+// saved chart beside composing it. The floor of a page is the composition alone (ComposeAndDraw).
+#include <benchmark/benchmark.h>
+
+#include <QApplication>
+#include <QMouseEvent>
+#include <filesystem>
+#include <memory>
+
+#include "chart/script_player.h"
+#include "chartwindow/forms/Chts.h"
+#include "demo/demo_market.h"
+#include "platform/headless/console_dialogs.h"
+
+namespace {
+
+using namespace kora;
+namespace fs = std::filesystem;
+
+// A home with the demo market, gone at the end.
+struct Market {
+  std::string path;
+  std::unique_ptr<Files> files;
+  std::unique_ptr<SettingsFile> ini, user;
+  ConsoleDialogs dialogs;
+  Settings settings;
+  ChartColours colours{};
+  CurrentName current;
+  ChartState state;
+
+  Market() {
+    std::string name = (fs::temp_directory_path() / "kora_window_bench_XXXXXX").string();
+    path = mkdtemp(name.data());
+    files = std::make_unique<Files>(path);
+    ini = std::make_unique<SettingsFile>(*files, "C:\\WINDOWS\\Kora.ini");
+    user = std::make_unique<SettingsFile>(*files, "C:\\WINDOWS\\KoraUser.ini");
+    MakeDemo(*files, *ini, *user, dialogs, {});
+    settings.paths.WindowsPath = "C:\\WINDOWS\\";
+    ReadPaths(*ini, *files, dialogs, settings);
+    LoadUserColours(*files, settings.paths.SystemPath, colours);
+  }
+  ~Market() {
+    std::error_code ignored;
+    fs::remove_all(path, ignored);
+  }
+  ChartWindow Window(QtRasterSurface& price, QtRasterSurface& panel) {
+    panel.SetVisible(false);
+    return ChartWindow({.files = *files, .dialogs = dialogs, .settings = settings, .ini = *ini,
+                        .user = *user, .colours = colours, .current = current, .state = state,
+                        .price = price, .panel = panel});
+  }
+};
+
+void PageForward(benchmark::State& bench) {
+  Market market;
+  QtRasterSurface price(double(bench.range(0)), double(bench.range(1)));
+  QtRasterSurface panel(double(bench.range(0)), 144);
+  ChartWindow window = market.Window(price, panel);
+  window.Load();
+  market.state.ChartDirection = 1;
+  for (auto _ : bench)
+    if (!window.StepChart()) {
+      bench.SkipWithError("not drawn");
+      break;
+    }
+  bench.counters["charts_per_s"] =
+      benchmark::Counter(double(bench.iterations()), benchmark::Counter::kIsRate);
+}
+
+// Rules and pixels of one move: both lines taken away, both drawn, the read-out.
+void CrossMove(benchmark::State& bench) {
+  Market market;
+  QtRasterSurface price(double(bench.range(0)), double(bench.range(1)));
+  QtRasterSurface panel(double(bench.range(0)), 144);
+  ChartWindow window = market.Window(price, panel);
+  window.Load();
+  window.NextChart();
+  window.ToggleGrid();
+  double x = 50;
+  for (auto _ : bench) {
+    window.MouseMove(x, 200);
+    x = x > 600 ? 50 : x + 1;
+  }
+}
+
+// The same through the form: the event, the status bar, and the painting of what changed.
+void CrossMoveForm(benchmark::State& bench) {
+  Market market;
+  auto* form = new Chts({.files = *market.files, .dialogs = market.dialogs,
+                         .settings = market.settings, .ini = *market.ini, .user = *market.user,
+                         .colours = market.colours, .current = market.current,
+                         .state = market.state});
+  form->resize(int(bench.range(0)), int(bench.range(1)));
+  form->show();
+  QCoreApplication::processEvents();
+  form->Start();
+  form->window().ToggleGrid();
+  auto* picture = form->findChild<QWidget*>("Picture1");
+  QCoreApplication::processEvents();
+  double x = 50;
+  for (auto _ : bench) {
+    QMouseEvent move(QEvent::MouseMove, {x, 200}, picture->mapToGlobal(QPointF(x, 200)),
+                     Qt::NoButton, Qt::NoButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(picture, &move);
+    QCoreApplication::processEvents();
+    x = x > 600 ? 50 : x + 1;
+  }
+  delete form;
+}
+
+void SavedChart(benchmark::State& bench, bool play) {
+  Market market;
+  QtRasterSurface price(638, 452), panel(638, 144);
+  ChartWindow window = market.Window(price, panel);
+  window.Load();
+  window.NextChart();
+  const std::string script =
+      market.files->ReadAll(market.settings.paths.CurrentDataPath + "TCht.Tmp");
+  for (auto _ : bench) {
+    if (play) {
+      price.Cls();
+      benchmark::DoNotOptimize(
+          PlayChartScript(script, price, market.settings.fonts, market.colours));
+    } else {
+      benchmark::DoNotOptimize(window.Recompose());
+    }
+  }
+  bench.counters["script_bytes"] = double(script.size());
+}
+void PlaySaved(benchmark::State& bench) { SavedChart(bench, true); }
+void ComposeSaved(benchmark::State& bench) { SavedChart(bench, false); }
+
+void Sizes(benchmark::internal::Benchmark* b) {
+  b->ArgNames({"w", "h"})->Args({638, 452})->Args({1600, 900})->Unit(benchmark::kMicrosecond);
+}
+
+BENCHMARK(PageForward)->Name("WindowPageForward")->Apply(Sizes);
+BENCHMARK(CrossMove)->Name("WindowCrossMove")->Apply(Sizes);
+BENCHMARK(CrossMoveForm)->Name("WindowCrossMoveInTheForm")->Apply(Sizes);
+BENCHMARK(ComposeSaved)->Name("WindowComposeChart")->Unit(benchmark::kMicrosecond);
+BENCHMARK(PlaySaved)->Name("WindowPlaySavedChart")->Unit(benchmark::kMicrosecond);
+
+}  // namespace

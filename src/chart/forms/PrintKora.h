@@ -1,0 +1,40 @@
+#pragma once
+
+#include <QDialog>
+
+#include "chart/forms/print_services.h"
+
+class QComboBox;
+class QLineEdit;
+class QSpinBox;
+
+namespace kora {
+
+// What the user answered.
+struct PrintChoice {
+  bool PrintCancelled = true;
+  std::int16_t PrintCopies = 1;
+  std::string pdfFile;  // DOS path; in: what is proposed
+};
+
+// How many copies, and on which printer; for a PDF, into which file. Closed by its first button
+// it has set the printer in use and `choice`; otherwise choice.PrintCancelled is true and the
+// rest as it was.
+class PrintKora : public QDialog {
+ public:
+  PrintKora(const PrintServices& services, PrintChoice& choice, QWidget* parent);
+  void reject() override;
+
+ private:
+  bool IsPdf() const;
+  void PrinterChosen();
+  void Proceed();
+
+  PrintServices services_;
+  PrintChoice& choice_;
+  QComboBox* combo1_;
+  QSpinBox* text1_;
+  QLineEdit* text2_;
+};
+
+}  // namespace kora

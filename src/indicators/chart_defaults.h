@@ -1,0 +1,58 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <string>
+
+#include "base/files.h"
+#include "platform/dialogs.h"
+#include "settings/settings.h"
+#include "store/colours.h"
+
+// What the form of chart defaults keeps.
+
+namespace kora {
+
+// What stands in the form's controls.
+struct ChartDefaults {
+  struct Twin {
+    std::string daily, twin;  // as typed
+  };
+  std::array<Twin, 22> periods;  // in the order of OscKeys()
+  std::string CompFile;
+  bool BCCalTp = false, LCalTp = false, VCalTp = false;  // logarithmic
+  bool CutVols = false;
+  bool ShowOsc = false;
+  bool FXReversed = false;  // the box as ticked: FXRev is kept the other way round
+  bool FillIn = false;
+  bool RFAve = false;
+  Twin average1, average2;  // Av1D and Av1W, Av2D and Av2W
+  bool AvOne = false, AvTwo = false;
+  bool AvCalc = false;    // exponential
+  bool ScMethod = true;   // automatic scales
+};
+
+ChartDefaults DefaultsFromSettings(const Settings& settings);
+
+enum class DefaultsSaved {
+  kAll,          // or all but those that the user was told of
+  kCompareFile,  // stopped at the compare file, which he was told of; what stands before it is
+                 // kept
+};
+// Writes each key and sets the value that this run goes by: the periods in the order of
+// OscKeys(), then, where the compare file is there, the rest. A text that is no 16-bit number is
+// 0. Keys that can't be written are told together at the end.
+DefaultsSaved SaveChartDefaults(SettingsFile& ini, const Files& files, Dialogs& dialogs,
+                                const ChartDefaults& typed, Settings& settings);
+
+// How the chart selection shows an average: its period for the chart period on show, in its own
+// colour when it is on and in black when it is off.
+struct AverageCaption {
+  std::string text;
+  std::int32_t colour = 0;
+};
+std::array<AverageCaption, 2> AverageCaptions(const ChartSettings& charts,
+                                              const std::string& chartPeriod,
+                                              const ChartColours& colours);
+
+}  // namespace kora

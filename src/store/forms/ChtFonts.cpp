@@ -1,0 +1,109 @@
+#include "store/forms/ChtFonts.h"
+
+#include <QFontDialog>
+#include <QGridLayout>
+#include <QLabel>
+#include <QPushButton>
+#include <QRadioButton>
+
+#include "base/numbers.h"
+#include "platform/qt/form_parts.h"
+
+namespace kora {
+namespace {
+
+// Printers take the fonts that scale.
+std::optional<FontChoice> PickFromPlatform(QWidget* over, const FontChoice& standing,
+                                           bool printerFontsOnly) {
+  QFont font = over->font();
+  if (!standing.name.empty()) font.setFamily(FormText(standing.name));
+  if (standing.points > 0) font.setPointSizeF(standing.points);
+  bool chosen = false;
+  font = QFontDialog::getFont(&chosen, font, over, {},
+                              printerFontsOnly ? QFontDialog::ScalableFonts
+                                               : QFontDialog::FontDialogOptions());
+  if (!chosen) return std::nullopt;
+  return FontChoice{font.family().toStdString(), font.pointSizeF()};
+}
+
+}  // namespace
+
+ChtFonts::ChtFonts(LookServices services, QWidget* parent, PickFont pick)
+    : QDialog(parent), services_(std::move(services)), pick_(std::move(pick)) {
+  if (!pick_) pick_ = PickFromPlatform;
+  setObjectName("ChtFonts");
+  setWindowTitle("Fonts");
+  const FontSettings& fonts = services_.settings.fonts;
+  choice_[0] = {fonts.Font1Name, fonts.TitleSize};
+  choice_[1] = {fonts.Font2Name, fonts.Font2Points()};
+
+  auto* grid = new QGridLayout(this);
+  grid->addWidget(
+      NewNote(this, "Selects Fonts to be used on charts, printouts and spreadsheets."), 0, 0, 1,
+      2);
+  grid->addWidget(
+      NewNote(this, "Click Select Font 1 or 2 to display list of available fonts."), 1, 0, 1, 2);
+  QPushButton* first = nullptr;
+  for (int i = 0; i < 2; ++i) {
+    auto* select = new QPushButton(QString("Select Font &%1").arg(i + 1), this);
+    select->setObjectName(QString("Command3(%1)").arg(i));
+    label3_[i] = NewLabel(this, {});
+    label3_[i]->setObjectName(QString("Label3(%1)").arg(i));
+    label3_[i]->setTextFormat(Qt::PlainText);
+    label3_[i]->setFrameStyle(QFrame::Panel | QFrame::Sunken);
+    label3_[i]->setMargin(fontMetrics().height() / 6);
+    grid->addWidget(select, i + 2, 0);
+    grid->addWidget(label3_[i], i + 2, 1);
+    connect(select, &QPushButton::clicked, this, [this, i] { Pick(i); });
+    if (!first) first = select;
+    ShowChoice(i);
+  }
+  grid->addWidget(NewNote(this, "List all fonts or only those supported by your printer"), 4, 0,
+                  1, 2);
+  auto* allFonts = new QRadioButton("&All fonts", this);
+  allFonts->setObjectName("Option1(0)");
+  allFonts->setChecked(true);
+  printerFonts_ = new QRadioButton("&Printer fonts only", this);
+  printerFonts_->setObjectName("Option1(1)");
+  auto* options = new QHBoxLayout;
+  options->addWidget(allFonts);
+  options->addWidget(printerFonts_);
+  options->addStretch();
+  grid->addLayout(options, 5, 0, 1, 2);
+  grid->setColumnStretch(1, 1);
+  grid->setRowStretch(6, 1);
+  auto* buttons = new ButtonRow(this);
+  buttons->Add("Command1", "&OK", [this] { Save(); });
+  buttons->Add("Command2", "&Cancel", [this] { reject(); });
+  grid->addLayout(buttons, 7, 0, 1, 2);
+  first->setFocus();
+}
+
+void ChtFonts::Pick(int index) {
+  const auto chosen = pick_(this, choice_[index], printerFonts_->isChecked());
+  if (!chosen) return;
+  choice_[index] = *chosen;
+  ShowChoice(index);
+}
+
+// In the font itself, at the form's own size.
+void ChtFonts::ShowChoice(int index) {
+  const FontChoice& choice = choice_[index];
+  QFont shown = font();
+  if (!choice.name.empty()) shown.setFamily(FormText(choice.name));
+  label3_[index]->setFont(shown);
+  label3_[index]->setText(choice.name.empty()
+                              ? QString("(none)")
+                              : FormText(choice.name + "  " + Str(choice.points)));
+}
+
+void ChtFonts::Save() {
+  if (!SaveFonts(services_.ini, services_.settings, choice_[0], choice_[1])) {
+    services_.dialogs.Message(kFontsMessage, windowTitle().toStdString());
+    return;
+  }
+  accept();
+  services_.Saved();
+}
+
+}  // namespace kora

@@ -1,0 +1,42 @@
+#include "store/forms/ChtSp.h"
+
+#include <QGridLayout>
+#include <QLabel>
+#include <QSpinBox>
+
+#include "platform/qt/form_parts.h"
+#include "store/look_settings.h"
+
+namespace kora {
+
+ChtSp::ChtSp(LookServices services, char chartStyle, QWidget* parent)
+    : QDialog(parent), services_(std::move(services)) {
+  setObjectName("ChtSp");
+  setWindowTitle("Chart Spacing");
+  text1_ = new QSpinBox(this);
+  text1_->setObjectName("Text1");
+  text1_->setRange(LeastSpacing(chartStyle), kMostSpacing);
+  // 0 was never set: charts stand 2 apart then.
+  const std::int16_t spacing = services_.settings.charts.Spacing;
+  text1_->setValue(spacing == 0 ? 2 : spacing);
+
+  auto* grid = new QGridLayout(this);
+  grid->addWidget(NewLabel(this, "Chart &Spacing", text1_), 0, 0);
+  grid->addWidget(text1_, 0, 1);
+  grid->setColumnStretch(2, 1);
+  grid->setRowStretch(1, 1);
+  auto* buttons = new ButtonRow(this);
+  buttons->Add("Command1", "&OK", [this] { Save(); });
+  buttons->Add("Command2", "&Cancel", [this] { reject(); });
+  grid->addLayout(buttons, 2, 0, 1, 3);
+  text1_->setFocus();
+  text1_->selectAll();
+}
+
+void ChtSp::Save() {
+  SaveSpacing(services_.ini, services_.settings, std::int16_t(text1_->value()));
+  accept();
+  services_.Saved();
+}
+
+}  // namespace kora

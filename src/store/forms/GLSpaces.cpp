@@ -1,0 +1,55 @@
+#include "store/forms/GLSpaces.h"
+
+#include <QCheckBox>
+#include <QGridLayout>
+#include <QLabel>
+#include <QLineEdit>
+
+#include "base/numbers.h"
+#include "platform/qt/form_parts.h"
+#include "store/look_settings.h"
+
+namespace kora {
+
+GLSpaces::GLSpaces(LookServices services, QWidget* parent)
+    : QDialog(parent), services_(std::move(services)) {
+  setObjectName("GLSpaces");
+  setWindowTitle(FormText(kGridSpaceTitle));
+  const ChartSettings& charts = services_.settings.charts;
+  text1_ = NewField(this, "Text1", 4, 6);
+  text1_->setText(FormText(Str(std::int32_t(charts.GridSpace))));
+  check1_ = new QCheckBox("&Intermediate horizontal grid", this);
+  check1_->setObjectName("Check1");
+  check1_->setChecked(charts.HalfGrid);
+
+  auto* grid = new QGridLayout(this);
+  grid->addWidget(NewNote(this, " (1) Sets the number of bars between vertical grid lines. With "
+                                "0 the lines move with the dates"),
+                  0, 0, 1, 3);
+  grid->addWidget(NewLabel(this, "&Grid line spacing", text1_), 1, 0);
+  grid->addWidget(text1_, 1, 1);
+  grid->addWidget(
+      NewNote(this, " (2) Allows you to set the intermediate horizontal grid ON or OFF"), 2, 0, 1,
+      3);
+  grid->addWidget(check1_, 3, 0, 1, 3);
+  grid->setColumnStretch(2, 1);
+  grid->setRowStretch(4, 1);
+  auto* buttons = new ButtonRow(this);
+  buttons->Add("Command1", "&OK", [this] { Save(); });
+  buttons->Add("Command2", "&Cancel", [this] { reject(); });
+  grid->addLayout(buttons, 5, 0, 1, 3);
+  FocusField(text1_);
+}
+
+void GLSpaces::Save() {
+  if (!SaveGridSpacing(services_.ini, services_.settings, text1_->text().toStdString(),
+                       check1_->isChecked())) {
+    services_.dialogs.Message(kGridSpaceMessage, kGridSpaceTitle);
+    FocusField(text1_);
+    return;
+  }
+  accept();
+  services_.Saved();
+}
+
+}  // namespace kora

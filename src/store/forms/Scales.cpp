@@ -1,0 +1,60 @@
+#include "store/forms/Scales.h"
+
+#include <QGridLayout>
+#include <QLabel>
+#include <QLineEdit>
+#include <QPushButton>
+
+#include "base/runtime_error.h"
+#include "base/text.h"
+#include "platform/qt/form_parts.h"
+#include "store/look_settings.h"
+
+namespace kora {
+
+Scales::Scales(ScalesServices services, QWidget* parent)
+    : QDialog(parent), services_(std::move(services)) {
+  setObjectName("Scales");
+  setWindowTitle("Scales");
+  const NameRec& record = services_.current.Rec;
+  const bool any = services_.current.NameRecNo > 0;
+  auto* grid = new QGridLayout(this);
+  const std::string title =
+      FromAnsi(record.Code.trimmed()) + "  " + FromAnsi(Trim(record.Name.trimmed()));
+  auto* label1 = NewLabel(this, any ? FormText(title) : QString("No chart is selected"));
+  label1->setObjectName("Label1");
+  label1->setTextFormat(Qt::PlainText);
+  grid->addWidget(label1, 0, 0, 1, 3);
+
+  const char* captions[] = {"&Base", "&Top", "&PF Inc"};
+  const float values[] = {record.Base, record.Top, record.PFInc};
+  for (int i = 0; i < 3; ++i) {
+    text_[i] = NewField(this, QString("Text%1").arg(i + 1), 10, 20);
+    if (any) text_[i]->setText(FormText(ScaleText(values[i])));
+    text_[i]->setEnabled(any);
+    grid->addWidget(NewLabel(this, captions[i], text_[i]), i + 1, 0);
+    grid->addWidget(text_[i], i + 1, 1);
+  }
+  grid->setColumnStretch(2, 1);
+  grid->setRowStretch(4, 1);
+  auto* buttons = new ButtonRow(this);
+  buttons->Add("Command1", "&OK", [this] { Save(); })->setEnabled(any);
+  buttons->Add("Command2", "&Cancel", [this] { reject(); });
+  grid->addLayout(buttons, 5, 0, 1, 3);
+  FocusField(text_[0]);
+}
+
+void Scales::Save() {
+  try {
+    SaveScales(services_.files, services_.dataPath, services_.current,
+               text_[0]->text().toStdString(), text_[1]->text().toStdString(),
+               text_[2]->text().toStdString());
+  } catch (const RunTimeError&) {
+    services_.dialogs.Message(kNotSavedMessage, kNotSavedTitle);
+    return;
+  }
+  accept();
+  if (services_.saved) services_.saved();
+}
+
+}  // namespace kora
