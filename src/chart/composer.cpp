@@ -272,7 +272,10 @@ void Composer::MakeVolumeRoom() {
     chart_.VolTop = chart_.ChartBottom;
     chart_.Bars.VolumeShown = chart_.Bars.VolumeShown && chart_.OscPanel == 0;
   }
-  if (request_.ChartStyle != 'P' && request_.VolumeOption) SetVolumeLabel(chart_);
+  if (request_.ChartStyle != 'P' && request_.VolumeOption) {
+    const bool unit = chart_.Bars.VolumeShown && services_.VolumeUnitText;
+    SetVolumeLabel(chart_, unit ? services_.VolumeUnitText(request_.Name) : "");
+  }
   chart_.CloseY.reserve(static_cast<size_t>(std::max(0.0, chart_.PlotWidth)) + 10);
 }
 

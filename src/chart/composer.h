@@ -28,6 +28,8 @@ struct ChartServices {
   ChartScript* script = nullptr;
   // Drawn over the finished price chart, in this order: bands, multiple averages, trendlines.
   std::vector<std::function<void(const ChartCanvas&)>> overlays = {};
+  // The unit of a security's volumes, "'00", which those above the chart know; empty for none.
+  std::function<std::string(const NameRec&)> VolumeUnitText = {};
 };
 
 // Turns one security and the chart options into a chart on `services.price` and, unless the

@@ -43,11 +43,11 @@ std::string ModeLine(const ChartCanvas& canvas, bool lineChart, std::string_view
 
 }  // namespace
 
-void SetVolumeLabel(Composition& chart) {
+void SetVolumeLabel(Composition& chart, std::string unit) {
   chart.Volume.VolBase = chart.Bars.VolMin;
   chart.Volume.VolPeak = chart.Bars.VolMax;
   chart.Volume.VolMean = chart.Bars.VolAvg;
-  chart.VolLabel.clear();
+  chart.VolLabel = std::move(unit);
 }
 
 void SetVolumeMap(const ChartRequest& request, bool lineChart, bool logarithmicPrices,

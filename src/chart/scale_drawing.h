@@ -16,8 +16,8 @@ namespace kora {
 void SetVolumeMap(const ChartRequest& request, bool lineChart, bool logarithmicPrices,
                   Composition& chart);
 
-// Copies the volume figures and empties VolLabel, the unit of the volumes.
-void SetVolumeLabel(Composition& chart);
+// Copies the volume figures and sets VolLabel, the unit of the volumes; empty for none.
+void SetVolumeLabel(Composition& chart, std::string unit);
 
 // Frame, three dotted lines, "VOL" reading downward and the values of the volume panel.
 void DrawVolumePanel(const ChartCanvas& canvas);

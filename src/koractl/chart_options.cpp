@@ -7,6 +7,7 @@
 #include "koractl/options.h"
 #include "koractl/picture_output.h"
 #include "platform/headless/headless_surface.h"
+#include "update/volume_unit.h"
 
 namespace kora {
 namespace {
@@ -55,7 +56,10 @@ void Compose(Run& run, const ChartOptions& o, const ChartRequest& request, Chart
                                price,
                                panel,
                                &script,
-                               PriceOverlays(o.mma, s.settings.osc.MMASet)};
+                               PriceOverlays(o.mma, s.settings.osc.MMASet),
+                               [&s](const NameRec& name) {
+                                 return VolumeUnitText(s.files, s.settings, name.Code.trimmed());
+                               }};
   if (!ComposeChart(services, request, chart)) throw Abandoned();
   if (o.osc.empty()) return;
   OscHost host{s.files, run.dialogs, s.settings,          s.colours, request,

@@ -43,5 +43,8 @@ void AddChart(CLI::App& app, CommandLine& line);
 void AddPlay(CLI::App& app, CommandLine& line);
 void AddPrint(CLI::App& app, CommandLine& line);
 void AddImport(CLI::App& app, CommandLine& line);
+void AddDownloads(CLI::App& app, CommandLine& line);
+void AddUpdate(CLI::App& app, CommandLine& line);
+void AddMaster(CLI::App& app, CommandLine& line);
 
 }  // namespace kora

@@ -37,7 +37,8 @@ int main(int argc, char** argv) {
   AddChoice(app, "--answer", answer, {"yes", "no", "ok", "cancel"},
             "Answer to every question that offers it");
   for (const auto add : {AddInit, AddDemo, AddNames, AddFind, AddPrices, AddBars, AddScale,
-                         AddChart, AddPlay, AddPrint, AddImport})
+                         AddChart, AddPlay, AddPrint, AddImport, AddDownloads, AddUpdate,
+                         AddMaster})
     add(app, line);
 
   try {

@@ -212,6 +212,34 @@ TEST(ComposerTest, VolumeTakesATenthOfTheHeightAndScalesByAMultipleOfTheMean) {
   EXPECT_NE(s[5].find(",V,27"), std::string::npos);
 }
 
+TEST(ComposerTest, VolumeUnitComesFromAboveAndStandsUnderTheLetters) {
+  ComposerFixture f;
+  f.Days("19990101", 30, 500);
+  f.services.VolumeUnitText = [](const NameRec& name) {
+    return name.Code.trimmed() == "TEST" ? "'000" : "";
+  };
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.VolLabel, "'000");
+  bool shown = false;
+  for (const std::string& op : f.price.ops) shown |= op.find(" '000 ") != std::string::npos;
+  EXPECT_TRUE(shown);
+  f.services.VolumeUnitText = {};
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.VolLabel, "");
+}
+
+TEST(ComposerTest, VolumeUnitIsNotAskedForWithoutVolumes) {
+  ComposerFixture f;
+  f.Days("19990101", 30);
+  bool asked = false;
+  f.services.VolumeUnitText = [&asked](const NameRec&) {
+    asked = true;
+    return std::string("'000");
+  };
+  ASSERT_TRUE(f.Compose());
+  EXPECT_FALSE(asked);
+}
+
 TEST(ComposerTest, HighVolumesRunIntoThePriceAreaUnlessTheyAreCut) {
   ComposerFixture f;
   f.Days("20240101", 10, 1000);

@@ -1,6 +1,8 @@
 #include "tests/support/program.h"
 
 #include <fcntl.h>
+#include <sched.h>
+#include <signal.h>
 #include <spawn.h>
 #include <stdlib.h>
 #include <sys/wait.h>
@@ -50,7 +52,8 @@ std::vector<char*> Pointers(std::vector<std::string>& texts) {
 }  // namespace
 
 ProgramResult RunProgram(const std::string& path, const std::vector<std::string>& arguments,
-                         const std::vector<std::string>& environment) {
+                         const std::vector<std::string>& environment,
+                         const std::function<bool()>& killWhen) {
   std::vector<std::string> words{path};
   words.insert(words.end(), arguments.begin(), arguments.end());
   std::vector<std::string> variables = environment;  // the first of a name holds
@@ -67,7 +70,14 @@ ProgramResult RunProgram(const std::string& path, const std::vector<std::string>
   ::posix_spawn_file_actions_destroy(&actions);
   if (error != 0) throw std::runtime_error("can't start " + path);
   int status = 0;
-  while (::waitpid(pid, &status, 0) < 0) {
+  bool killed = false;
+  while (::waitpid(pid, &status, killWhen && !killed ? WNOHANG : 0) <= 0) {
+    if (!killWhen || killed) continue;
+    if (killWhen()) {
+      killed = true;
+      ::kill(pid, SIGKILL);
+    }
+    ::sched_yield();
   }
   ProgramResult result;
   result.code = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -11,8 +12,10 @@ struct ProgramResult {
 };
 
 // Runs a program with nothing on its standard input and waits for it. `environment` holds
-// NAME=VALUE pairs beside those of the tests.
+// NAME=VALUE pairs beside those of the tests. `killWhen` is asked while the program runs, which
+// is killed at once when it says so.
 ProgramResult RunProgram(const std::string& path, const std::vector<std::string>& arguments,
-                         const std::vector<std::string>& environment = {});
+                         const std::vector<std::string>& environment = {},
+                         const std::function<bool()>& killWhen = {});
 
 }  // namespace kora::test

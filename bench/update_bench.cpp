@@ -1,0 +1,180 @@
+// A downloaded day taken in, beside the bare calls of the host on the same files.
+
+#include <benchmark/benchmark.h>
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <stdexcept>
+
+#include "base/dates.h"
+#include "base/numbers.h"
+#include "platform/clock.h"
+#include "store/price_rec.h"
+#include "update/download_update.h"
+
+using namespace kora;
+
+namespace {
+
+constexpr int kSecurities = 5000;
+constexpr int kDays = 60;
+constexpr int kRuns = 5;
+const std::string kData = "c:\\korawin\\data\\";
+const std::string kDown = "c:\\korawin\\download\\";
+
+std::string Code(int n) { return "C" + std::to_string(10000 + n); }
+// Every second calendar day, so that there are dates between them.
+std::string Date(double day) { return FormatFileDate(DateOfDayNumber(CLng(10400 + 2 * day))); }
+
+// Answers OK to the question about data on file, and says nothing.
+struct Quiet : Dialogs {
+  void Message(std::string_view text, std::string_view) override {
+    throw std::runtime_error(std::string(text));
+  }
+  Answer Ask(std::string_view, std::string_view, Buttons) override { return Answer::kOk; }
+  std::optional<std::string> Prompt(std::string_view, std::string_view,
+                                    std::string_view) override {
+    return std::nullopt;
+  }
+  std::unique_ptr<Progress> StartProgress(std::string_view) override { return nullptr; }
+  void SetBusy(bool) override {}
+  void Yield() override {}
+};
+
+// A market of 5,000 shares with 60 days each, which a run can be repeated on.
+class Market {
+ public:
+  Market() : path_(MakeFolder()), files_(path_) {
+    files_.MakeFolder(kData);
+    files_.MakeFolder(kDown);
+    settings_.paths.SystemPath = "c:\\korawin\\";
+    settings_.paths.CurrentDataPath = kData;
+    settings_.download.DLPath = kDown;
+    std::vector<NameRec> names;
+    for (int i = 0; i < kSecurities; ++i) names.push_back(NewNameRec(Code(i)));
+    NameFile(files_, NameFilePath(kData), OpenMode::kReplace).WriteRun(1, names);
+    for (int d = 0; d < kDays; ++d) {
+      days_.push_back(NewPriceRec(Date(d)));
+      days_.back().Close = float(d);
+    }
+    Reset();
+  }
+  ~Market() {
+    std::error_code ignored;
+    std::filesystem::remove_all(path_, ignored);
+  }
+
+  // Every price file as it was at first.
+  void Reset() {
+    for (int i = 0; i < kSecurities; ++i) {
+      PriceFile file(files_, kData + Code(i) + ".WDT", OpenMode::kCreate);
+      file.WriteRun(1, days_);
+      file.Truncate(kDays);
+    }
+  }
+  // Waits for the run: `lines` securities on one date.
+  void PutDay(const std::string& date, int lines) {
+    std::string text;
+    for (int i = 0; i < lines; ++i)
+      text += Code(i) + "," + date + ",1.25,1.5,1.125,1.375,12345,0\r\n";
+    files_.WriteAll(kDown + "15SEP98.d", text);
+  }
+  void Update(std::int16_t service) {
+    settings_.download.DataService = service;
+    UpdateDisplay display;
+    CurrentName current;
+    DownloadEntries entries{"15SEP98.d"};
+    if (UpdateOneDay({files_, settings_, current, dialogs_, MachineClock(), display}, entries, 0) !=
+        UpdateEnd::kUpdated)
+      throw std::runtime_error("not updated");
+  }
+  std::string HostData() const { return files_.HostPath(kData); }
+
+ private:
+  static std::string MakeFolder() {
+    std::string path =
+        (std::filesystem::temp_directory_path() / "kora-bench-XXXXXX").string();
+    if (!::mkdtemp(path.data())) throw std::runtime_error("no temporary folder");
+    return path;
+  }
+
+  std::string path_;
+  Files files_;
+  Settings settings_;
+  Quiet dialogs_;
+  std::vector<PriceRec> days_;
+};
+
+Market& TheMarket() {
+  static Market market;
+  return market;
+}
+
+// Open, read the last record, append one, close.
+void UpdateFloor(benchmark::State& state) {
+  Market& market = TheMarket();
+  std::vector<std::string> paths;
+  for (int i = 0; i < kSecurities; ++i) paths.push_back(market.HostData() + "/" + Code(i) + ".WDT");
+  for (auto _ : state) {
+    state.PauseTiming();
+    market.Reset();
+    state.ResumeTiming();
+    for (const std::string& path : paths) {
+      PriceRec rec;
+      const int fd = ::open(path.c_str(), O_RDWR | O_CLOEXEC);
+      const off_t end = ::lseek(fd, 0, SEEK_END);
+      if (::pread(fd, &rec, sizeof(rec), end - off_t(sizeof(rec))) != ssize_t(sizeof(rec)) ||
+          ::pwrite(fd, &rec, sizeof(rec), end) != ssize_t(sizeof(rec)))
+        state.SkipWithError("no record");
+      ::close(fd);
+    }
+  }
+  state.SetItemsProcessed(state.iterations() * kSecurities);
+}
+
+// `lines` of the day's file; the rest of the market has the no-trade pass of service 5.
+void UpdateDay(benchmark::State& state, double day, int lines, std::int16_t service) {
+  Market& market = TheMarket();
+  for (auto _ : state) {
+    state.PauseTiming();
+    market.Reset();
+    market.PutDay(Date(day), lines);
+    state.ResumeTiming();
+    market.Update(service);
+  }
+  state.SetItemsProcessed(state.iterations() * kSecurities);
+}
+
+// Names of the market that no price file stands for yet.
+void UpdateNew(benchmark::State& state) {
+  for (auto _ : state) {
+    state.PauseTiming();
+    {
+      Market market;
+      std::filesystem::remove_all(market.HostData());
+      std::filesystem::create_directory(market.HostData());
+      market.PutDay(Date(0), int(state.range(0)));
+      state.ResumeTiming();
+      market.Update(1);
+      state.PauseTiming();
+    }
+    state.ResumeTiming();
+  }
+  state.SetItemsProcessed(state.iterations() * state.range(0));
+}
+
+BENCHMARK(UpdateFloor)->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateDay, append, kDays, kSecurities, 1)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateDay, replace, kDays - 1, kSecurities, 1)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateDay, insert_10_back, kDays - 10.5, kSecurities, 1)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateDay, no_trades, kDays, 1, 5)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK(UpdateNew)->Arg(1250)->Arg(2500)->Arg(5000)->Iterations(2)->Unit(
+    benchmark::kMillisecond);
+
+}  // namespace

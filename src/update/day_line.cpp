@@ -1,0 +1,68 @@
+#include "update/day_line.h"
+
+#include "base/dates.h"
+#include "base/files.h"
+#include "base/numbers.h"
+#include "base/runtime_error.h"
+#include "base/text.h"
+
+namespace kora {
+namespace {
+
+constexpr size_t kLongestShown = 200;
+
+// Stands for the code that a line is filed under: some codes can't be file names.
+std::string FileCode(std::string_view field) {
+  std::string code = UCase(Trim(Trim(field).substr(0, 6)));
+  if (code == "PRN") return "PRNX";
+  if (code == "AUX") return "1AUX";
+  return code;
+}
+
+bool IsExpiry(const CalendarDate& date, std::int32_t days) {
+  const std::int64_t number = std::int64_t(DayNumber(date)) + days;
+  return number >= DayNumber({1, 1, 1}) && number <= DayNumber({9999, 12, 31});
+}
+
+}  // namespace
+
+std::string ReadDayLine(std::string_view line, bool options, DayLine& day) {
+  if (line.find('\0') != std::string_view::npos) return " The line is no text";
+  const auto fields = Split(line, ',');
+  day = {};
+  day.code = FileCode(fields.at(0));
+  if (day.code.empty()) return {};
+  if (!IsFileCode(day.code)) return " The code cannot be the name of a file";
+  day.date = Trim(fields.at(1));
+  const auto date = ParseFileDate(day.date);
+  if (!date) return " The date is not a date yyyymmdd";
+  try {
+    day.Open = CSng(Val(fields.at(2)));
+    day.High = CSng(Val(fields.at(3)));
+    day.Low = CSng(Val(fields.at(4)));
+    day.Close = CSng(Val(fields.at(5)));
+    day.Volume = CLng(Val(fields.at(6)));
+    if (options) {
+      day.days = CLng(Val(fields.at(7)));
+      day.OptType = Trim(fields.at(8));
+      if (!IsExpiry(*date, day.days)) return " The days to expiry are too many";
+    } else {
+      const double spare = Val(fields.at(7));
+      day.hasSpare = spare != 0;
+      day.spare = CLng(spare);
+    }
+  } catch (const RunTimeError&) {
+    return " A number is too large";
+  }
+  return {};
+}
+
+std::string ShownLine(std::string_view line) {
+  std::string out = FromAnsi(line.substr(0, kLongestShown));
+  for (char& c : out)
+    if (static_cast<unsigned char>(c) < 0x20 || c == 0x7F) c = '?';
+  if (line.size() > kLongestShown) out += "...";
+  return out;
+}
+
+}  // namespace kora

@@ -1,0 +1,212 @@
+#include "update/forms/INUpList.h"
+
+#include <QGridLayout>
+#include <QHeaderView>
+#include <QLabel>
+#include <QListWidget>
+#include <QMenuBar>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QTableWidget>
+#include <QTimer>
+#include <set>
+
+#include "base/numbers.h"
+#include "base/runtime_error.h"
+#include "base/text.h"
+
+namespace kora {
+namespace {
+
+constexpr int kSavedMs = 900;
+
+}  // namespace
+
+RecSav::RecSav(QWidget* parent) : QDialog(parent) {
+  setObjectName("RecSav");
+  auto* box = new QVBoxLayout(this);
+  box->addWidget(new QLabel("Saved", this), 0, Qt::AlignCenter);
+  setAttribute(Qt::WA_DeleteOnClose);
+  QTimer::singleShot(kSavedMs, this, [this] { close(); });
+}
+
+INUpList::INUpList(UpdateFormServices services, QWidget* parent)
+    : QDialog(parent), services_(std::move(services)) {
+  setObjectName("INUpList");
+  setWindowTitle("Download Update List");
+  auto* grid = new QGridLayout(this);
+  static constexpr const char* kOptions[] = {"Update ALL STOCKS",
+                                             "Update ONLY the stocks listed below",
+                                             "Update ALL stocks but exclude WARRANTS"};
+  for (int i = 0; i < 3; ++i) {
+    auto*& option = options_[size_t(i)];
+    option = new QRadioButton(kOptions[i], this);
+    option->setObjectName(QString("Option1(%1)").arg(i));
+    grid->addWidget(option, i, 0, 1, 2, Qt::AlignLeft);
+    connect(option, &QRadioButton::clicked, this, [this] {
+      changed_ = true;
+      ShowChoice();
+    });
+  }
+  options_[size_t(UpdateChoiceOf(services_.settings.download))]->setChecked(true);
+
+  ss1_ = new QTableWidget(0, 3, this);
+  ss1_->setObjectName("SS1");
+  ss1_->setHorizontalHeaderLabels({"ASX Code", "CAT.", "Name"});
+  ss1_->horizontalHeader()->setStretchLastSection(true);
+  ss1_->setMinimumWidth(fontMetrics().averageCharWidth() * 55);
+  ss1_->setSelectionBehavior(QAbstractItemView::SelectRows);
+  list1_ = new QListWidget(this);
+  list1_->setObjectName("List1");
+  list1_->setAccessibleName("Master list");
+  auto* add = new QPushButton("&Add checked items", this);
+  add->setObjectName("Command1");
+  add->setAutoDefault(false);
+  grid->addWidget(ss1_, 3, 0, 2, 1);
+  grid->addWidget(list1_, 3, 1);
+  grid->addWidget(add, 4, 1);
+  grid->setColumnStretch(0, 3);
+  grid->setColumnStretch(1, 2);
+  connect(add, &QPushButton::clicked, this, [this] { AddChecked(); });
+  connect(ss1_, &QTableWidget::itemChanged, this, [this] {
+    if (!loading_) changed_ = true;
+  });
+
+  AddMenu();
+  SaveOrTell(services_.dialogs, windowTitle(), [this] {
+    for (const UpdateRow& row :
+         ReadUpdateList(services_.files, services_.settings.paths.SystemPath))
+      AddRow(row);
+    return true;
+  });
+  LoadMaster();
+  ShowChoice();
+  loading_ = false;
+}
+
+void INUpList::AddMenu() {
+  auto* bar = new QMenuBar(this);
+  layout()->setMenuBar(bar);
+  const auto entry = [this](QMenu* menu, const char* name, const char* caption, auto work) {
+    QAction* action = menu->addAction(caption, this, work);
+    action->setObjectName(name);
+    return action;
+  };
+  QMenu* file = bar->addMenu("&File");
+  entry(file, "ulSave", "&Save List", [this] { Save(); });
+  entry(file, "UlPrint", "&Print List", [] {})->setEnabled(false);  // until grids can be printed
+  entry(file, "ulClose", "&Close", [this] { reject(); });
+  QMenu* edit = bar->addMenu("&Edit");
+  entry(edit, "ulAdd", "&Add Row/s", [this] {
+    if (Choice() != UpdateChoice::kListed) return;
+    AddRow({});
+    ss1_->setCurrentCell(ss1_->rowCount() - 1, 0);
+  });
+  entry(edit, "ulDel", "&Delete Row/s", [this] { DeleteRows(); });
+}
+
+void INUpList::LoadMaster() {
+  try {
+    master_.Records = ReadMasterRecords(services_.files, services_.settings.paths.SystemPath);
+  } catch (const RunTimeError&) {
+    master_.Records.clear();  // shows as missing
+  }
+  if (master_.Records.empty()) {
+    for (const std::string_view line : MasterMissingLines()) list1_->addItem(Shown(line));
+    return;
+  }
+  for (size_t i = 1; i <= master_.Records.size(); ++i) {
+    const MasterEntry entry = master_.Entry(std::int32_t(i));
+    auto* item = new QListWidgetItem(Shown(PadRight(entry.code, 6) + "  " + entry.name), list1_);
+    item->setFlags(item->flags() | Qt::ItemIsUserCheckable);
+    item->setCheckState(Qt::Unchecked);
+  }
+}
+
+void INUpList::AddRow(const UpdateRow& row) {
+  const int at = ss1_->rowCount();
+  ss1_->insertRow(at);
+  ss1_->setItem(at, 0, new QTableWidgetItem(Shown(row.code)));
+  ss1_->setItem(at, 1, new QTableWidgetItem(
+                           row.code.empty() ? QString() : Shown(Format(double(row.category), "##0"))));
+  ss1_->setItem(at, 2, new QTableWidgetItem(Shown(row.name)));
+}
+
+std::vector<UpdateRow> INUpList::Rows() const {
+  const auto text = [this](int row, int column) {
+    const QTableWidgetItem* item = ss1_->item(row, column);
+    return item ? item->text().toStdString() : std::string();
+  };
+  std::vector<UpdateRow> rows;
+  for (int i = 0; i < ss1_->rowCount(); ++i) {
+    const double category = Val(text(i, 1));
+    rows.push_back({UCase(Trim(text(i, 0))),
+                    category >= 0 && category <= 99 ? CInt(category) : std::int16_t(0),
+                    std::string(Trim(text(i, 2)))});
+  }
+  return rows;
+}
+
+UpdateChoice INUpList::Choice() const {
+  return options_[1]->isChecked()   ? UpdateChoice::kListed
+         : options_[2]->isChecked() ? UpdateChoice::kNoWarrants
+                                    : UpdateChoice::kAll;
+}
+
+// The grid lives, on white, while the list is in use; else it is locked and grey.
+void INUpList::ShowChoice() {
+  const bool live = Choice() == UpdateChoice::kListed;
+  ss1_->setEditTriggers(live ? QAbstractItemView::AllEditTriggers
+                             : QAbstractItemView::NoEditTriggers);
+  QPalette colours = ss1_->palette();
+  colours.setColor(QPalette::Base, live ? Qt::white : Qt::lightGray);
+  ss1_->setPalette(colours);
+}
+
+void INUpList::AddChecked() {
+  if (Choice() != UpdateChoice::kListed || master_.Records.empty()) return;
+  std::set<std::string> there;
+  for (const UpdateRow& row : Rows()) there.insert(row.code);
+  for (int i = 0; i < list1_->count(); ++i) {
+    if (list1_->item(i)->checkState() != Qt::Checked) continue;
+    const std::string code(master_.Records[size_t(i)].Code.trimmed());
+    if (!there.insert(code).second) continue;
+    const MasterEntry entry = FindMaster(master_, code, LookUpStart(i + 1));
+    AddRow({code, CInt(Val(entry.category)), entry.name});
+    changed_ = true;
+  }
+  ss1_->sortItems(0);
+}
+
+void INUpList::DeleteRows() {
+  if (Choice() != UpdateChoice::kListed) return;
+  std::set<int, std::greater<>> rows;
+  for (const QModelIndex& index : ss1_->selectionModel()->selectedIndexes())
+    rows.insert(index.row());
+  for (const int row : rows) ss1_->removeRow(row);
+  if (!rows.empty()) changed_ = true;
+}
+
+bool INUpList::Save() {
+  UpdateChoice choice = Choice();
+  bool written = false;
+  if (!SaveOrTell(services_.dialogs, windowTitle(), [&] {
+        written = SaveUpdateList(services_.files, services_.settings.paths.SystemPath, Rows(),
+                                 choice, services_.ini, services_.settings.download,
+                                 services_.dialogs);
+        return true;
+      }))
+    return false;
+  options_[size_t(choice)]->setChecked(true);
+  ShowChoice();
+  changed_ = false;
+  if (written) (new RecSav(parentWidget() ? parentWidget() : this))->show();
+  return true;
+}
+
+void INUpList::reject() {
+  if (changed_ && !Save()) return;
+  QDialog::reject();
+}
+
+}  // namespace kora

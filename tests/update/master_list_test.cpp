@@ -1,0 +1,165 @@
+#include "update/master_list.h"
+
+#include "tests/update/update_fixture.h"
+
+using namespace kora;
+using namespace kora::test;
+
+namespace {
+
+class MasterTest : public UpdateFixture {
+ protected:
+  std::optional<std::int32_t> Make(std::string_view text) {
+    home.Put("list.csv", text);
+    return MakeMasterList(home.files(), kSystem, home.path() + "/list.csv", dialogs);
+  }
+  MasterEntry Find(const std::string& code, std::int32_t start = 1) {
+    return FindMaster(ReadMasterList(home.files(), kSystem), code, start);
+  }
+  const std::string kList =
+      "Code,Type,Category,Class,Name,Details\n"
+      "ZAP,5,50,,Zap Index,\n"
+      "ore,4,1,121,Ore Mining Ltd,Ord\n"
+      "BHP,4,22,7,Big Hole,\n"
+      "1AUX,4,,,Auxiliary,\n"
+      "OAK,4,3,341,Oak,\n";
+};
+
+}  // namespace
+
+TEST_F(MasterTest, MakesRecordsOrderedByCodeAndAnIndex) {
+  EXPECT_EQ(Make(kList), 5);
+  const std::string bytes = home.Get(kHostSystem + "KoraName.Mas");
+  ASSERT_EQ(bytes.size(), 5u * 62);
+  EXPECT_EQ(bytes.substr(0, 6), "1AUX  ");
+  EXPECT_EQ(bytes.substr(3 * 62, 62),
+            "ORE   4 1121" "Ore Mining Ltd                    " " " "Ord            ");
+  EXPECT_EQ(home.Get(kHostSystem + "KoraName.idx"),
+            "0,2,0,0,0,0,0,0,0,0,0,0,0,0,3,0,0,0,0,0,0,0,0,0,0,5\r\n");
+}
+
+TEST_F(MasterTest, FindsAnEntryFromItsLetterOn) {
+  Make(kList);
+  const MasterList list = ReadMasterList(home.files(), kSystem);
+  EXPECT_EQ(list.StartOf("ore"), 3);
+  const MasterEntry e = FindMaster(list, " ore", list.StartOf("ore"));
+  EXPECT_EQ(e.code, "ORE");
+  EXPECT_EQ(e.type, "4");
+  EXPECT_EQ(e.category, "1");
+  EXPECT_EQ(e.IndClass, "121");
+  EXPECT_EQ(e.name, "Ore Mining Ltd");
+  EXPECT_EQ(e.details, "Ord");
+  EXPECT_EQ(Find("OAK", 2).code, "OAK");  // from a record of an earlier letter
+}
+
+TEST_F(MasterTest, AStartBeyondTheListFindsNothing) {
+  Make(kList);
+  EXPECT_EQ(Find("ZAP", 6).code, "");
+  EXPECT_EQ(Find("ZAP", 0).code, "");
+  EXPECT_EQ(Find("ORE", 5).code, "");   // begins behind it
+  EXPECT_EQ(Find("OBX").code, "");
+}
+
+TEST_F(MasterTest, ALetterWithoutEntryFindsNothingAndTheRowsStay) {
+  Make(kList);
+  std::vector<EditorRow> rows{{"QQQ", "Keep", "", "4", "1", "001"}, {"1AUX", "Keep", "", "", "", ""}};
+  EXPECT_TRUE(UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs));
+  EXPECT_EQ(rows[0].name, "Keep");
+  EXPECT_EQ(rows[1].name, "Keep");
+  EXPECT_EQ(rows[1].type, "");
+}
+
+TEST_F(MasterTest, TickedItemsKeepWhatTheyHave) {
+  Make(kList);
+  std::vector<EditorRow> rows{{"BHP", "Mine", "", "", "7", ""}, {"", "Blank", "", "", "", ""}};
+  EXPECT_TRUE(UpdateFromMaster(home.files(), kSystem, rows, {true, true, true, true, true}, dialogs));
+  EXPECT_EQ(rows[0].name, "Mine");
+  EXPECT_EQ(rows[0].details, "");
+  EXPECT_EQ(rows[0].type, "4");
+  EXPECT_EQ(rows[0].category, "7");
+  EXPECT_EQ(rows[0].IndClass, "007");
+  EXPECT_EQ(rows[1].name, "Blank");
+  EXPECT_TRUE(UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs));
+  EXPECT_EQ(rows[0].name, "Big Hole");
+  EXPECT_EQ(rows[0].category, "22");
+}
+
+TEST_F(MasterTest, AnItemThatTheMasterLacksStays) {
+  Make(kList);
+  std::vector<EditorRow> rows{{"ZAP", "Mine", "Details", "4", "7", "121"}};
+  EXPECT_TRUE(UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs));
+  EXPECT_EQ(rows[0].details, "Details");
+  EXPECT_EQ(rows[0].IndClass, "121");
+  EXPECT_EQ(rows[0].type, "5");
+}
+
+TEST_F(MasterTest, AMissingListIsTold) {
+  std::vector<EditorRow> rows;
+  EXPECT_FALSE(UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs));
+  EXPECT_EQ(LastTitle(), "KORA Master List");
+  EXPECT_EQ(LastSaid(), "There is no master list (KoraName.Mas) in folder c:\\korawin\\Either "
+                        "download a current file from the KORA web page or ring KORA ");
+}
+
+TEST_F(MasterTest, AnIndexThatCannotBeReadIsTold) {
+  Make(kList);
+  for (const char* text : {"", "1,2,3\r\n", "\xFF\xFE"}) {
+    home.Put(kHostSystem + "KoraName.idx", text);
+    std::vector<EditorRow> rows{{"BHP", "", "", "", "", ""}};
+    EXPECT_FALSE(UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs));
+    EXPECT_EQ(LastTitle(), "Master List");
+    EXPECT_EQ(rows[0].name, "");
+  }
+  std::filesystem::remove(home.path() + "/" + kHostSystem + "KoraName.idx");
+  std::vector<EditorRow> rows;
+  EXPECT_FALSE(UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs));
+  EXPECT_EQ(LastSaid(), "There is a problem with the Master list");
+}
+
+TEST_F(MasterTest, AHostileIndexLeadsNowhere) {
+  Make(kList);
+  home.Put(kHostSystem + "KoraName.idx",
+           "-5,99999,0,0,0,0,0,0,0,0,0,0,0,0,2147483647,0,0,0,0,0,0,0,0,0,0,1\r\n");
+  const MasterList list = ReadMasterList(home.files(), kSystem);
+  EXPECT_EQ(FindMaster(list, "AAA", list.StartOf("AAA")).code, "");
+  EXPECT_EQ(FindMaster(list, "BHP", list.StartOf("BHP")).code, "");
+  EXPECT_EQ(FindMaster(list, "ORE", list.StartOf("ORE")).code, "");
+}
+
+TEST_F(MasterTest, ATableBesideTheListUnscramblesIt) {
+  std::string table;  // each letter, digit and sign for the one behind it, the last for the first
+  for (int c = 48; c <= 122; ++c) table += std::to_string(c == 122 ? 48 : c + 1) + "\r\n";
+  home.Put(kHostSystem + "KoraName.Tab", table);
+  EXPECT_EQ(Make(kList), 5);
+  const std::string bytes = home.Get(kHostSystem + "KoraName.Mas");
+  EXPECT_EQ(bytes.substr(3 * 62, 26), "ORE   3 0010Nqd Lhmhmf Ksc");
+  EXPECT_EQ(Find("ORE").name, "Ore Mining Ltd");
+  EXPECT_EQ(Find("BHP").category, "22");
+  home.Put(kHostSystem + "KoraName.Tab", "48\r\n49\r\n");
+  EXPECT_EQ(ErrorOf([&] { LoadMasterTable(home.files(), kSystem); }), kBadCall);
+}
+
+TEST_F(MasterTest, ALineThatCannotBeTakenRefusesTheList) {
+  Make(kList);
+  const auto before = Everything();
+  for (const char* line : {"..,4,1,1,x,", "ORE,x,1,1,x,", "ORE,4,100,1,x,", "ORE,4,1,1234,x,",
+                           "ORE,4,1,1,12345678901234567890123456789012345,",
+                           "ORE,4,1,1,x,123456789012345", "ORE,4,1,1,x,y,z", "ORE,4,1,1,\x01,"}) {
+    EXPECT_FALSE(Make("BHP,4,1,1,a,b\n" + std::string(line) + "\n")) << line;
+    EXPECT_NE(LastSaid().find("list.csv line 2: "), std::string::npos) << LastSaid();
+    EXPECT_EQ(LastTitle(), "KORA Master List");
+  }
+  EXPECT_FALSE(Make("BHP,4,1,1,a,b\n"));  // fewer than 2 count as none
+  EXPECT_EQ(Everything(), before);
+}
+
+TEST_F(MasterTest, AShortListCountsAsMissing) {
+  home.Put(kHostSystem + "KoraName.Mas", std::string(123, 'A'));
+  EXPECT_TRUE(ReadMasterRecords(home.files(), kSystem).empty());
+  home.Put(kHostSystem + "KoraName.Mas", std::string(124, 'A'));
+  EXPECT_EQ(ReadMasterRecords(home.files(), kSystem).size(), 2u);
+  EXPECT_EQ(MasterMissingLines()[2], "or ring KORA ");
+  EXPECT_EQ(LookUpStart(3), 1);
+  EXPECT_EQ(LookUpStart(4), 1);
+  EXPECT_EQ(LookUpStart(10), 7);
+}
