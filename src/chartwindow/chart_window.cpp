@@ -379,6 +379,11 @@ bool ChartWindow::Compose(const ChartRequest& request) {
 
 bool ChartWindow::Recompose() {
   if (Loading || !HasChart()) return false;
+  if (Chart.OscPanel == 2 || state().SplitScreen) {
+    // The second chart is still to come: the first one alone is drawn anew.
+    first_.GridLines = services_.settings.charts.GridLines;
+    return RedrawPair();
+  }
   if (!Compose()) return false;
   if (!panelCode_.empty()) ShowPanel(panelCode_);
   return true;
@@ -690,6 +695,8 @@ void ChartWindow::ShowSaved(const std::string& path) {
   SavedChartFile = path;
   ChartFromFile = ShowSavedChart(services_.files, services_.dialogs, services_.price,
                                  services_.settings.fonts, services_.colours, path);
+  // Whatever came of it, the composed chart is gone: nothing reads its tables.
+  if (!ChartFromFile) Chart.ChartDrawn = false;
 }
 
 // ---- The date limit
