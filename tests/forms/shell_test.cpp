@@ -1,3 +1,4 @@
+#include <QAbstractButton>
 #include <QComboBox>
 #include <QDir>
 #include <QFile>
@@ -458,6 +459,19 @@ TEST_F(ChtsTest, PricesThatCameInShowOnTheChart) {
   EXPECT_EQ(charts.window().Chart.Bars.BarCount, bars + 1);
   EXPECT_EQ(shown(), "BBB.WDT");
   EXPECT_EQ(session->current.Rec.Code.trimmed(), "BBB") << "as the update left another";
+}
+
+TEST_F(ChtsTest, AnAverageSwitchedOnInTheDefaultsStandsOnTheChart) {
+  Chts& charts = OpenCharts();
+  ASSERT_FALSE(charts.window().Request.Ma2On);
+  QTimer::singleShot(0, [&] {
+    auto* defaults = Find<QDialog>(&charts, "ChtDef");
+    ASSERT_NE(defaults, nullptr);
+    Find<QAbstractButton>(defaults, "AvTwo")->click();
+    defaults->reject();
+  });
+  Find<QAction>(&charts, "cmChtDef")->trigger();
+  EXPECT_TRUE(charts.window().Request.Ma2On);
 }
 
 TEST_F(ChtsTest, TheUnitOfVolumesStandsOnTheChart) {

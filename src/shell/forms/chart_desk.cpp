@@ -125,7 +125,7 @@ void ChartDesk::WireWindow() {
   w.SetForm("new", [this] { OpenSelection(); });
   w.SetForm("Chart2", [this] { OpenSecondChart(); });
   w.SetForm("OscFrm", [this] { OpenOscFrm(); });
-  w.SetForm("cmChtDef", [this] { OpenChtDef(true, false); });
+  w.SetForm("cmChtDef", [this] { OpenChtDef(ChtDefOpener::kChartWindow); });
   w.SetForm("cmChtSpaces", [this] { OpenChtSp(); });
   w.SetForm("cmPageSetup", [this] { OpenPage(); });
   w.SetForm("cmPrintChart", [this] { PrintChart(); });
@@ -238,7 +238,9 @@ ChtSelServices ChartDesk::SelectionServices() {
             if (chts_) chts_->parentWidget()->close();
             hooks_.menusBack();
           },
-          .openChtDef = [this] { OpenChtDef(false, true); },
+          .openChtDef = [this](const auto& averagesChanged) {
+            OpenChtDef(ChtDefOpener::kChartSelection, averagesChanged);
+          },
           .openFinDate = [this] { return OpenFinDate(); },
           .openChtBands = [this] { OpenChtBands(); },
           .openWMPath = [this] {
@@ -304,17 +306,17 @@ void ChartDesk::OpenChtBands() {
 
 // ---- Forms of the menu
 
-void ChartDesk::OpenChtDef(bool fromWindow, bool fromSelection) {
-  QWidget* parent = fromSelection && selectionForm_ ? selectionForm_.data() : Over();
+void ChartDesk::OpenChtDef(ChtDefOpener opener, const std::function<void()>& averagesChanged) {
+  QWidget* parent = opener == ChtDefOpener::kChartSelection && selectionForm_
+                        ? selectionForm_.data()
+                        : Over();
   ChtDef form({.ini = session_.ini,
                .files = session_.files,
                .dialogs = session_.dialogs,
                .settings = session_.settings,
                .colours = session_.colours,
                .chartPeriod = session_.charts.ChartPeriod,
-               .opener = fromWindow      ? ChtDefOpener::kChartWindow
-                         : fromSelection ? ChtDefOpener::kChartSelection
-                                         : ChtDefOpener::kShell,
+               .opener = opener,
                .readSettings = hooks_.readSettings,
                .openScales = [this] {
                  Scales scales({.files = session_.files,
@@ -326,12 +328,16 @@ void ChartDesk::OpenChtDef(bool fromWindow, bool fromSelection) {
                  scales.exec();
                },
                .refreshChart = [this] { Refresh(); },
-               .showAverages = {}},
+               .averagesChanged = [this, averagesChanged] {
+                 session_.charts.Ma1On = session_.settings.charts.AvOne;
+                 session_.charts.Ma2On = session_.settings.charts.AvTwo;
+                 if (averagesChanged) averagesChanged();
+               }},
               parent);
   form.exec();
 }
 
-void ChartDesk::OpenDefaults() { OpenChtDef(false, false); }
+void ChartDesk::OpenDefaults() { OpenChtDef(ChtDefOpener::kShell); }
 
 void ChartDesk::OpenFonts() { Show(new ChtFonts(Look([this] { Refresh(); }), over_)); }
 
