@@ -2,6 +2,7 @@
 
 #include <QBuffer>
 #include <QFontMetricsF>
+#include <QLibrary>
 #include <QPageLayout>
 #include <QPageSize>
 #include <QPainter>
@@ -304,6 +305,19 @@ std::unique_ptr<QPrinter> OpenQueue(const std::string& device, const std::string
   return printer;
 }
 
+// Whether CUPS refused the document that Qt has just handed to it, of which Qt says nothing: a
+// queue that takes none, a service that is gone. Elsewhere there is nobody to ask.
+bool QueueRefused() {
+#ifdef Q_OS_UNIX
+  constexpr int kFirstError = 0x100;  // of IPP; what is below is a success
+  using LastError = int (*)();
+  const auto lastError = LastError(QLibrary::resolve("cups", 2, "cupsLastError"));
+  return lastError && lastError() >= kFirstError;
+#else
+  return false;
+#endif
+}
+
 }  // namespace
 
 Sheet QtPrinter::Page() const {
@@ -372,7 +386,7 @@ void QtPrinter::SendToQueue(const std::string& title) const {
   const auto printer = OpenQueue(device, paper_, orientation_);
   printer->setDocName(ToQt(title));
   printer->setCreator("KORA Charting");
-  if (!Paint(*printer) || printer->printerState() == QPrinter::Error)
+  if (!Paint(*printer) || printer->printerState() == QPrinter::Error || QueueRefused())
     throw RunTimeError(kDeviceNotAvailable);
 }
 
