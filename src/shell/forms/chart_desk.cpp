@@ -178,6 +178,12 @@ void ChartDesk::OpenChtSp() {
 // ---- Printing
 
 PrintServices ChartDesk::Printing() {
+  // The printer starts with its page as it was kept; from then on the forms turn it.
+  if (!pageTurned_) {
+    pageTurned_ = true;
+    const std::int16_t kept = session_.settings.page.Orient;
+    if (kept == kPortrait || kept == kLandscape) printer_.SetOrientation(kept);
+  }
   return {session_.files,   session_.ini,     session_.dialogs, session_.settings,
           session_.colours, session_.printer, printer_};
 }

@@ -1,0 +1,19 @@
+#include "chart/forms/printer_list.h"
+
+#include <QComboBox>
+
+#include "platform/qt/form_parts.h"
+#include "platform/qt/qt_printer.h"
+
+namespace kora {
+
+QComboBox* NewPrinterList(QWidget* form, const Printer& printer) {
+  auto* list = new QComboBox(form);
+  list->setObjectName("Combo1");
+  for (const std::string& name : printer.DeviceNames()) list->addItem(FormText(name));
+  list->setCurrentIndex(list->findText(
+      FormText(printer.Exists() ? printer.DeviceName() : std::string(QtPrinter::kPdfPrinter))));
+  return list;
+}
+
+}  // namespace kora
