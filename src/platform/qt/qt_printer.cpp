@@ -2,6 +2,7 @@
 
 #include <QBuffer>
 #include <QFontMetricsF>
+#include <QHashFunctions>
 #include <QLibrary>
 #include <QPageLayout>
 #include <QPageSize>
@@ -9,6 +10,7 @@
 #include <QPdfWriter>
 #include <QPrinter>
 #include <QPrinterInfo>
+#include <QScopeGuard>
 #include <algorithm>
 #include <cmath>
 #include <memory>
@@ -365,6 +367,9 @@ bool QtPrinter::Paint(QPagedPaintDevice& device) const {
 }
 
 std::string QtPrinter::Pdf(const std::string& title) const {
+  // The fonts stand in the file in the order of a hash: the same chart is to be the same file.
+  QHashSeed::setDeterministicGlobalSeed();
+  const auto randomAgain = qScopeGuard([] { QHashSeed::resetRandomGlobalSeed(); });
   QByteArray bytes;
   QBuffer out(&bytes);
   out.open(QIODevice::WriteOnly);
