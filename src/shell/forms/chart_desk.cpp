@@ -202,8 +202,13 @@ void ChartDesk::OpenPage() {
 
 void ChartDesk::PrintChart() {
   const QSizeF size = chts_->ChartSize();
-  const std::string code(session_.current.Rec.Code.trimmed());
-  printChoice_.pdfFile = session_.settings.paths.ChartSavePath + code + ".pdf";
+  const ChartWindow& shown = chts_->window();
+  std::string name(session_.current.Rec.Code.trimmed());
+  if (shown.ChartFromFile) {
+    name = shown.SavedChartFile.substr(shown.SavedChartFile.find_last_of('\\') + 1);
+    name = name.substr(0, name.find_last_of('.'));
+  }
+  printChoice_.pdfFile = session_.settings.paths.ChartSavePath + name + ".pdf";
   const QPointer<Chts> window = chts_;
   AskAndPrint(Printing(), printChoice_,
               {.chart = {size.width(), size.height()},
@@ -212,6 +217,8 @@ void ChartDesk::PrintChart() {
                  if (!window) return std::string();
                  const std::string before = window->windowTitle().toStdString();
                  window->setWindowTitle(QString::fromStdString(caption));
+                 // Printing leaves no time for what is painted later.
+                 if (QWidget* frame = window->parentWidget()) frame->repaint();
                  return before;
                },
                .done = {}},
