@@ -358,9 +358,11 @@ TEST_F(PrintForms, WithoutADefaultPrinterThePdfIsChosen) {
   EXPECT_FALSE(choice.PrintCancelled);
   EXPECT_EQ(pdf.device, "PDF file");
 
-  pdf.device.clear();
-  PrinterSetup setup(services, nullptr);
-  EXPECT_EQ(Find<QComboBox>(&setup, "Combo1")->currentText(), "PDF file");
+  for (const char* gone : {"", "A press that was sold"}) {
+    pdf.device = gone;
+    PrinterSetup setup(services, nullptr);
+    EXPECT_EQ(Find<QComboBox>(&setup, "Combo1")->currentText(), "PDF file");
+  }
 }
 
 TEST_F(PrintForms, WithoutAnyPrinterTheCopyDialogSaysSo) {

@@ -11,8 +11,9 @@ QComboBox* NewPrinterList(QWidget* form, const Printer& printer) {
   auto* list = new QComboBox(form);
   list->setObjectName("Combo1");
   for (const std::string& name : printer.DeviceNames()) list->addItem(FormText(name));
-  list->setCurrentIndex(list->findText(
-      FormText(printer.Exists() ? printer.DeviceName() : std::string(QtPrinter::kPdfPrinter))));
+  int chosen = list->findText(FormText(printer.DeviceName()));
+  if (chosen < 0) chosen = list->findText(FormText(QtPrinter::kPdfPrinter));
+  list->setCurrentIndex(chosen);
   return list;
 }
 
