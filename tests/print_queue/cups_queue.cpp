@@ -48,7 +48,7 @@ CupsQueue::CupsQueue() {
   const auto all = QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner | QFile::ReadGroup |
                    QFile::ExeGroup | QFile::ReadOther | QFile::ExeOther;
   QFile::setPermissions(root, all);
-  for (const char* folder : {"root", "spool", "cache", "state", "tmp"})
+  for (const char* folder : {"server", "spool", "cache", "state", "tmp"})
     if (!QDir(root).mkdir(folder)) return;
   QFile::setPermissions(root + "/tmp", all | QFile::WriteGroup | QFile::WriteOther);
   const QString socket = root + "/socket";
@@ -56,14 +56,14 @@ CupsQueue::CupsQueue() {
   // have different files.
   const qint64 first = QCoreApplication::applicationPid() % 200000 * 1000 + 1;
   if (!Put(root + "/cache/job.cache", "NextJobId " + QByteArray::number(first) + "\n") ||
-      !Put(root + "/root/cupsd.conf",
+      !Put(root + "/server/cupsd.conf",
            "Listen " + socket.toUtf8() +
                "\nLogLevel info\nWebInterface No\nBrowsing No\nDefaultAuthType None\n"
                "<Location />\n  Allow all\n</Location>\n"
                "<Policy default>\n  <Limit All>\n    Order allow,deny\n    Allow all\n"
                "  </Limit>\n</Policy>\n") ||
-      !Put(root + "/root/cups-files.conf",
-           QString("ServerRoot %1/root\nRequestRoot %1/spool\nCacheDir %1/cache\n"
+      !Put(root + "/server/cups-files.conf",
+           QString("ServerRoot %1/server\nRequestRoot %1/spool\nCacheDir %1/cache\n"
                    "StateDir %1/state\nTempDir %1/tmp\nErrorLog %1/error_log\n"
                    "AccessLog %1/access_log\nPageLog %1/page_log\n")
                .arg(root)
@@ -72,8 +72,8 @@ CupsQueue::CupsQueue() {
   daemon_.setProcessChannelMode(QProcess::MergedChannels);
   // A test that crashes takes its daemon with it.
   daemon_.setChildProcessModifier([] { prctl(PR_SET_PDEATHSIG, SIGTERM); });
-  daemon_.start(Program("cupsd"), {"-f", "-c", root + "/root/cupsd.conf", "-s",
-                                   root + "/root/cups-files.conf"});
+  daemon_.start(Program("cupsd"), {"-f", "-c", root + "/server/cupsd.conf", "-s",
+                                   root + "/server/cups-files.conf"});
   if (!daemon_.waitForStarted(kLongest)) return;
   qputenv("CUPS_SERVER", socket.toUtf8());
   qputenv("CUPS_USER", "kora-tests");
