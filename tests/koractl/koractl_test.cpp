@@ -401,6 +401,19 @@ TEST_F(KoractlTest, PrintMakesAPdfOfOnePage) {
   EXPECT_FALSE(home.Exists("kora/" + kHostData + "TCht.Tmp"));
 }
 
+TEST_F(KoractlTest, AChartPrintedAgainIsTheSameFileButForItsDate) {
+  MakeHome();
+  const auto print = [&] {
+    EXPECT_EQ(Out({"print", "ABC", "--osc", "MACD", "--out", home.path() + "/a.pdf"}), "");
+    std::string pdf = home.Get("a.pdf");
+    const size_t date = pdf.find("/CreationDate");
+    EXPECT_NE(date, pdf.npos);
+    return pdf.erase(date, pdf.find('\n', date) - date);
+  };
+  const std::string first = print();
+  for (int again = 0; again < 4; ++again) EXPECT_EQ(print(), first);
+}
+
 TEST_F(KoractlTest, ASavedChartPrintsAsTheChartItself) {
   MakeHome();
   const std::string saved = home.path() + "/a.CHT";

@@ -177,6 +177,12 @@ void ChartDesk::OpenChtSp() {
 // ---- Printing
 
 PrintServices ChartDesk::Printing() {
+  // The printer starts with its page as it was kept; from then on the forms turn it.
+  if (!pageTurned_) {
+    pageTurned_ = true;
+    const std::int16_t kept = session_.settings.page.Orient;
+    if (kept == kPortrait || kept == kLandscape) printer_.SetOrientation(kept);
+  }
   return {session_.files,   session_.ini,     session_.dialogs, session_.settings,
           session_.colours, session_.printer, printer_};
 }
@@ -195,8 +201,13 @@ void ChartDesk::OpenPage() {
 
 void ChartDesk::PrintChart() {
   const QSizeF size = chts_->ChartSize();
-  const std::string code(session_.current.Rec.Code.trimmed());
-  printChoice_.pdfFile = session_.settings.paths.ChartSavePath + code + ".pdf";
+  const ChartWindow& shown = chts_->window();
+  std::string name(session_.current.Rec.Code.trimmed());
+  if (shown.ChartFromFile) {
+    name = shown.SavedChartFile.substr(shown.SavedChartFile.find_last_of('\\') + 1);
+    name = name.substr(0, name.find_last_of('.'));
+  }
+  printChoice_.pdfFile = session_.settings.paths.ChartSavePath + name + ".pdf";
   const QPointer<Chts> window = chts_;
   AskAndPrint(Printing(), printChoice_,
               {.chart = {size.width(), size.height()},
@@ -205,6 +216,8 @@ void ChartDesk::PrintChart() {
                  if (!window) return std::string();
                  const std::string before = window->windowTitle().toStdString();
                  window->setWindowTitle(QString::fromStdString(caption));
+                 // Printing leaves no time for what is painted later.
+                 if (QWidget* frame = window->parentWidget()) frame->repaint();
                  return before;
                },
                .done = {}},

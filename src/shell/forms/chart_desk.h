@@ -75,6 +75,7 @@ class ChartDesk {
   QPointer<QDialog> selectionForm_, secondForm_;
   PrintChoice printChoice_;
   QtPrinter printer_;
+  bool pageTurned_ = false;
   float boxValue_ = 0;  // of the point-and-figure chart, as its settings box left it
 };
 
