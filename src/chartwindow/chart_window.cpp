@@ -345,7 +345,8 @@ ChartServices ChartWindow::Services(Surface& price, Surface* panel, ChartScript*
           .price = price,
           .panel = panel,
           .script = script,
-          .overlays = PriceOverlays(state().MMAOn, services_.settings.osc.MMASet)};
+          .overlays = PriceOverlays(state().MMAOn, services_.settings.osc.MMASet),
+          .VolumeUnitText = services_.VolumeUnitText};
 }
 
 bool ChartWindow::Compose() {

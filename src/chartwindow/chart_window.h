@@ -37,6 +37,8 @@ struct ChartWindowServices {
   std::function<void()> openOscFrm = {};
   // The dialog that chooses the second chart of a pair; it ends with NextChart.
   std::function<void()> openChart2 = {};
+  // The unit of a security's volumes; none while it is empty.
+  std::function<std::string(const NameRec&)> VolumeUnitText = {};
 };
 
 // Heights of the pictures of a chart window, in its units.

@@ -43,13 +43,11 @@ Form* Show(Form* form) {
 
 }  // namespace
 
-ChartDesk::ChartDesk(Session& session, QWidget* over, QMdiArea* mdi,
-                     std::function<void()> readSettings, std::function<void()> menusBack)
+ChartDesk::ChartDesk(Session& session, QWidget* over, QMdiArea* mdi, ChartDeskHooks hooks)
     : session_(session),
       over_(over),
       mdi_(mdi),
-      readSettings_(std::move(readSettings)),
-      menusBack_(std::move(menusBack)),
+      hooks_(std::move(hooks)),
       selection_({.files = session.files,
                   .dialogs = session.dialogs,
                   .settings = session.settings,
@@ -100,9 +98,10 @@ void ChartDesk::OpenWindow() {
                     .colours = session_.colours,
                     .current = session_.current,
                     .state = session_.charts,
+                    .VolumeUnitText = hooks_.VolumeUnitText,
                     .closed = [this] {
                       if (selectionForm_) selectionForm_->deleteLater();
-                      menusBack_();
+                      hooks_.menusBack();
                     }});
   WireWindow();
   QMdiSubWindow* frame = mdi_->addSubWindow(chts_);
@@ -237,12 +236,14 @@ ChtSelServices ChartDesk::SelectionServices() {
           },
           .closed = [this] {
             if (chts_) chts_->parentWidget()->close();
-            menusBack_();
+            hooks_.menusBack();
           },
           .openChtDef = [this] { OpenChtDef(false, true); },
           .openFinDate = [this] { return OpenFinDate(); },
           .openChtBands = [this] { OpenChtBands(); },
-          .openWMPath = {}};
+          .openWMPath = [this] {
+            return hooks_.openWMPath(selectionForm_ ? selectionForm_.data() : Over());
+          }};
 }
 
 void ChartDesk::OpenSelection() {
@@ -314,7 +315,7 @@ void ChartDesk::OpenChtDef(bool fromWindow, bool fromSelection) {
                .opener = fromWindow      ? ChtDefOpener::kChartWindow
                          : fromSelection ? ChtDefOpener::kChartSelection
                                          : ChtDefOpener::kShell,
-               .readSettings = readSettings_,
+               .readSettings = hooks_.readSettings,
                .openScales = [this] {
                  Scales scales({.files = session_.files,
                                 .dataPath = session_.settings.paths.CurrentDataPath,
