@@ -260,7 +260,7 @@ TEST_F(DownloadSettingsTest, AHugeUpdateListIsRefused) {
 
 TEST_F(DownloadSettingsTest, DamagedListsAreReadForWhatTheyHave) {
   Mutator(13).Run({"ORE,1,Ore Ltd\r\nZAP,2,Zap\r\n", "c:\\1\\\r\nb\r\nc\r\nd\r\ne\r\n4\r\ng\r\n", ""},
-                  600, [&](const std::string& text) {
+                  300, [&](const std::string& text) {
                     home.Put(kHostSystem + "Update.Lst", text);
                     for (const UpdateRow& row : ReadUpdateList(home.files(), kSystem)) {
                       EXPECT_FALSE(row.code.empty());

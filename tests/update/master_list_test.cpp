@@ -254,7 +254,7 @@ TEST_F(MasterTest, OddListsIndexesAndTablesEndInAMessageOrNothing) {
   int refused = 0, taken = 0;
   for (const auto& [name, text] : whole) {
     for (const auto& [other, bytes] : whole) home.Put(kHostSystem + other, bytes);
-    Mutator(11).Run({text, ""}, 400, [&](const std::string& damaged) {
+    Mutator(11).Run({text, ""}, 200, [&](const std::string& damaged) {
       home.Put(kHostSystem + name, damaged);
       std::vector<EditorRow> rows{{"AAA", "", "", "", "", ""}, {"ZZZ", "z", "", "", "", ""}};
       dialogs.said.clear();

@@ -161,7 +161,7 @@ TEST_F(DetailsTest, MoreCodesThanThereAreSecuritiesChangeNothing) {
 TEST_F(DetailsTest, DamagedFilesLeaveWholeRecordsAndAnIndexIntoThem) {
   Mutator(12).Run(
       {"Code|ShortDescription|PARVALUE\r\nBHP|Big Hole|1.00\r\nORE|Ore|3\r\n", "", "|||\n|||\n|||"},
-      600, [&](const std::string& text) {
+      150, [&](const std::string& text) {
         Take(text);
         const std::string store = Sys("SecurityDetails.Stx");
         ASSERT_EQ(store.size() % 312, 0u);

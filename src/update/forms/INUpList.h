@@ -7,7 +7,9 @@
 #include "update/forms/update_form.h"
 #include "update/master_list.h"
 
+class QAction;
 class QListWidget;
+class QPushButton;
 class QRadioButton;
 class QTableWidget;
 
@@ -31,11 +33,14 @@ class INUpList : public QDialog {
   void AddMenu();
   void LoadMaster();
   void AddRow(const UpdateRow& row);
+  void SetRow(int at, const UpdateRow& row);
   std::vector<UpdateRow> Rows() const;
   UpdateChoice Choice() const;
   void ShowChoice();
   void AddChecked();
   void DeleteRows();
+  void Print();
+  void EndEditing();
   bool Save();
 
   UpdateFormServices services_;
@@ -43,6 +48,8 @@ class INUpList : public QDialog {
   std::array<QRadioButton*, 3> options_;
   QTableWidget* ss1_;
   QListWidget* list1_;
+  QPushButton* command1_;
+  QAction *ulAdd_, *ulDel_;
   bool loading_ = true;
   bool changed_ = false;
 };

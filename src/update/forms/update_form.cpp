@@ -1,9 +1,26 @@
 #include "update/forms/update_form.h"
 
+#include <QLineEdit>
+
 #include "base/runtime_error.h"
+#include "platform/qt/form_parts.h"
+#include "settings/forms/Locate.h"
 #include "update/download_list.h"
 
 namespace kora {
+
+QToolButton* NewLocateButton(const UpdateFormServices& services, const QString& name,
+                             QLineEdit* box, std::function<LocateCase()> what, QWidget* form) {
+  return NewFolderButton(
+      form, name,
+      [&files = services.files, &dialogs = services.dialogs, box, what = std::move(what), form] {
+        auto* locate = new Locate(
+            files, dialogs, what(),
+            [box](const std::string& folder) { box->setText(Shown(folder)); }, form);
+        locate->setAttribute(Qt::WA_DeleteOnClose);
+        locate->open();
+      });
+}
 
 bool SaveOrTell(Dialogs& dialogs, const QString& title, const std::function<bool()>& save) {
   try {
