@@ -1,5 +1,7 @@
 #include "update/forms/INUpList.h"
 
+#include <QFontDatabase>
+#include <QFrame>
 #include <QGridLayout>
 #include <QHeaderView>
 #include <QLabel>
@@ -9,6 +11,7 @@
 #include <QPushButton>
 #include <QRadioButton>
 #include <QRegularExpressionValidator>
+#include <QScreen>
 #include <QStyledItemDelegate>
 #include <QTableWidget>
 #include <QTimer>
@@ -40,10 +43,18 @@ class CodeDelegate : public QStyledItemDelegate {
 
 }  // namespace
 
-RecSav::RecSav(QWidget* parent) : QDialog(parent) {
+// It takes neither the focus nor a place among the windows.
+RecSav::RecSav(QWidget* parent) : QDialog(parent, Qt::ToolTip) {
   setObjectName("RecSav");
-  auto* box = new QVBoxLayout(this);
-  box->addWidget(new QLabel("Saved", this), 0, Qt::AlignCenter);
+  auto* frame = new QFrame(this);
+  frame->setFrameStyle(QFrame::Box | QFrame::Raised);
+  auto* around = new QVBoxLayout(this);
+  around->setContentsMargins(0, 0, 0, 0);
+  around->addWidget(frame);
+  auto* box = new QVBoxLayout(frame);
+  const int margin = fontMetrics().height() * 2;
+  box->setContentsMargins(margin, margin / 2, margin, margin / 2);
+  box->addWidget(new QLabel("Saved", frame), 0, Qt::AlignCenter);
   setAttribute(Qt::WA_DeleteOnClose);
   QTimer::singleShot(kSavedMs, this, [this] { close(); });
 }
@@ -76,10 +87,12 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   ss1_->setSelectionBehavior(QAbstractItemView::SelectRows);
   ss1_->setAccessibleName("Securities to update");
   ss1_->setTabKeyNavigation(false);
+  ss1_->setWordWrap(false);
   ss1_->setItemDelegateForColumn(0, new CodeDelegate(ss1_));
   list1_ = new QListWidget(this);
   list1_->setObjectName("List1");
   list1_->setAccessibleName("Master list");
+  list1_->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));  // names stand in line
   command1_ = new QPushButton("&Add checked items", this);
   command1_->setObjectName("Command1");
   command1_->setAutoDefault(false);
@@ -103,6 +116,11 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   LoadMaster();
   ShowChoice();
   loading_ = false;
+  const QFontMetrics metrics = fontMetrics();
+  resize(QSize(metrics.averageCharWidth() * 130, metrics.height() * 34)
+             .boundedTo(screen()->availableSize() * 0.9));
+  ss1_->setColumnWidth(0, metrics.averageCharWidth() * 14);
+  ss1_->setColumnWidth(1, metrics.averageCharWidth() * 9);
 }
 
 void INUpList::AddMenu() {
@@ -114,7 +132,7 @@ void INUpList::AddMenu() {
     return action;
   };
   QMenu* file = bar->addMenu("&File");
-  entry(file, "ulSave", "&Save List", [this] { Save(); });
+  entry(file, "ulSave", "&Save List", [this] { Save(this); });
   entry(file, "UlPrint", "&Print List", [this] { Print(); })->setEnabled(bool(services_.print));
   entry(file, "ulClose", "&Close", [this] { reject(); });
   QMenu* edit = bar->addMenu("&Edit");
@@ -238,7 +256,7 @@ void INUpList::Print() {
 // What is being typed into a cell counts.
 void INUpList::EndEditing() { ss1_->setFocus(); }
 
-bool INUpList::Save() {
+bool INUpList::Save(QWidget* over) {
   EndEditing();
   UpdateChoice choice = Choice();
   bool written = false;
@@ -252,13 +270,13 @@ bool INUpList::Save() {
   options_[size_t(choice)]->setChecked(true);
   ShowChoice();
   changed_ = false;
-  if (written) (new RecSav(parentWidget() ? parentWidget() : this))->show();
+  if (written) (new RecSav(over))->show();
   return true;
 }
 
 void INUpList::reject() {
   EndEditing();
-  if (changed_ && !Save() &&
+  if (changed_ && !Save(parentWidget()) &&
       services_.dialogs.Ask("The list could not be saved. Close without saving ?", "Update List",
                             Buttons::kYesNo) != Answer::kYes)
     return;
