@@ -49,15 +49,7 @@ DLWizard::DLWizard(UpdateFormServices services, QWidget* parent)
     label->setBuddy(text);
     grid->addWidget(label, row, 0);
     grid->addWidget(text, row, 1);
-    grid->addWidget(NewLocateButton(services_, QString("Picture1(%1)").arg(i), text,
-                                    [this, i] {
-                                      return WizardLocate(
-                                          ReadWmPaths(services_.files,
-                                                      services_.settings.paths.SystemPath),
-                                          i, services_.settings.paths);
-                                    },
-                                    this),
-                    row, 2);
+    grid->addWidget(NewDestinationButton(services_, i, text, this), row, 2);
   }
   grid->setColumnStretch(1, 1);
   texts_[5]->setToolTip("Saved as the folder of ASX stocks; Data Destination Paths has its own");

@@ -39,6 +39,11 @@ class CodeDelegate : public QStyledItemDelegate {
         QRegularExpression("[^,\"\\x00-\\x20]*"), editor));
     return editor;
   }
+  void setModelData(QWidget* editor, QAbstractItemModel* model,
+                    const QModelIndex& index) const override {
+    const std::string code = static_cast<QLineEdit*>(editor)->text().toStdString();
+    model->setData(index, Shown(UCase(code)));
+  }
 };
 
 }  // namespace

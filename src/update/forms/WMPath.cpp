@@ -31,21 +31,13 @@ WMPath::WMPath(UpdateFormServices services, QWidget* parent)
     texts_[at]->setObjectName(QString("Text%1").arg(i + 1));
     texts_[at]->setMinimumWidth(fontMetrics().averageCharWidth() * 45);
     label->setBuddy(texts_[at]);
+    grid->addWidget(NewDestinationButton(services_, i, texts_[at], this), i + 1, 2);
     options_[at] = new QRadioButton(this);
     options_[at]->setObjectName(QString("Option1(%1)").arg(i));
     options_[at]->setAccessibleName("View charts from " + label->text().remove('&'));
     options_[at]->setChecked(lines[kWmChosen] == std::to_string(i));
     grid->addWidget(label, i + 1, 0);
     grid->addWidget(texts_[at], i + 1, 1);
-    grid->addWidget(NewLocateButton(services_, QString("Picture1(%1)").arg(i), texts_[at],
-                                    [this, i] {
-                                      return WizardLocate(
-                                          ReadWmPaths(services_.files,
-                                                      services_.settings.paths.SystemPath),
-                                          i, services_.settings.paths);
-                                    },
-                                    this),
-                    i + 1, 2);
     grid->addWidget(options_[at], i + 1, 3, Qt::AlignCenter);
     connect(options_[at], &QRadioButton::clicked, this, [this, i] { Choose(i); });
   }

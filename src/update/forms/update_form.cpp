@@ -6,6 +6,7 @@
 #include "platform/qt/form_parts.h"
 #include "settings/forms/Locate.h"
 #include "update/download_list.h"
+#include "update/download_settings.h"
 
 namespace kora {
 
@@ -20,6 +21,16 @@ QToolButton* NewLocateButton(const UpdateFormServices& services, const QString& 
         locate->setAttribute(Qt::WA_DeleteOnClose);
         locate->open();
       });
+}
+
+QToolButton* NewDestinationButton(const UpdateFormServices& services, int index, QLineEdit* box,
+                                  QWidget* form) {
+  return NewLocateButton(
+      services, QString("Picture1(%1)").arg(index), box,
+      [&files = services.files, &paths = services.settings.paths, index] {
+        return WizardLocate(ReadWmPaths(files, paths.SystemPath), index, paths);
+      },
+      form);
 }
 
 bool SaveOrTell(Dialogs& dialogs, const QString& title, const std::function<bool()>& save) {

@@ -36,6 +36,10 @@ inline QString Shown(std::string_view text) {
 QToolButton* NewLocateButton(const UpdateFormServices& services, const QString& name,
                              QLineEdit* box, std::function<LocateCase()> what, QWidget* form);
 
+// The same for the box of the folder `index`, 0 to 5, of the whole market; "Picture1(index)".
+QToolButton* NewDestinationButton(const UpdateFormServices& services, int index, QLineEdit* box,
+                                  QWidget* form);
+
 // Runs the saving of a form; a failure of the host is told. False then, and when `save` says so.
 bool SaveOrTell(Dialogs& dialogs, const QString& title, const std::function<bool()>& save);
 
