@@ -13,6 +13,7 @@ namespace {
 constexpr const char* kSection = "Download";
 constexpr std::uint64_t kLargestList = 1u << 20;
 constexpr std::uint64_t kLargestUpdateList = 4u << 20;
+constexpr size_t kMostUpdateRows = 100'000;
 constexpr size_t kLongestFolder = 255;
 
 constexpr ServiceEntry kServices[] = {
@@ -262,6 +263,7 @@ std::vector<UpdateRow> ReadUpdateList(const Files& files, const std::string& sys
     UpdateRow row;
     row.code = UCase(Trim(fields[0]));
     if (row.code.empty()) continue;
+    if (rows.size() == kMostUpdateRows) throw RunTimeError(kOutOfMemory);
     if (fields.size() > 1) {
       const double category = Val(fields[1]);
       row.category = category >= 0 && category <= 99 ? CInt(category) : std::int16_t(0);

@@ -109,7 +109,7 @@ struct UpdateRow {
   std::string name;      // UTF-8
 };
 std::string UpdateListFile(const std::string& systemPath);
-// Rows with a code; empty when there is no file. Error 7 beyond 4 MB.
+// Rows with a code; empty when there is no file. Error 7 beyond 4 MB or 100,000 rows.
 std::vector<UpdateRow> ReadUpdateList(const Files& files, const std::string& systemPath);
 
 enum class UpdateChoice { kAll = 0, kListed = 1, kNoWarrants = 2 };  // Option1 of `INUpList`

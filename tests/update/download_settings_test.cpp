@@ -256,6 +256,12 @@ TEST_F(DownloadSettingsTest, AHugeUpdateListIsRefused) {
   home.Put(kHostSystem + "Update.Lst", "ORE,1,\r\n");
   std::filesystem::resize_file(home.path() + "/" + kHostSystem + "Update.Lst", 5u << 20);
   EXPECT_EQ(ErrorOf([&] { ReadUpdateList(home.files(), kSystem); }), kOutOfMemory);
+  std::string text;
+  for (int i = 0; i < 100'000; ++i) text += "A\n";
+  home.Put(kHostSystem + "Update.Lst", text);
+  EXPECT_EQ(ReadUpdateList(home.files(), kSystem).size(), 100'000u);
+  home.Put(kHostSystem + "Update.Lst", text + "B");
+  EXPECT_EQ(ErrorOf([&] { ReadUpdateList(home.files(), kSystem); }), kOutOfMemory);
 }
 
 TEST_F(DownloadSettingsTest, DamagedListsAreReadForWhatTheyHave) {

@@ -364,7 +364,10 @@ TEST_F(UpdateListForm, AddsCheckedItemsInOrderAndSavesThem) {
   EXPECT_EQ(Kept("UpdateAll"), "False");
   auto* box = form->findChild<RecSav*>();
   ASSERT_NE(box, nullptr);
+  EXPECT_TRUE(box->isVisible());
+  EXPECT_EQ(QApplication::activeWindow(), form.get());  // keys still go to the list
   EXPECT_TRUE(WaitFor([this] { return form->findChild<RecSav*>() == nullptr; }));
+  EXPECT_EQ(QApplication::activeWindow(), form.get());
 }
 
 TEST_F(UpdateListForm, SavesAChangedListOnClosing) {
@@ -417,6 +420,7 @@ TEST_F(UpdateListForm, WhatIsBeingTypedIsSaved) {
   QTest::keyClicks(editor, "a,p toolong");
   EXPECT_EQ(editor->text(), "zaptoo");
   Trigger("ulSave");
+  EXPECT_EQ(Grid()->item(1, 0)->text(), "ZAPTOO");
   EXPECT_EQ(home.Get(kSystem + "Update.Lst"), "ORE,3,Mine\r\nZAPTOO,0,\r\n");
 }
 

@@ -275,7 +275,7 @@ bool INUpList::Save(QWidget* over) {
   options_[size_t(choice)]->setChecked(true);
   ShowChoice();
   changed_ = false;
-  if (written) (new RecSav(over))->show();
+  if (written && over) (new RecSav(over))->show();
   return true;
 }
 

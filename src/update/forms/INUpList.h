@@ -41,7 +41,7 @@ class INUpList : public QDialog {
   void DeleteRows();
   void Print();
   void EndEditing();
-  bool Save(QWidget* over);  // "Saved" shows over that window, or alone
+  bool Save(QWidget* over);  // "Saved" shows over that window
 
   UpdateFormServices services_;
   MasterList master_;
