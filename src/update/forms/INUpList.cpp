@@ -97,6 +97,7 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   list1_ = new QListWidget(this);
   list1_->setObjectName("List1");
   list1_->setAccessibleName("Master list");
+  list1_->setUniformItemSizes(true);
   list1_->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));  // names stand in line
   command1_ = new QPushButton("&Add checked items", this);
   command1_->setObjectName("Command1");
