@@ -247,6 +247,19 @@ TEST_F(DownloadTest, SavedDetailsShapeTheMenu) {
   EXPECT_EQ(List(), nullptr) << "saving opens no list";
 }
 
+TEST_F(DownloadTest, TheUpdateListAsksHowToPrint) {
+  home.Put("drive_c/korawin/Update.Lst", "ORE,3,Mine\r\n");
+  Open();
+  Entry("mnuDDetails")->trigger();
+  Click(Find<QDialog>(form.get(), "ModDetails"), "Command1");
+  auto* list = Find<QDialog>(form.get(), "INUpList");
+  ASSERT_NE(list, nullptr);
+  Find<QAction>(list, "UlPrint")->trigger();
+  auto* question = Find<QDialog>(list, "PrintKora");
+  ASSERT_NE(question, nullptr);
+  question->reject();
+}
+
 TEST_F(DownloadTest, ADownloadProgramIsWaitedForThenTheListOpens) {
   struct { int service; const char *entry, *program; } const cases[] = {
       {1, "mnuTARVO", "Dlmain32.EXE"}, {2, "mnuBourse", "Dlbourse32.exe"},

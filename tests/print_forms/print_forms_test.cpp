@@ -4,6 +4,7 @@
 #include <QDoubleSpinBox>
 #include <QLabel>
 #include <QLineEdit>
+#include <QPointer>
 #include <QRadioButton>
 #include <QSpinBox>
 
@@ -407,6 +408,43 @@ class PrintJobs : public PrintForms {
   PrintChoice choice;
   std::vector<std::string> captions;
 };
+
+class ListJobs : public PrintForms {
+ protected:
+  void Run(const char* button) {
+    AskAndPrintTable(Services(), choice,
+                     {.layout = {.heading = "LIST", .columns = {"Code"}, .at = {0}},
+                      .rows = {{"ORE"}, {"ZAP"}}},
+                     nullptr);
+    auto* form = TopLevel<PrintKora>();
+    ASSERT_NE(form, nullptr);
+    Find<QSpinBox>(form, "Text1")->setValue(2);
+    const QPointer<PrintKora> there = form;
+    Click(form, button);
+    EXPECT_TRUE(WaitFor([&] { return there.isNull(); }));
+  }
+  PrintChoice choice;
+};
+
+TEST_F(ListJobs, AListIsPrintedOnceACopy) {
+  Run("Command1");
+  EXPECT_EQ(printer.sent.size(), 2u);
+  EXPECT_TRUE(dialogs.said.empty());
+}
+
+TEST_F(ListJobs, ACancelledListIsNotPrinted) {
+  Run("Command2");
+  EXPECT_EQ(printer.started, 0);
+}
+
+TEST_F(ListJobs, TheFirstFailureIsToldAndEndsIt) {
+  printer.failAtEnd = kDeviceNotAvailable;
+  Run("Command1");
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].title, "Error");
+  EXPECT_EQ(dialogs.said[0].text.find("There is an unexpected error - "), 0u);
+  EXPECT_EQ(printer.started, 1);
+}
 
 TEST_F(PrintJobs, EachCopyIsPrinted) {
   printer.SetOrientation(kLandscape);

@@ -3,6 +3,8 @@
 #include <QCoreApplication>
 #include <QPointer>
 
+#include "base/runtime_error.h"
+
 namespace kora {
 namespace {
 
@@ -16,10 +18,9 @@ void PrintCopies(const PrintServices& s, const PrintChoice& choice, const PrintJ
     if (!PrintChart(services, setup, job.chart, job.scriptPath)) return;
 }
 
-}  // namespace
-
-void AskAndPrint(const PrintServices& services, PrintChoice& choice, PrintJob job,
-                 QWidget* parent) {
+// Asks, and goes on with `print` unless it was cancelled, then with `done`.
+void Ask(const PrintServices& services, PrintChoice& choice, QWidget* parent,
+         std::function<void()> print, std::function<void()> done = {}) {
   std::int16_t& orient = services.settings.page.Orient;
   if (orient != kPortrait && orient != kLandscape) {
     orient = kPortrait;
@@ -27,18 +28,41 @@ void AskAndPrint(const PrintServices& services, PrintChoice& choice, PrintJob jo
   }
   auto* form = new PrintKora(services, choice, parent);
   form->setAttribute(Qt::WA_DeleteOnClose);
-  QObject::connect(form, &QDialog::finished, form, [services, &choice, job = std::move(job),
+  QObject::connect(form, &QDialog::finished, form, [&choice, print = std::move(print),
+                                                      done = std::move(done),
                                                       over = QPointer<QWidget>(parent)] {
     if (!choice.PrintCancelled) {
       // The question goes from the screen before the work begins. Where it asked about a file
       // it goes together with what it stood over, and the keyboard would be nobody's.
       if (over) over->activateWindow();
       QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
-      PrintCopies(services, choice, job);
+      print();
     }
-    if (job.done) job.done();
+    if (done) done();
   });
   form->open();
+}
+
+}  // namespace
+
+void AskAndPrint(const PrintServices& services, PrintChoice& choice, PrintJob job,
+                 QWidget* parent) {
+  const auto done = job.done;
+  Ask(services, choice, parent,
+      [services, &choice, job = std::move(job)] { PrintCopies(services, choice, job); }, done);
+}
+
+void AskAndPrintTable(const PrintServices& services, PrintChoice& choice, TextTable table,
+                      QWidget* parent) {
+  Ask(services, choice, parent, [services, &choice, table = std::move(table)] {
+    try {
+      for (int copy = 0; copy < choice.PrintCopies; ++copy)
+        PrintTable(services.printer, services.settings.fonts, services.settings.page, table);
+    } catch (const RunTimeError& e) {
+      services.dialogs.Message(std::string("There is an unexpected error - ") + e.what(),
+                               "Error");
+    }
+  });
 }
 
 }  // namespace kora

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "chart/forms/PrintKora.h"
+#include "settings/text_print_out.h"
 
 namespace kora {
 
@@ -17,5 +18,9 @@ struct PrintJob {
 // live until `done`.
 void AskAndPrint(const PrintServices& services, PrintChoice& choice, PrintJob job,
                  QWidget* parent);
+
+// The same for a list: asked, then printed once a copy. What fails is told, and ends it.
+void AskAndPrintTable(const PrintServices& services, PrintChoice& choice, TextTable table,
+                      QWidget* parent);
 
 }  // namespace kora

@@ -39,6 +39,8 @@ Main::Main(Session& session, std::string commandLine)
                {.disableMenus = [this] { DisableMenus(); },
                 .enableMenus = [this] { EnableMenus(); },
                 .folderChanged = [this] { FolderChanged(); },
+                .printTable =
+                    [this](const TextTable& table, QWidget* over) { desk_.PrintList(table, over); },
                 .updated = [this] { desk_.PricesChanged(); }}),
       desk_(session, this, mdi_,
             {.readSettings = [this] {

@@ -226,6 +226,11 @@ void ChartDesk::PrintChart() {
 
 void ChartDesk::OpenTextPage() { Show(new CHTPage(Printing(), over_))->CheckPrinter(); }
 
+void ChartDesk::PrintList(const TextTable& table, QWidget* over) {
+  printChoice_.pdfFile = session_.settings.paths.SystemPath + table.layout.heading + ".pdf";
+  AskAndPrintTable(Printing(), printChoice_, table, over);
+}
+
 void ChartDesk::OpenPrinterSetup() { Show(new PrinterSetup(Printing(), over_)); }
 
 // ---- Chart selection

@@ -9,6 +9,7 @@
 #include "chartwindow/forms/selection_form.h"
 #include "indicators/forms/ChtDef.h"
 #include "platform/qt/qt_printer.h"
+#include "settings/text_print_out.h"
 #include "shell/session.h"
 #include "store/forms/look_services.h"
 
@@ -41,6 +42,8 @@ class ChartDesk {
   void OpenListNames();      // CLNames
   void OpenTextPage();       // CHTPage
   void OpenPrinterSetup();   // PrinterSetup
+  // Asks how to print a list, and prints it.
+  void PrintList(const TextTable& table, QWidget* over);
 
   Chts* window() const { return chts_; }
   // After other folders were chosen.

@@ -24,7 +24,8 @@ UpdateFormServices UpdateDesk::FormServices(std::function<void()> saved) {
           .dialogs = session_.dialogs,
           .settings = session_.settings,
           .serviceSaved = std::move(saved),
-          .pathChosen = hooks_.folderChanged};
+          .pathChosen = hooks_.folderChanged,
+          .print = hooks_.printTable};
 }
 
 void UpdateDesk::ShowDetails(std::function<void()> saved) {

@@ -17,6 +17,7 @@ struct UpdateDeskHooks {
   std::function<void()> disableMenus, enableMenus;
   // Another data folder was chosen: title, and the forms that show it.
   std::function<void()> folderChanged;
+  std::function<void(const TextTable&, QWidget* over)> printTable;
   // The form of an update was left, and prices of the data folder may have changed.
   std::function<void()> updated;
 };

@@ -253,10 +253,7 @@ void INUpList::Print() {
     services_.dialogs.Message("No records to print", "Update List");
     return;
   }
-  SaveOrTell(services_.dialogs, windowTitle(), [&] {
-    services_.print(table);
-    return true;
-  });
+  services_.print(table, this);
 }
 
 // What is being typed into a cell counts.

@@ -23,8 +23,8 @@ struct UpdateFormServices {
   Settings& settings;
   std::function<void()> serviceSaved = {};  // the main menu follows the service
   std::function<void()> pathChosen = {};    // CurrentDataPath changed: title, field of CPath
-  // Prints a list, or raises as PrintTable does; without it the entry is greyed.
-  std::function<void(const TextTable&)> print = {};
+  // Asks how to print a list and prints it; what fails is told. Without it the entry is greyed.
+  std::function<void(const TextTable&, QWidget* over)> print = {};
 };
 
 inline QString Shown(std::string_view text) {
