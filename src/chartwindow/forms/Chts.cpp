@@ -31,16 +31,13 @@
 #include "base/text.h"
 #include "indicators/price_overlays.h"
 #include "platform/qt/picture.h"
+#include "platform/qt/to_qt.h"
 
 // Resources of a library are taken in by hand, outside of any namespace.
 static void TakeIcons() { Q_INIT_RESOURCE(chts_icons); }
 
 namespace kora {
 namespace {
-
-QString ToQt(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 struct Entry {
   const char* name;     // empty: a separator

@@ -6,12 +6,10 @@
 #include <QMessageBox>
 #include <QProgressDialog>
 
+#include "platform/qt/to_qt.h"
+
 namespace kora {
 namespace {
-
-QString ToQt(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 // While a question stands the pointer is the normal one, whatever goes on behind it.
 class NormalPointer {
