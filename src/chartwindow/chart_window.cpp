@@ -81,7 +81,21 @@ const ToolButtonText& ToolButtonOf(int button) {
   return kTexts[std::clamp(button, 1, kToolButtons) - 1];
 }
 
-ChartWindow::ChartWindow(const ChartWindowServices& services) : services_(services) {
+ChartWindow::ChartWindow(const ChartWindowServices& services)
+    : dialogs_(services.dialogs),
+      services_{.files = services.files,
+                .dialogs = dialogs_,
+                .settings = services.settings,
+                .ini = services.ini,
+                .user = services.user,
+                .colours = services.colours,
+                .current = services.current,
+                .state = services.state,
+                .price = services.price,
+                .panel = services.panel,
+                .layOut = services.layOut,
+                .openOscFrm = services.openOscFrm,
+                .openChart2 = services.openChart2} {
   RefreshTitle();
 }
 
@@ -169,6 +183,10 @@ bool ChartWindow::Refresh() {
 bool ChartWindow::Resized() {
   ForgetCross();
   if (Loading || (!HasChart() && !ChartFromFile)) return false;
+  return dialogs_.Repeat([this] { return DrawAll(); });
+}
+
+bool ChartWindow::DrawAll() {
   if (ChartFromFile) {
     LayOut(false);
     return ShowSavedChart(services_.files, services_.dialogs, services_.price,
@@ -202,6 +220,7 @@ bool ChartWindow::RedrawPair() {
 
 // Opens the files, finds the record `step` places on and reads it.
 bool ChartWindow::Move(int step, bool filtered) {
+  dialogs_.Forget();
   AnalPageMode = false;
   state().SuppressScript = false;
   EmptyDrawnLines();

@@ -185,8 +185,7 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
   resized_.setInterval(0);
   resized_.callOnTimeout(this, [this] {
     if (busy_) sizeWaits_ = true;
-    // A chart that could not be drawn would only say so again at every size.
-    else if (window_.Chart.ChartDrawn || window_.ChartFromFile) Do([this] { window_.Resized(); });
+    else Do([this] { window_.Resized(); });
   });
   for (PictureBox* picture : {picture1_, picture2_})
     picture->Resized = [this, picture] {
