@@ -38,6 +38,8 @@ struct ChartWindowServices {
   std::function<void()> openOscFrm = {};
   // The dialog that chooses the second chart of a pair; it ends with NextChart.
   std::function<void()> openChart2 = {};
+  // The unit of a security's volumes; none while it is empty.
+  std::function<std::string(const NameRec&)> VolumeUnitText = {};
 };
 
 // Heights of the pictures of a chart window, in its units.
@@ -230,7 +232,7 @@ class ChartWindow {
   bool RedrawPair();
   ChartServices Services(Surface& price, Surface* panel, ChartScript* script);
   OscHost Host(std::string_view code, Composition& chart, const ChartRequest& request,
-               Surface& price, Surface& panel, ChartScript* script) const;
+               Surface& price, Surface& panel, ChartScript* script);
   void ShowPanel(std::string_view code);
   bool PeriodsValid() const;
   bool CompareFileThere();
@@ -242,8 +244,8 @@ class ChartWindow {
   void EraseCross();
   void CrossToColumn(std::int32_t column);
 
-  ToldOnce dialogs_;
-  ChartWindowServices services_;  // with `dialogs_` between the window and its user
+  ChartWindowServices services_;
+  ToldOnce dialogs_;  // through which the window says everything
   ChartWindowView view_;
   std::optional<ChartScript> script_;
   ChartRequest first_;     // of the first chart of a pair

@@ -1,16 +1,21 @@
+#include <QAbstractButton>
+#include <QComboBox>
 #include <QDir>
 #include <QFile>
 #include <QLabel>
 #include <QLineEdit>
+#include <QListWidget>
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QMenu>
 #include <QMenuBar>
 #include <QPushButton>
+#include <QRadioButton>
 #include <QTemporaryDir>
 #include <QTextBrowser>
 #include <QTimer>
 
+#include "base/numbers.h"
 #include "chartwindow/forms/Chart2.h"
 #include "platform/qt/single_instance.h"
 #include "shell/forms/AbtKora.h"
@@ -23,8 +28,17 @@
 namespace kora {
 namespace {
 
+// A day of which AAA alone traded, at 20.
+constexpr const char* kDay = "AAA,20261102,20,21,19,20,500,0\r\n";
+
 class MainTest : public test::FormTest {
  protected:
+  // A main window that was closed has told the application to end, which lets no dialog run
+  // until the application itself has run again.
+  MainTest() {
+    QTimer::singleShot(0, qApp, [] { QCoreApplication::exit(0); });
+    QApplication::exec();
+  }
   Main& Open() {
     ReadSettings();
     form = std::make_unique<Main>(*session, "");
@@ -53,7 +67,8 @@ TEST_F(MainTest, EveryEntryIsThereUnderItsNameWithItsCaption) {
 TEST_F(MainTest, AnEntryWhoseFormIsNotThereIsGreyed) {
   Open();
   for (const char* there : {"mnuChartDisplay", "mnuChartDefaults", "mnuPaths", "mnFnts", "mnuExit",
-                            "mnuLists", "mnuListsUte", "mnuRenameCL", "mnSHlp", "mnuAboutKora"})
+                            "mnuLists", "mnuListsUte", "mnuRenameCL", "mnuDDetails", "mnuModem",
+                            "mnSHlp", "mnuAboutKora"})
     EXPECT_TRUE(Entry(there)->isEnabled()) << there;
   for (const char* notYet : {"mnuKBUpdate", "mnuTextFile", "mnStats"})
     EXPECT_FALSE(Entry(notYet)->isEnabled()) << notYet;
@@ -64,8 +79,6 @@ TEST_F(MainTest, AnEntryWhoseFormIsNotThereIsGreyed) {
 TEST_F(MainTest, TheDownloadMenuFollowsTheService) {
   session->ini.PutSetting("Download", "DataService", "2");
   Open();
-  form->SetOpener("mnuBourse", [] {});
-  form->SetOpener("mnuTARVO", [] {});
   EXPECT_TRUE(Entry("mnuBourse")->isVisible());
   EXPECT_TRUE(Entry("mnuBourse")->isEnabled());
   EXPECT_FALSE(Entry("mnuTARVO")->isVisible());
@@ -146,6 +159,167 @@ TEST_F(MainTest, ASiblingThatIsNotThereIsTold) {
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_NE(dialogs.said[0].text.find("c:\\korawin\\Mmascan.EXE"), std::string::npos);
   EXPECT_TRUE(Menu("mnuFile")->isEnabled());
+}
+
+// ---- Taking data in
+
+// A sibling that runs for some turns, and what was done meanwhile.
+class ScriptedProcesses : public Processes {
+ public:
+  int RunAndWait(const std::string& program, const std::vector<std::string>&,
+                 const std::function<void()>& idle) override {
+    ran.push_back(program);
+    for (int i = 0; i < 3; ++i) {
+      if (meanwhile) meanwhile();
+      idle();
+    }
+    ++ended;
+    return 0;
+  }
+  std::vector<std::string> ran;
+  std::function<void()> meanwhile;
+  int ended = 0;
+};
+
+class DownloadTest : public MainTest {
+ protected:
+  DownloadTest() {
+    session = std::make_unique<Session>(home.path(), dialogs, MachineIo(), MachineClock(),
+                                        processes);
+  }
+  QDialog* List() { return form->findChild<QDialog*>("DLList"); }
+  bool Left() {
+    return WaitFor([&] { return List() == nullptr; });
+  }
+  void PutSibling(const char* name) {
+    home.Put(std::string("drive_c/korawin/") + name, "program");
+  }
+  ScriptedProcesses processes;
+};
+
+TEST_F(DownloadTest, TheEntryTakesADayInAndTheMenusComeBack) {
+  home.Put("drive_c/korawin/download/02NOV26.d", kDay);
+  Open();
+  Entry("mnuModem")->trigger();
+  ASSERT_NE(List(), nullptr);
+  EXPECT_TRUE(List()->isVisible());
+  EXPECT_FALSE(Menu("mnuFile")->isEnabled());
+  Click(List(), "Command1");
+  ASSERT_TRUE(Left()) << "the list is empty, so that the form closes itself";
+  EXPECT_TRUE(Menu("mnuFile")->isEnabled());
+  EXPECT_TRUE(home.Exists("drive_c/korawin/download/02NOV26.dX"));
+  EXPECT_EQ(home.Get("drive_c/korawin/data/AAA.WDT").size(), 29u * 50) << "28 days and this one";
+  EXPECT_EQ(home.Get("drive_c/korawin/data/BBB.WDT").size(), 29u * 50) << "did not trade";
+}
+
+TEST_F(DownloadTest, NothingWaitsIsToldAndNoFormStays) {
+  home.Put("drive_c/korawin/download/readme.txt", "");
+  Open();
+  Entry("mnuModem")->trigger();
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].text, " There are no downloaded files to update. ");
+  EXPECT_EQ(List(), nullptr);
+  EXPECT_TRUE(Menu("mnuAComms")->isEnabled());
+}
+
+TEST_F(DownloadTest, WithoutAServiceItsDetailsComeFirst) {
+  session->ini.PutSetting("Download", "DLPath", "");
+  home.Put("drive_c/NetData/02NOV26.d", kDay);
+  Open();
+  Entry("mnuModem")->trigger();
+  EXPECT_EQ(List(), nullptr);
+  auto* details = Find<QDialog>(form.get(), "ModDetails");
+  ASSERT_NE(details, nullptr);
+  Find<QLineEdit>(details, "Text1")->setText("c:\\NetData\\");
+  Click(details, "Command3");
+  EXPECT_NE(List(), nullptr);
+}
+
+TEST_F(DownloadTest, SavedDetailsShapeTheMenu) {
+  Open();
+  EXPECT_FALSE(Entry("mnuBourse")->isVisible());
+  Entry("mnuDDetails")->trigger();
+  auto* details = Find<QDialog>(form.get(), "ModDetails");
+  ASSERT_NE(details, nullptr);
+  Find<QComboBox>(details, "Combo1")->setCurrentIndex(2);
+  Click(details, "Command3");
+  EXPECT_TRUE(Entry("mnuBourse")->isVisible());
+  EXPECT_EQ(List(), nullptr) << "saving opens no list";
+}
+
+TEST_F(DownloadTest, ADownloadProgramIsWaitedForThenTheListOpens) {
+  struct { int service; const char *entry, *program; } const cases[] = {
+      {1, "mnuTARVO", "Dlmain32.EXE"}, {2, "mnuBourse", "Dlbourse32.exe"},
+      {5, "mnuEIS", "Dleis32.EXE"}};
+  for (const auto& c : cases) {
+    session->ini.PutSetting("Download", "DataService", Str(c.service));
+    PutSibling(c.program);
+    Open();
+    bool off = true;
+    processes.meanwhile = [&] {
+      off = off && !Menu("mnuFile")->isEnabled();
+      home.Put("drive_c/korawin/download/02NOV26.d", kDay);  // what it leaves
+    };
+    Entry(c.entry)->trigger();
+    EXPECT_TRUE(off) << "the menus are off meanwhile";
+    ASSERT_NE(List(), nullptr) << c.entry;
+    EXPECT_EQ(Find<QListWidget>(List(), "List1")->count(), 1);
+    List()->reject();
+    EXPECT_TRUE(Menu("mnuFile")->isEnabled());
+    form.reset();
+    session->files.Remove("c:\\korawin\\download\\02NOV26.d");
+  }
+  ASSERT_EQ(processes.ran.size(), 3u);
+  EXPECT_TRUE(processes.ran[0].ends_with("/drive_c/korawin/Dlmain32.EXE"));
+}
+
+TEST_F(DownloadTest, ClosingWhileAProgramRunsEndsTheWaitingAndOpensNothing) {
+  session->ini.PutSetting("Download", "DataService", "1");
+  PutSibling("Dlmain32.EXE");
+  Open();
+  processes.meanwhile = [this] { form->close(); };
+  Entry("mnuTARVO")->trigger();
+  EXPECT_EQ(processes.ran.size(), 1u);
+  EXPECT_EQ(processes.ended, 0);
+  EXPECT_EQ(List(), nullptr);
+}
+
+TEST_F(DownloadTest, TheWholeMarketLeavesTheChosenFolderInTheTitle) {
+  session->ini.PutSetting("Download", "DataService", "3");
+  home.Put("drive_c/korawin/WMPaths.lst",
+           "c:\\a\\\r\nc:\\i\\\r\nc:\\f\\\r\nc:\\v\\\r\nc:\\o\\\r\n1\r\nc:\\s\\\r\n");
+  for (const char* folder : {"a", "i", "f", "v", "o", "s"})
+    home.Put(std::string("drive_c/") + folder + "/Names.dat", "");
+  home.Put("drive_c/korawin/download/02NOV26.d", "");
+  home.Put("drive_c/korawin/download/02NOV26.dsu", kDay);
+  Open();
+  Entry("mnuModem")->trigger();
+  ASSERT_NE(List(), nullptr);
+  Click(List(), "Command1");
+  ASSERT_TRUE(Left());
+  EXPECT_EQ(form->windowTitle(), "KORA Charting 7F   -   Current Data Folder c:\\i\\");
+  EXPECT_EQ(home.Get("drive_c/a/AAA.WDT").size(), 50u);
+}
+
+TEST_F(DownloadTest, DestinationsOpenOverTheFoldersAndTheirFieldFollows) {
+  session->ini.PutSetting("Download", "DataService", "3");
+  home.Put("drive_c/korawin/WMPaths.lst",
+           "c:\\a\\\r\nc:\\i\\\r\nc:\\f\\\r\nc:\\v\\\r\nc:\\o\\\r\n0\r\nc:\\s\\\r\n");
+  Open();
+  Entry("mnuPaths")->trigger();
+  auto* paths = form->findChild<CPath*>();
+  ASSERT_NE(paths, nullptr);
+  QTimer::singleShot(0, [&] {
+    auto* destinations = Find<QDialog>(paths, "WMPath");
+    ASSERT_NE(destinations, nullptr);
+    Find<QRadioButton>(destinations, "Option1(2)")->click();
+    Click(destinations, "Command2");
+  });
+  ASSERT_TRUE(Find<QPushButton>(paths, "Command3")->isEnabled());
+  Click(paths, "Command3");
+  EXPECT_EQ(Find<QLineEdit>(paths, "Text2")->text(), "c:\\f\\");
+  EXPECT_EQ(form->windowTitle(), "KORA Charting 7F   -   Current Data Folder c:\\f\\");
+  EXPECT_EQ(session->ini.GetSetting("KoraPaths", "ChtData"), "c:\\f\\");
 }
 
 class ChtsTest : public MainTest {
@@ -272,6 +446,69 @@ TEST_F(ChtsTest, PageSetUpAndPrintOpenTheirFormsOverTheChart) {
   EXPECT_TRUE(home.Exists("drive_c/korawin/data/TCht.Tmp"));
 }
 
+TEST_F(ChtsTest, AChartOrASavedChartIsPrintedIntoAPdfOfItsNameOnThePageAsItWasKept) {
+  session->ini.PutSetting("ChtPage", "Orient", "2");
+  Chts& charts = OpenCharts();
+  const QString caption = charts.windowTitle();
+  const auto print = [&](const char* expected) {
+    Find<QAction>(&charts, "cmPrintChart")->trigger();
+    auto* dialog = Find<QDialog>(&charts, "PrintKora");
+    ASSERT_NE(dialog, nullptr);
+    Find<QComboBox>(dialog, "Combo1")->setCurrentText("PDF file");
+    EXPECT_EQ(Find<QLineEdit>(dialog, "Text2")->text(), expected);
+    Click(dialog, "Command1");
+    ASSERT_TRUE(WaitFor([&] { return charts.findChild<QDialog*>("PrintKora") == nullptr; }));
+    EXPECT_EQ(charts.windowTitle(), caption);
+  };
+  print("c:\\korawin\\chtsave\\AAA.pdf");
+  EXPECT_NE(home.Get("drive_c/korawin/chtsave/AAA.pdf").find("/MediaBox [0 0 842"),
+            std::string::npos);
+  EXPECT_EQ(session->settings.page.Orient, 2);
+
+  home.Put("drive_c/korawin/chtsave/Mine.v2.cht", "L,1,2,300,400,255\r\n");
+  charts.window().ShowSaved("c:\\korawin\\chtsave\\Mine.v2.cht");
+  print("c:\\korawin\\chtsave\\Mine.v2.pdf");
+  EXPECT_TRUE(home.Exists("drive_c/korawin/chtsave/Mine.v2.pdf"));
+  EXPECT_TRUE(dialogs.said.empty());
+}
+
+TEST_F(ChtsTest, PricesThatCameInShowOnTheChart) {
+  home.Put("drive_c/korawin/download/02NOV26.d", kDay);
+  Chts& charts = OpenCharts();
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  ASSERT_EQ(shown(), "BBB.WDT");
+  const auto bars = charts.window().Chart.Bars.BarCount;
+  Entry("mnuModem")->trigger();
+  auto* list = Find<QDialog>(form.get(), "DLList");
+  ASSERT_NE(list, nullptr);
+  Click(list, "Command1");
+  EXPECT_EQ(charts.window().Chart.Bars.BarCount, bars + 1);
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_EQ(session->current.Rec.Code.trimmed(), "BBB") << "as the update left another";
+}
+
+TEST_F(ChtsTest, AnAverageSwitchedOnInTheDefaultsStandsOnTheChart) {
+  Chts& charts = OpenCharts();
+  ASSERT_FALSE(charts.window().Request.Ma2On);
+  QTimer::singleShot(0, [&] {
+    auto* defaults = Find<QDialog>(&charts, "ChtDef");
+    ASSERT_NE(defaults, nullptr);
+    Find<QAbstractButton>(defaults, "AvTwo")->click();
+    defaults->reject();
+  });
+  Find<QAction>(&charts, "cmChtDef")->trigger();
+  EXPECT_TRUE(charts.window().Request.Ma2On);
+}
+
+TEST_F(ChtsTest, TheUnitOfVolumesStandsOnTheChart) {
+  session->ini.PutSetting("Download", "DataService", "1");
+  session->ini.PutSetting("Download", "System", "c:\\korawin\\download\\system\\");
+  home.Put("drive_c/korawin/download/system/Mainfile.ASX",
+           std::string(22, ' ') + "AAA   " + std::string(26, ' ') + " 0-3   ");
+  Chts& charts = OpenCharts();
+  EXPECT_EQ(charts.window().Chart.VolLabel, "'00000");
+}
+
 TEST_F(ChtsTest, AChartThatFailsIsNotToldAgainAtEverySize) {
   home.Put("drive_c/korawin/data/AAA.WDT", "torn");
   OpenCharts();
@@ -335,27 +572,27 @@ TEST_F(LogoTest, ReadsTheSettingsThenOpensTheMainWindow) {
 }
 
 TEST_F(LogoTest, NoWaitingFilesNoMessageAndTheMainWindowStands) {
-  int updates = 0;
-  Make().Update = [&](Main&) { ++updates; };
+  Make();
   home.Put("drive_c/korawin/download/readme.txt", "");
   ASSERT_TRUE(logo->Start(false));
   ASSERT_TRUE(MainShows());
   EXPECT_TRUE(dialogs.said.empty());
-  EXPECT_EQ(updates, 0);
+  EXPECT_EQ(logo->main()->findChild<QDialog*>("DLList"), nullptr);
 }
 
-TEST_F(LogoTest, WaitingFilesAreTakenInOnOk) {
-  int updates = 0;
-  home.Put("drive_c/korawin/download/20261102.d", "x");
-  Make().Update = [&](Main& main) {
-    EXPECT_EQ(&main, logo->main());
-    ++updates;
-  };
-  ASSERT_TRUE(logo->Start(false));
-  ASSERT_TRUE(MainShows());
-  ASSERT_EQ(dialogs.said.size(), 1u);
-  EXPECT_EQ(dialogs.said[0].text, " There are some Ex Internet data files to update into KORA");
-  EXPECT_EQ(updates, 1);
+TEST_F(LogoTest, WaitingFilesAreListedOnOkAndPassedOverOnCancel) {
+  home.Put("drive_c/korawin/download/02NOV26.d", kDay);
+  for (const Answer answer : {Answer::kOk, Answer::kCancel}) {
+    dialogs.said.clear();
+    dialogs.answers = {answer};
+    ASSERT_TRUE(Make().Start(false));
+    ASSERT_TRUE(MainShows());
+    ASSERT_EQ(dialogs.said.size(), 1u);
+    EXPECT_EQ(dialogs.said[0].text, " There are some Ex Internet data files to update into KORA");
+    EXPECT_EQ(dialogs.said[0].title, "Downloaded Data");
+    EXPECT_EQ(logo->main()->findChild<QDialog*>("DLList") != nullptr, answer == Answer::kOk);
+    logo.reset();
+  }
 }
 
 TEST_F(LogoTest, GivingUpTheDriveEndsTheProgram) {

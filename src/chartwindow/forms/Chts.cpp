@@ -154,7 +154,8 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
                .state = services.state,
                .price = picture1_->surface(),
                .panel = picture2_->surface(),
-               .layOut = [this](bool two) { LayOut(two); }}) {
+               .layOut = [this](bool two) { LayOut(two); },
+               .VolumeUnitText = services.VolumeUnitText}) {
   setObjectName("Chts");
   setAttribute(Qt::WA_DeleteOnClose);
   setContextMenuPolicy(Qt::NoContextMenu);

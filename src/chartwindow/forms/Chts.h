@@ -41,6 +41,8 @@ struct ChtsServices {
   // Ask for a file: DOS paths, nothing when cancelled. Empty: the platform's own dialogs.
   std::function<std::optional<std::string>(const std::string& suggested)> pickSaved = {};
   std::function<std::optional<std::string>()> pickToShow = {};
+  // The unit of a security's volumes; none while it is empty.
+  std::function<std::string(const NameRec&)> VolumeUnitText = {};
   // The window was closed by its user.
   std::function<void()> closed = {};
 };

@@ -38,7 +38,7 @@ CPath::CPath(CPathServices services, QWidget* parent)
   destinations->setObjectName("Command3");
   destinations->setAutoDefault(false);
   const int service = services_.settings.download.DataService;
-  destinations->setEnabled(services_.openWMPath && (service == 2 || service == 3));
+  destinations->setEnabled(service == 2 || service == 3);
   auto* close = new QPushButton("&Close", this);
   close->setObjectName("Command2");
   close->setAutoDefault(false);
@@ -115,6 +115,10 @@ bool CPath::Fill() {
   label10_[1]->setText(QString::fromStdString(paths.PfmBackupPath));
   changed_ = false;
   return true;
+}
+
+void CPath::ShowChartData() {
+  text2_->setText(QString::fromStdString(services_.settings.paths.CurrentDataPath));
 }
 
 bool CPath::eventFilter(QObject* object, QEvent* event) {

@@ -19,7 +19,7 @@ struct CPathServices {
   std::function<bool()> readAllSettings;  // false: the user gave up
   std::function<void()> pathsSaved;       // the main window shows its title anew
   std::function<void()> endProgram;
-  std::function<void()> openWMPath;       // empty while there is no such form
+  std::function<void()> openWMPath;
 };
 
 // "Path Details": the folders of the installation.
@@ -30,6 +30,8 @@ class CPath : public QDialog {
   // Asks what to do where the paths are missing, and fills the fields. False when the program
   // ends instead.
   bool Fill();
+  // After another data folder was chosen elsewhere.
+  void ShowChartData();
 
   void reject() override;
 

@@ -122,9 +122,8 @@ void Logo::Timer() {
     hide();
     if (!main_->OpenPaths()) return;
   }
-  if (Update && AskForWaitingDownloads(session_.files, session_.settings.download,
-                                       session_.dialogs))
-    Update(*main_);
+  if (AskForWaitingDownloads(session_.files, session_.settings.download, session_.dialogs))
+    main_->OpenUpdate();
   close();
 }
 

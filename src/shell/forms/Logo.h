@@ -19,8 +19,6 @@ class Logo : public QWidget {
   // False when the program ends: another instance runs (`previous`), or the user gave up.
   bool Start(bool previous);
 
-  // Takes waiting downloads in. While it is empty nothing is asked.
-  std::function<void(Main&)> Update;
   // Called with the main window before it shows.
   std::function<void(Main&)> Prepare;
 

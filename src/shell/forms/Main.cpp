@@ -17,6 +17,7 @@
 #include "shell/forms/AbtKora.h"
 #include "shell/forms/HelpWindow.h"
 #include "shell/main_menu.h"
+#include "update/volume_unit.h"
 
 namespace kora {
 namespace {
@@ -34,10 +35,20 @@ Main::Main(Session& session, std::string commandLine)
     : session_(session),
       commandLine_(std::move(commandLine)),
       mdi_(new QMdiArea(this)),
-      desk_(
-          session, this, mdi_,
-          [this] { ReadPaths(session_.ini, session_.files, session_.dialogs, session_.settings); },
-          [this] { EnableMenus(); }) {
+      updates_(session, this,
+               {.disableMenus = [this] { DisableMenus(); },
+                .enableMenus = [this] { EnableMenus(); },
+                .folderChanged = [this] { FolderChanged(); },
+                .updated = [this] { desk_.PricesChanged(); }}),
+      desk_(session, this, mdi_,
+            {.readSettings = [this] {
+               ReadPaths(session_.ini, session_.files, session_.dialogs, session_.settings);
+             },
+             .menusBack = [this] { EnableMenus(); },
+             .openWMPath = [this](QWidget* over) { return updates_.OpenDestinations(over); },
+             .VolumeUnitText = [this](const NameRec& name) {
+               return VolumeUnitText(session_.files, session_.settings, name.Code.trimmed());
+             }}) {
   setObjectName("Main");
   mdi_->setObjectName("MDI");
   mdi_->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
@@ -87,6 +98,11 @@ void Main::SetOpeners() {
   SetOpener("mnuPaths", [this] { OpenPaths(); });
   SetOpener("mnuExit", [this] { EndProgram(); });
   SetOpener("mnuPntCol", [this] { AskPrinter(); });
+  SetOpener("mnuTARVO", [this] { Download("Dlmain32.EXE"); });
+  SetOpener("mnuBourse", [this] { Download("Dlbourse32.exe"); });
+  SetOpener("mnuEIS", [this] { Download("Dleis32.EXE"); });
+  SetOpener("mnuDDetails", [this] { updates_.OpenDetails(); });
+  SetOpener("mnuModem", [this] { updates_.OpenUpdate(); });
   SetOpener("mnuSnap", [this] { RunSibling("Quickpeek.EXE"); });
   SetOpener("mnuMMAScan", [this] { RunSibling("Mmascan.EXE"); });
   SetOpener("mnSHlp", [this] { OpenHelp(); });
@@ -114,14 +130,12 @@ void Main::Open(const std::string& entry) {
 }
 
 void Main::DisableMenus() {
-  longTask_ = true;
   for (const MenuEntry& entry : MainMenu())
     if (DisabledByLongTask(entry.name))
       findChild<QMenu*>(ToQt(entry.name))->menuAction()->setEnabled(false);
 }
 
 void Main::EnableMenus() {
-  longTask_ = false;
   for (const MenuEntry& entry : MainMenu()) {
     const EntryState state =
         MenuEntryState(entry.name, session_.settings.download, session_.settings.words);
@@ -186,7 +200,7 @@ bool Main::OpenPaths() {
                         SetTitle();
                       },
                       .endProgram = [this] { EndProgram(); },
-                      .openWMPath = {}},
+                      .openWMPath = [this] { updates_.OpenDestinations(cpath_); }},
                      this);
   cpath_->setAttribute(Qt::WA_DeleteOnClose);
   if (!cpath_->Fill()) {
@@ -218,18 +232,34 @@ void Main::OpenHelp() {
   help_->show();
 }
 
-void Main::RunSibling(const std::string& program) {
+bool Main::RunSibling(const std::string& program) {
+  struct Closed {};
   const std::string path = session_.settings.paths.SystemPath + program;
   if (!session_.files.CheckFile(path)) throw RunTimeError(kFileNotFound, "File not found  " + path);
   DisableMenus();
   try {
-    session_.processes.RunAndWait(session_.files.HostPath(path), {},
-                                  [this] { session_.dialogs.Yield(); });
+    session_.processes.RunAndWait(session_.files.HostPath(path), {}, [this] {
+      session_.dialogs.Yield();
+      if (closed_) throw Closed();
+    });
+  } catch (const Closed&) {
+    // Its program ends by itself.
+    return false;
   } catch (...) {
     EnableMenus();
     throw;
   }
   EnableMenus();
+  return true;
+}
+
+void Main::Download(const std::string& program) {
+  if (RunSibling(program)) updates_.OpenList();
+}
+
+void Main::FolderChanged() {
+  SetTitle();
+  if (cpath_) cpath_->ShowChartData();
 }
 
 void Main::AskPrinter() {
@@ -244,6 +274,7 @@ void Main::EndProgram() {
 }
 
 void Main::closeEvent(QCloseEvent* event) {
+  closed_ = true;
   KeepSize();
   mdi_->closeAllSubWindows();
   if (help_) help_->close();

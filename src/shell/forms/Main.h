@@ -8,6 +8,7 @@
 
 #include "settings/forms/CPath.h"
 #include "shell/forms/chart_desk.h"
+#include "shell/forms/update_desk.h"
 #include "shell/session.h"
 
 class QMdiArea;
@@ -31,6 +32,8 @@ class Main : public QMainWindow {
   // The folder form, asking first where the paths are missing. False when the program ends
   // instead.
   bool OpenPaths();
+  // The list of waiting downloads, to take them in.
+  void OpenUpdate() { updates_.OpenUpdate(); }
 
   Chts* charts() const { return desk_.window(); }
 
@@ -45,20 +48,25 @@ class Main : public QMainWindow {
   void TakeSize();
   void KeepSize();
   void OpenHelp();
-  // Runs a program of the program folder and waits for its end.
-  void RunSibling(const std::string& program);
+  // Runs a program of the program folder and waits for its end, without limit. False when the
+  // main window was closed meanwhile.
+  bool RunSibling(const std::string& program);
+  // A download program, then the list of what it left.
+  void Download(const std::string& program);
+  void FolderChanged();
   void AskPrinter();
   void EndProgram();
 
   Session& session_;
   std::string commandLine_;
   QMdiArea* mdi_;
+  UpdateDesk updates_;
   ChartDesk desk_;
   QPointer<CPath> cpath_;
   QPointer<QWidget> help_;
   std::map<std::string, std::function<void()>> openers_;
   QSize mdiSize_;
-  bool longTask_ = false;
+  bool closed_ = false;
 };
 
 }  // namespace kora

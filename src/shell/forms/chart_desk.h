@@ -7,6 +7,7 @@
 #include "chartwindow/chart_selection.h"
 #include "chartwindow/forms/Chts.h"
 #include "chartwindow/forms/selection_form.h"
+#include "indicators/forms/ChtDef.h"
 #include "platform/qt/qt_printer.h"
 #include "shell/session.h"
 #include "store/forms/look_services.h"
@@ -16,13 +17,20 @@ class QMdiArea;
 
 namespace kora {
 
+// What the forms of charting need of the main window and of the rooms beside them.
+struct ChartDeskHooks {
+  std::function<void()> readSettings;  // anew
+  std::function<void()> menusBack;     // charting was left
+  // The data destination paths over a form; true when another data folder was chosen.
+  std::function<bool(QWidget* over)> openWMPath;
+  std::function<std::string(const NameRec&)> VolumeUnitText;
+};
+
 // The forms of charting and what ties them together: the chart window, chart selection, and the
 // dialogs that both open. It lives as long as the main window.
 class ChartDesk {
  public:
-  // `readSettings` reads the settings anew; `menusBack` is called when charting was left.
-  ChartDesk(Session& session, QWidget* over, QMdiArea* mdi, std::function<void()> readSettings,
-            std::function<void()> menusBack);
+  ChartDesk(Session& session, QWidget* over, QMdiArea* mdi, ChartDeskHooks hooks);
 
   // The chart window with chart selection over it; a window that stands comes to the front.
   void OpenCharts();
@@ -37,6 +45,8 @@ class ChartDesk {
   Chts* window() const { return chts_; }
   // After other folders were chosen.
   void PathsChanged();
+  // After prices were taken in.
+  void PricesChanged() { Refresh(); }
 
  private:
   QWidget* Over() const;
@@ -47,7 +57,7 @@ class ChartDesk {
   ChtSelServices SelectionServices();
   LookServices Look(std::function<void()> saved);
   void Refresh();
-  void OpenChtDef(bool fromWindow, bool fromSelection);
+  void OpenChtDef(ChtDefOpener opener, const std::function<void()>& averagesChanged = {});
   void OpenOscFrm();
   bool OpenFinDate();
   void OpenChtBands();
@@ -59,12 +69,13 @@ class ChartDesk {
   Session& session_;
   QWidget* over_;
   QMdiArea* mdi_;
-  std::function<void()> readSettings_, menusBack_;
+  ChartDeskHooks hooks_;
   ChartSelection selection_;
   QPointer<Chts> chts_;
   QPointer<QDialog> selectionForm_, secondForm_;
   PrintChoice printChoice_;
   QtPrinter printer_;
+  bool pageTurned_ = false;
   float boxValue_ = 0;  // of the point-and-figure chart, as its settings box left it
 };
 
