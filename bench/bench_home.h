@@ -1,24 +1,18 @@
 #pragma once
 
-#include <string>
+#include <vector>
 
-#include "base/files.h"
+#include "store/price_rec.h"
+#include "tests/support/temp_home.h"
 
 namespace kora::bench {
 
-// A home in the temporary folder with one security, BENCH, of `records` trading days; gone at
-// the end.
-class Home {
- public:
-  explicit Home(int records);
-  ~Home();
-  Home(const Home&) = delete;
-  Home& operator=(const Home&) = delete;
-  const Files& files() const { return files_; }
+// `count` records without prices, dated the trading days from 1 January of `year` on.
+std::vector<PriceRec> TradingDays(int year, int count);
 
- private:
-  std::string path_;
-  Files files_;
+// A home in the temporary folder with one security, BENCH, of `records` trading days.
+struct Home : test::TempHome {
+  explicit Home(int records);
 };
 
 }  // namespace kora::bench

@@ -5,13 +5,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <cstdlib>
-#include <filesystem>
-#include <memory>
-#include <stdexcept>
-
-#include "base/dates.h"
 #include "base/text.h"
+#include "bench/bench_home.h"
 #include "store/chart_bars.h"
 #include "store/name_file.h"
 
@@ -25,48 +20,39 @@ constexpr int kRecords = 5000;
 
 std::string Code(int n) { return "C" + std::to_string(10000 + n); }
 
-// A home of 5,000 small price files, one of 5,000 records and a name file; gone at the end.
+// A home of 5,000 small price files, one of 5,000 records and a name file.
 struct Market {
-  std::string home;
-  std::unique_ptr<Files> files;
+  test::TempHome home;
+  const Files& files = home.files();
   std::string hostFolder;
 
   Market() {
-    home = (std::filesystem::temp_directory_path() / "kora-bench-XXXXXX").string();
-    if (!::mkdtemp(home.data())) throw std::runtime_error("no temporary folder");
-    files = std::make_unique<Files>(home);
-    files->MakeFolder("c:\\korawin\\data");
-    hostFolder = files->HostPath("c:\\korawin\\data");
+    files.MakeFolder("c:\\korawin\\data");
+    hostFolder = files.HostPath("c:\\korawin\\data");
 
-    NameFile names(*files, "c:\\korawin\\data\\Names.dat", OpenMode::kReplace);
+    NameFile names(files, "c:\\korawin\\data\\Names.dat", OpenMode::kReplace);
     std::vector<NameRec> recs;
     for (int i = 0; i < kNames; ++i) recs.push_back(NewNameRec(Code(i)));
     names.WriteRun(1, recs);
 
     const PriceRec day = NewPriceRec("19990104");
     for (int i = 0; i < kPriceFiles; ++i)
-      PriceFile(*files, "c:\\korawin\\data\\" + Code(i) + ".WDT", OpenMode::kReplace).Append(day);
+      PriceFile(files, "c:\\korawin\\data\\" + Code(i) + ".WDT", OpenMode::kReplace).Append(day);
 
-    std::vector<PriceRec> days;
-    for (std::int32_t n = DayNumber({1980, 1, 1}); int(days.size()) < kRecords; ++n) {
-      const CalendarDate date = DateOfDayNumber(n);
-      if (Weekday(date) == 1 || Weekday(date) == 7) continue;
-      PriceRec rec = NewPriceRec(FormatFileDate(date));
+    std::vector<PriceRec> days = bench::TradingDays(1980, kRecords);
+    int n = 0;
+    for (PriceRec& rec : days) {
+      ++n;
       rec.Close = 10 + float(n % 97) / 16;
       rec.Open = rec.Close - 0.25f;
       rec.High = rec.Close + 0.5f;
       rec.Low = rec.Close - 0.5f;
       rec.Volume = 1000 + n % 1013;
-      days.push_back(rec);
     }
-    PriceFile(*files, "c:\\korawin\\data\\BHP.WDT", OpenMode::kReplace).WriteRun(1, days);
+    PriceFile(files, "c:\\korawin\\data\\BHP.WDT", OpenMode::kReplace).WriteRun(1, days);
     // A listing of a folder that just changed is not trusted; this one has been still for long.
     const timespec then[2] = {{1'000'000'000, 0}, {1'000'000'000, 0}};
     ::utimensat(AT_FDCWD, hostFolder.c_str(), then, 0);
-  }
-  ~Market() {
-    std::error_code ignored;
-    std::filesystem::remove_all(home, ignored);
   }
 };
 
@@ -98,13 +84,14 @@ void OpenFiles(benchmark::State& state, const std::string& folder, bool lower) {
   }
   for (auto _ : state)
     for (const std::string& path : paths)
-      benchmark::DoNotOptimize(market.files->Open(path, OpenMode::kRead));
+      benchmark::DoNotOptimize(market.files.Open(path, OpenMode::kRead));
   state.SetItemsProcessed(state.iterations() * kPriceFiles);
 }
 
-void ReadNamesPlain(benchmark::State& state) {
-  const std::string path = TheMarket().hostFolder + "/Names.dat";
-  std::vector<char> bytes(kNames * sizeof(NameRec));
+// A whole file into memory with the bare calls of the host.
+void ReadPlain(benchmark::State& state, const char* name, size_t size) {
+  const std::string path = TheMarket().hostFolder + name;
+  std::vector<char> bytes(size);
   for (auto _ : state) {
     const int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
     if (::pread(fd, bytes.data(), bytes.size(), 0) != ssize_t(bytes.size()))
@@ -112,27 +99,21 @@ void ReadNamesPlain(benchmark::State& state) {
     ::close(fd);
     benchmark::DoNotOptimize(bytes.data());
   }
+}
+void ReadNamesPlain(benchmark::State& state) {
+  ReadPlain(state, "/Names.dat", kNames * sizeof(NameRec));
+}
+void ReadPricesPlain(benchmark::State& state) {
+  ReadPlain(state, "/BHP.WDT", kRecords * sizeof(PriceRec));
 }
 
 void FindLastCode(benchmark::State& state) {
   Market& market = TheMarket();
   const std::string code = PadRight(Code(kNames - 1), 6);
   for (auto _ : state) {
-    const NameFile names(*market.files, "c:\\korawin\\data\\Names.dat");
+    const NameFile names(market.files, "c:\\korawin\\data\\Names.dat");
     NameRec rec;
     if (FindCode(names, code, rec) != kNames) state.SkipWithError("not found");
-  }
-}
-
-void ReadPricesPlain(benchmark::State& state) {
-  const std::string path = TheMarket().hostFolder + "/BHP.WDT";
-  std::vector<char> bytes(kRecords * sizeof(PriceRec));
-  for (auto _ : state) {
-    const int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
-    if (::pread(fd, bytes.data(), bytes.size(), 0) != ssize_t(bytes.size()))
-      state.SkipWithError("short read");
-    ::close(fd);
-    benchmark::DoNotOptimize(bytes.data());
   }
 }
 
@@ -140,7 +121,7 @@ void LoadBars(benchmark::State& state, const char* period) {
   Market& market = TheMarket();
   ChartBars bars;
   for (auto _ : state) {
-    const PriceFile file(*market.files, "c:\\korawin\\data\\BHP.WDT");
+    const PriceFile file(market.files, "c:\\korawin\\data\\BHP.WDT");
     bars.FirstDataRec = 1;
     bars.LastDataRec = kRecords;
     LoadChartBars(file, period, true, kShare, bars);

@@ -4,7 +4,6 @@
 #include <fcntl.h>
 #include <unistd.h>
 
-#include <cstdlib>
 #include <filesystem>
 #include <stdexcept>
 
@@ -12,6 +11,7 @@
 #include "base/numbers.h"
 #include "platform/clock.h"
 #include "store/price_rec.h"
+#include "tests/support/temp_home.h"
 #include "update/download_update.h"
 
 using namespace kora;
@@ -46,7 +46,7 @@ struct Quiet : Dialogs {
 // A market of 5,000 shares with 60 days each, which a run can be repeated on.
 class Market {
  public:
-  Market() : path_(MakeFolder()), files_(path_) {
+  Market() {
     files_.MakeFolder(kData);
     files_.MakeFolder(kDown);
     settings_.paths.SystemPath = "c:\\korawin\\";
@@ -60,10 +60,6 @@ class Market {
       days_.back().Close = float(d);
     }
     Reset();
-  }
-  ~Market() {
-    std::error_code ignored;
-    std::filesystem::remove_all(path_, ignored);
   }
 
   // Every price file as it was at first.
@@ -93,15 +89,8 @@ class Market {
   std::string HostData() const { return files_.HostPath(kData); }
 
  private:
-  static std::string MakeFolder() {
-    std::string path =
-        (std::filesystem::temp_directory_path() / "kora-bench-XXXXXX").string();
-    if (!::mkdtemp(path.data())) throw std::runtime_error("no temporary folder");
-    return path;
-  }
-
-  std::string path_;
-  Files files_;
+  test::TempHome home_;
+  const Files& files_ = home_.files();
   Settings settings_;
   Quiet dialogs_;
   std::vector<PriceRec> days_;

@@ -4,24 +4,23 @@
 
 #include <QApplication>
 #include <QMouseEvent>
-#include <filesystem>
-#include <memory>
 
 #include "chart/script_player.h"
 #include "chartwindow/forms/Chts.h"
 #include "demo/demo_market.h"
 #include "platform/headless/console_dialogs.h"
+#include "tests/support/temp_home.h"
 
 namespace {
 
 using namespace kora;
-namespace fs = std::filesystem;
 
-// A home with the demo market, gone at the end.
+// A home with the demo market.
 struct Market {
-  std::string path;
-  std::unique_ptr<Files> files;
-  std::unique_ptr<SettingsFile> ini, user;
+  test::TempHome home;
+  Files& files = home.files();
+  SettingsFile ini{files, "C:\\WINDOWS\\Kora.ini"};
+  SettingsFile user{files, "C:\\WINDOWS\\KoraUser.ini"};
   ConsoleDialogs dialogs;
   Settings settings;
   ChartColours colours{};
@@ -29,24 +28,15 @@ struct Market {
   ChartState state;
 
   Market() {
-    std::string name = (fs::temp_directory_path() / "kora_window_bench_XXXXXX").string();
-    path = mkdtemp(name.data());
-    files = std::make_unique<Files>(path);
-    ini = std::make_unique<SettingsFile>(*files, "C:\\WINDOWS\\Kora.ini");
-    user = std::make_unique<SettingsFile>(*files, "C:\\WINDOWS\\KoraUser.ini");
-    MakeDemo(*files, *ini, *user, dialogs, {});
+    MakeDemo(files, ini, user, dialogs, {});
     settings.paths.WindowsPath = "C:\\WINDOWS\\";
-    ReadPaths(*ini, *files, dialogs, settings);
-    LoadUserColours(*files, settings.paths.SystemPath, colours);
-  }
-  ~Market() {
-    std::error_code ignored;
-    fs::remove_all(path, ignored);
+    ReadPaths(ini, files, dialogs, settings);
+    LoadUserColours(files, settings.paths.SystemPath, colours);
   }
   ChartWindow Window(QtRasterSurface& price, QtRasterSurface& panel) {
     panel.SetVisible(false);
-    return ChartWindow({.files = *files, .dialogs = dialogs, .settings = settings, .ini = *ini,
-                        .user = *user, .colours = colours, .current = current, .state = state,
+    return ChartWindow({.files = files, .dialogs = dialogs, .settings = settings, .ini = ini,
+                        .user = user, .colours = colours, .current = current, .state = state,
                         .price = price, .panel = panel});
   }
 };
@@ -86,8 +76,8 @@ void CrossMove(benchmark::State& bench) {
 // The same through the form: the event, the status bar, and the painting of what changed.
 void CrossMoveForm(benchmark::State& bench) {
   Market market;
-  auto* form = new Chts({.files = *market.files, .dialogs = market.dialogs,
-                         .settings = market.settings, .ini = *market.ini, .user = *market.user,
+  auto* form = new Chts({.files = market.files, .dialogs = market.dialogs,
+                         .settings = market.settings, .ini = market.ini, .user = market.user,
                          .colours = market.colours, .current = market.current,
                          .state = market.state});
   form->resize(int(bench.range(0)), int(bench.range(1)));
@@ -115,7 +105,7 @@ void SavedChart(benchmark::State& bench, bool play) {
   window.Load();
   window.NextChart();
   const std::string script =
-      market.files->ReadAll(market.settings.paths.CurrentDataPath + "TCht.Tmp");
+      market.files.ReadAll(market.settings.paths.CurrentDataPath + "TCht.Tmp");
   for (auto _ : bench) {
     if (play) {
       price.Cls();

@@ -10,6 +10,7 @@
 
 namespace kora {
 
+// Months and days from 1. What the calls here give is a real date, and what they take must be.
 struct CalendarDate {
   int year = 0, month = 0, day = 0;
   friend bool operator==(const CalendarDate&, const CalendarDate&) = default;
@@ -17,9 +18,9 @@ struct CalendarDate {
 
 // "yyyymmdd" to "dd/mm/yyyy". Substring work: nothing is checked.
 std::string DateToDisplay(std::string_view yyyymmdd);
-// "dd/mm/yyyy" to "yyyymmdd".
+// "dd/mm/yyyy" to "yyyymmdd", unchecked too.
 std::string DateToFile(std::string_view ddmmyyyy);
-// "yyyymmdd" to "dd-mm-yy".
+// "yyyymmdd" to "dd-mm-yy", unchecked too.
 std::string DateToShort(std::string_view yyyymmdd);
 
 // A real calendar date of eight digits, or nothing.

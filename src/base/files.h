@@ -20,6 +20,8 @@ namespace kora {
 //
 // Opening asks the host for the exact name first and looks through the folder only when that
 // fails; folders are read once and read again only when they may have changed.
+//
+// Errors of every call that takes a path: 52 for one that HostPath refuses, and those of Io.
 class Files {
  public:
   // `home` is a host folder; it need not exist yet.
@@ -41,6 +43,7 @@ class Files {
   // True when the path exists, file or folder.
   bool CheckFile(std::string_view path) const;
   bool IsFolder(std::string_view path) const;
+  // Error 53 when the file is not there and the mode does not make it, 76 when its folder is not.
   std::unique_ptr<HostFile> Open(std::string_view path, OpenMode mode) const;
   // Names in a folder, sorted without regard to case. Error 76 when it is not there.
   std::vector<std::string> List(std::string_view folder) const;

@@ -19,7 +19,8 @@ class HostFile {
   virtual size_t ReadAt(std::uint64_t offset, void* data, size_t size) = 0;
   // Writes all or raises.
   virtual void WriteAt(std::uint64_t offset, const void* data, size_t size) = 0;
-  virtual std::uint64_t Size() = 0;
+  virtual std::uint64_t Size() = 0;  // bytes
+  // Cuts the file to `size` bytes, or fills it up with zeros.
   virtual void Truncate(std::uint64_t size) = 0;
   // Returns once the bytes are on the disk.
   virtual void Flush() = 0;
@@ -36,7 +37,7 @@ struct HostStatus {
   bool exists = false;
   bool folder = false;
   std::uint64_t size = 0;
-  std::int64_t modified = 0;  // nanoseconds, host clock
+  std::int64_t modified = 0;  // nanoseconds since 1970, clock of the file system
 };
 
 class Io {
@@ -45,6 +46,7 @@ class Io {
   virtual std::unique_ptr<HostFile> Open(const std::string& path, OpenMode mode) = 0;
   // Never raises: what can't be looked at does not exist.
   virtual HostStatus Status(const std::string& path) = 0;
+  // Names of files and folders in it, in no order, without "." and "..".
   virtual std::vector<std::string> List(const std::string& folder) = 0;
   virtual void MakeFolder(const std::string& path) = 0;
   virtual void Remove(const std::string& path) = 0;

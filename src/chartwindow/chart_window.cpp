@@ -81,7 +81,8 @@ const ToolButtonText& ToolButtonOf(int button) {
   return kTexts[std::clamp(button, 1, kToolButtons) - 1];
 }
 
-ChartWindow::ChartWindow(const ChartWindowServices& services) : services_(services) {
+ChartWindow::ChartWindow(const ChartWindowServices& services)
+    : services_(services), dialogs_(services.dialogs) {
   RefreshTitle();
 }
 
@@ -169,10 +170,14 @@ bool ChartWindow::Refresh() {
 bool ChartWindow::Resized() {
   ForgetCross();
   if (Loading || (!HasChart() && !ChartFromFile)) return false;
+  return dialogs_.Repeat([this] { return DrawAll(); });
+}
+
+bool ChartWindow::DrawAll() {
   if (ChartFromFile) {
     LayOut(false);
-    return ShowSavedChart(services_.files, services_.dialogs, services_.price,
-                          services_.settings.fonts, services_.colours, SavedChartFile);
+    return ShowSavedChart(services_.files, dialogs_, services_.price, services_.settings.fonts,
+                          services_.colours, SavedChartFile);
   }
   if (state().SplitShown || state().Superimposed) return RedrawPair();
   const std::string picked = panelPicked_ ? panelCode_ : "";
@@ -202,6 +207,7 @@ bool ChartWindow::RedrawPair() {
 
 // Opens the files, finds the record `step` places on and reads it.
 bool ChartWindow::Move(int step, bool filtered) {
+  dialogs_.Forget();
   AnalPageMode = false;
   state().SuppressScript = false;
   EmptyDrawnLines();
@@ -218,9 +224,9 @@ bool ChartWindow::Move(int step, bool filtered) {
       path = ListFilePath(dataPath, state().ChartListNo);
     else
       state().ChartIndex = 0;
-    services_.dialogs.Message("There is a file access problem. Check directory paths option.\n" +
-                                  path + "  -  " + e.what(),
-                              kTitle);
+    dialogs_.Message("There is a file access problem. Check directory paths option.\n" + path +
+                         "  -  " + e.what(),
+                     kTitle);
     return false;
   }
 }
@@ -241,8 +247,8 @@ bool ChartWindow::FindRecord(int step, bool filtered) {
   if (count == 0 || current.NameCount == 0) {
     const std::string what =
         current.NameCount == 0 ? "Names.Dat" : ChartListName(services_.user, s.ChartListNo);
-    services_.dialogs.Message(" There are no records in " + what + " for this folder.",
-                              current.NameCount == 0 ? kTitle : "Chart Lists");
+    dialogs_.Message(" There are no records in " + what + " for this folder.",
+                     current.NameCount == 0 ? kTitle : "Chart Lists");
     return false;
   }
   const int index = s.ChartIndex + step;
@@ -278,8 +284,8 @@ bool ChartWindow::FindNextChtIC(const std::vector<NameRec>& names) {
     }
     index = step > 0 ? 1 : count;
   }
-  services_.dialogs.Message("No records on file for that Industry classification or group",
-                            "Industry Classification");
+  dialogs_.Message("No records on file for that Industry classification or group",
+                     "Industry Classification");
   s.ChartIndex = 1;
   return false;
 }
@@ -305,12 +311,12 @@ bool ChartWindow::DrawChart() {
   const bool pair = s.SplitScreen || Chart.OscPanel > 0;
   if (s.OscShown && !pair) {
     if (s.ChartPeriod != "A" && s.OscCode == "RMO") {
-      services_.dialogs.Message("RMO only available on Daily Charts", "RMO");
+      dialogs_.Message("RMO only available on Daily Charts", "RMO");
       LayOut(false);
       return Compose();
     }
     LayOut(s.OscSelected != "PARA");
-    services_.dialogs.Yield();
+    dialogs_.Yield();
     if (!Compose()) return false;
     if (s.OscSelected == "STO" || s.OscSelected == "FX") s.OscCode = s.OscSelected;
     if (s.OscSelected != "PARAV") ShowPanel(s.OscSelected);
@@ -318,7 +324,7 @@ bool ChartWindow::DrawChart() {
   }
   s.OscCode.clear();
   LayOut(false);
-  services_.dialogs.Yield();
+  dialogs_.Yield();
   return Compose();
 }
 
@@ -338,7 +344,7 @@ void ChartWindow::LayOut(bool twoPanes) {
 
 ChartServices ChartWindow::Services(Surface& price, Surface* panel, ChartScript* script) {
   return {.files = services_.files,
-          .dialogs = services_.dialogs,
+          .dialogs = dialogs_,
           .paths = services_.settings.paths,
           .fonts = services_.settings.fonts,
           .colours = services_.colours,
@@ -465,9 +471,9 @@ bool ChartWindow::TogglePFAuto() {
 // ---- Oscillators
 
 OscHost ChartWindow::Host(std::string_view code, Composition& chart, const ChartRequest& request,
-                          Surface& price, Surface& panel, ChartScript* script) const {
+                          Surface& price, Surface& panel, ChartScript* script) {
   return {.files = services_.files,
-          .dialogs = services_.dialogs,
+          .dialogs = dialogs_,
           .settings = services_.settings,
           .colours = services_.colours,
           .request = request,
@@ -509,7 +515,7 @@ void ChartWindow::PickOscillator(std::string_view code, bool slow) {
   if (code == "OBV" && never(!s.VolumeOption || !Chart.Bars.VolumeShown)) return;
   CancelChartTools();
   if (code == "RMO" && s.ChartPeriod != "A") {
-    services_.dialogs.Message("RMO only available on Daily Charts", "RMO");
+    dialogs_.Message("RMO only available on Daily Charts", "RMO");
     return;
   }
   if (code == "STO") s.SlowStochastic = slow;
@@ -520,7 +526,7 @@ void ChartWindow::PickOscillator(std::string_view code, bool slow) {
   if (never(false)) return;
   if (services_.settings.osc.ShowOsc && services_.openOscFrm) {
     services_.openOscFrm();
-    services_.dialogs.Yield();
+    dialogs_.Yield();
   } else {
     ShowOscillator();
   }
@@ -565,7 +571,7 @@ bool ChartWindow::CompareFileThere() {
   } catch (const RunTimeError&) {
     // A name that can't be one names no file.
   }
-  services_.dialogs.Message(
+  dialogs_.Message(
       code == "RMX" ? " Oscillator values not valid"
                     : file + " is not available. Use your code for the All Ordinaries Index",
       kCompareTitle);
@@ -575,14 +581,14 @@ bool ChartWindow::CompareFileThere() {
 bool ChartWindow::ShowOscillator() {
   ChartState& s = state();
   if (!PeriodsValid()) {
-    services_.dialogs.Message(s.OscCode + " Oscillator values not valid", "Oscillator Values");
+    dialogs_.Message(s.OscCode + " Oscillator values not valid", "Oscillator Values");
     return false;
   }
   if (!CompareFileThere() || s.ChartStartup) return false;
   if (!HasChart() || s.ChartStyle == 'P') return false;
   const std::string code = s.OscCode;
   LayOut(HasPanel(code));
-  services_.dialogs.Yield();
+  dialogs_.Yield();
   // Composed even where a panel stands already, so that the script holds this panel alone.
   if (!Compose()) return false;
   ShowPanel(code);
@@ -604,7 +610,7 @@ void ChartWindow::StartSuperimpose() {
   Chart.OscPanel = 1;
   services_.price.SetAutoRedraw(true);
   if (!Compose()) return;
-  services_.dialogs.Yield();
+  dialogs_.Yield();
   Chart.OscPanel = 2;
   if (services_.openChart2) services_.openChart2();
 }
@@ -648,7 +654,7 @@ void ChartWindow::StartSaving() {
 
 void ChartWindow::SaveChartAs(const std::optional<std::string>& path,
                               const std::function<std::string(const std::string&)>& makePicture) {
-  Dialogs& dialogs = services_.dialogs;
+  Dialogs& dialogs = dialogs_;
   const Files& files = services_.files;
   state().ChartTask = kTaskNone;
   if (!path) {
@@ -687,14 +693,14 @@ void ChartWindow::SaveChartAs(const std::optional<std::string>& path,
 void ChartWindow::ShowSaved(const std::string& path) {
   CancelChartTools();
   if (!EndsWith(path, ".cht")) {
-    services_.dialogs.Message("File extension must be .cht", "Saved Charts");
+    dialogs_.Message("File extension must be .cht", "Saved Charts");
     return;
   }
   EndPair();
   LayOut(false);
   state().OscCode.clear();
   SavedChartFile = path;
-  ChartFromFile = ShowSavedChart(services_.files, services_.dialogs, services_.price,
+  ChartFromFile = ShowSavedChart(services_.files, dialogs_, services_.price,
                                  services_.settings.fonts, services_.colours, path);
   // Whatever came of it, the composed chart is gone: nothing reads its tables.
   if (!ChartFromFile) Chart.ChartDrawn = false;

@@ -11,6 +11,7 @@
 #include "chart/composer.h"
 #include "chart/composition.h"
 #include "chartwindow/read_out.h"
+#include "chartwindow/told_once.h"
 #include "indicators/osc_panel.h"
 #include "platform/settings_file.h"
 #include "store/name_file.h"
@@ -123,7 +124,9 @@ class ChartWindow {
   bool Redraw();
   // The same with every tool left: the tool bar's "ref".
   bool Refresh();
-  // The pictures have another size and are blank.
+  // The pictures have another size and are blank: all that stood on them once more. A chart that
+  // failed is tried too, for another size shows other records; what the last try told is not
+  // told again.
   bool Resized();
   // Composes the security in hand with its oscillator.
   bool DrawChart();
@@ -225,10 +228,11 @@ class ChartWindow {
   void LayOut(bool twoPanes);
   bool Compose();
   bool Compose(const ChartRequest& request);
+  bool DrawAll();
   bool RedrawPair();
   ChartServices Services(Surface& price, Surface* panel, ChartScript* script);
   OscHost Host(std::string_view code, Composition& chart, const ChartRequest& request,
-               Surface& price, Surface& panel, ChartScript* script) const;
+               Surface& price, Surface& panel, ChartScript* script);
   void ShowPanel(std::string_view code);
   bool PeriodsValid() const;
   bool CompareFileThere();
@@ -241,6 +245,7 @@ class ChartWindow {
   void CrossToColumn(std::int32_t column);
 
   ChartWindowServices services_;
+  ToldOnce dialogs_;  // through which the window says everything
   ChartWindowView view_;
   std::optional<ChartScript> script_;
   ChartRequest first_;     // of the first chart of a pair

@@ -15,20 +15,23 @@ enum class Answer { kOk, kCancel, kYes, kNo, kRetry };
 class Progress {
  public:
   virtual ~Progress() = default;
-  // Lets the window live meanwhile. False when the user asks to stop.
+  // `done` of `total` steps. Lets the window live meanwhile. False when the user asks to stop.
   virtual bool Step(int done, int total) = 0;
 };
 
 // What the program says to the user and asks of him. One place, so that a command without
-// windows and the tests can answer.
+// windows and the tests can answer. Texts are UTF-8 and show as they are, line ends too.
 class Dialogs {
  public:
   virtual ~Dialogs() = default;
   virtual void Message(std::string_view text, std::string_view title) = 0;
+  // One of the buttons. A box that is closed without one answers cancel, or no where there is no
+  // Cancel.
   virtual Answer Ask(std::string_view text, std::string_view title, Buttons buttons) = 0;
   // Nothing when cancelled; an empty answer counts as cancelled too.
   virtual std::optional<std::string> Prompt(std::string_view text, std::string_view title,
                                             std::string_view standing) = 0;
+  // May be null: nothing is shown, and nobody stops it.
   virtual std::unique_ptr<Progress> StartProgress(std::string_view title) = 0;
   // The busy pointer. Calls do not nest.
   virtual void SetBusy(bool busy) = 0;

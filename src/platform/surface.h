@@ -54,6 +54,7 @@ class Surface {
   virtual void SetDrawMode(DrawMode mode) = 0;
 
   virtual void Line(double x1, double y1, double x2, double y2, Colour colour) = 0;
+  // Boxes between two opposite corners, both corners part of the box.
   virtual void Box(double x1, double y1, double x2, double y2, Colour colour) = 0;
   virtual void FilledBox(double x1, double y1, double x2, double y2, Colour colour) = 0;
   virtual void PSet(double x, double y, Colour colour) = 0;
@@ -68,7 +69,7 @@ class Surface {
   virtual void SetCurrent(double x, double y) = 0;  // upper left corner of the next text
   virtual double CurrentX() const = 0;
   virtual double CurrentY() const = 0;
-  // Prints at the current position and moves to x 0 of the next line (y + TextHeight()).
+  // Prints UTF-8 at the current position and moves to x 0 of the next line (y + TextHeight()).
   virtual void Print(std::string_view text) = 0;
 
   // True while the surface keeps its picture by itself across paints.

@@ -41,27 +41,28 @@ struct DownloadSettings {
 struct ChartSettings {
   std::string Type;         // last ChartStyle, "unknown" when never kept
   std::string Period;       // the same
-  std::int16_t Spacing = 0;
-  std::int16_t Bands = 0;
-  std::string AutoOsc;
-  std::int16_t List = 0;
+  std::int16_t Spacing = 0;  // chart units from bar to bar, 1 to 20; 0 never kept
+  std::int16_t Bands = 0;    // 0 none, 1 percentage, 2 Bollinger
+  std::string AutoOsc;       // "True": an oscillator comes with each chart
+  std::int16_t List = 0;     // ChartListNo
   bool AvOne = false, AvTwo = false;
   bool AvCalc = false;      // exponential
   bool ScMethod = true;     // automatic scales
-  std::int16_t Av1D = 0, Av2D = 0, Av1W = 0, Av2W = 0;
-  double Cw = 0, Ch = 0;    // printed width and height
-  double SW = 0, SH = 0;    // print margins
-  double EFact = 0;         // print enlargement
-  std::int16_t LineWidth = 0;
-  std::int16_t BlankSpace = 0;
-  std::int16_t GridSpace = 0;
+  std::int16_t Av1D = 0, Av2D = 0;  // periods of the averages in days, and
+  std::int16_t Av1W = 0, Av2W = 0;  // in weeks or months
+  double Cw = 0, Ch = 0;    // width and height of the printed chart, twips
+  double SW = 0, SH = 0;    // origin of the printed scale, twips: a margin is negative
+  double EFact = 0;         // print enlargement, 1 as on the screen; 0 never kept
+  std::int16_t LineWidth = 0;   // of printed lines, dots: see PrintedLineWidth
+  std::int16_t BlankSpace = 0;  // chart units behind the last bar
+  std::int16_t GridSpace = 0;   // bars between vertical grid lines, 0 to 100
   bool MovingGrid = true;   // GridSpace 0
   bool HalfGrid = false;
   bool GridLines = false;
   std::int16_t VolHeight = 1;  // 1 to 3
-  double WeekFactor = 4.75;
+  double WeekFactor = 4.75;    // days to a week
   bool StopLoss = false;
-  float StopLossPct = 0;
+  float StopLossPct = 0;       // 0 to 100 percent
 };
 
 // Section Chart Fonts.
@@ -75,11 +76,11 @@ struct FontSettings {
   double Font2Points() const { return Font2Size > 0 ? Font2Size : 8; }
 };
 
-// Section ChtPage.
+// Section ChtPage: margins of text print-outs in twips.
 struct PageSettings {
   std::int32_t PPTop = 0, PPLft = 0;
   float PPBot = 0, PPRht = 0;
-  std::int16_t Orient = 0;
+  std::int16_t Orient = 0;  // 1 portrait, 2 landscape; otherwise the printer's
 };
 
 // One oscillator value: the daily key and its weekly or monthly twin.
@@ -101,11 +102,11 @@ struct OscSettings {
   bool LCalTp = false;   // line charts logarithmic: LogLines
   bool VCalTp = false;   // volumes logarithmic: LogVolume
   bool CutVols = false;  // hold volume bars at the top of their panel
-  bool ShowOsc = false;
-  bool FXRev = false;
-  bool FillIn = false;
-  bool RFAve = false;
-  std::array<std::int16_t, 12> MMASet{};
+  bool ShowOsc = false;  // the settings box comes before each oscillator
+  bool FXRev = false;    // FX is drawn upside down
+  bool FillIn = false;   // Directional Movement is filled between its two lines
+  bool RFAve = false;    // R/F shows its averages
+  std::array<std::int16_t, 12> MMASet{};  // periods of the multiple averages; below 1 none
 };
 
 // Command-line words of the program.
@@ -128,6 +129,8 @@ struct Settings {
   std::int16_t Zoom = 100;        // percent, 50 to 200
   std::int16_t AdjDivs = 0;       // Adjustments/Divs
   bool NoShortNames = false;
+  // The screen in units of 640 by 480, by which windows that kept no size grow; and whether it
+  // is another one than that.
   double ScreenScaleW = 1, ScreenScaleH = 1;
   bool LargeScreen = false;
   bool PathsMissing = false;      // SystemPath was empty at start

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <bit>
 #include <cstddef>
 #include <cstring>
 #include <limits>
@@ -18,18 +19,26 @@ namespace {
 // cache while it is worked through.
 constexpr std::int32_t kRecordsPerRead = 1024;
 
-// The eight characters as a number that compares as they do, and the month key alone.
-std::uint64_t DateKey(const FixedText<8>& date) {
+// The month key, "yyyymm", as a number that compares as its characters do.
+std::uint64_t MonthKey(const FixedText<8>& date) {
   std::uint64_t key = 0;
   for (int i = 0; i < 8; ++i) key = key << 8 | static_cast<unsigned char>(date.bytes[i]);
-  return key;
+  return key >> 16;
 }
-std::uint64_t MonthKey(const FixedText<8>& date) { return DateKey(date) >> 16; }
+// The same as a number that tells months apart in any order of bytes, which is read at once.
+std::uint64_t MonthBytes(const FixedText<8>& date) {
+  constexpr std::uint64_t kFirstSix =
+      std::endian::native == std::endian::little ? ~0ull >> 16 : ~0ull << 16;
+  return std::bit_cast<std::uint64_t>(date.bytes) & kFirstSix;
+}
+
+// x == 0, by its bits: the tests of every record are many, and those of whole numbers are cheap.
+bool IsZero(float x) { return std::bit_cast<std::uint32_t>(x) << 1 == 0; }
 
 // A month of file dates. Neighbours in a price file share theirs, so that the calendar is asked
 // once a month.
 struct CalendarMonth {
-  std::uint64_t key = 0;
+  std::uint64_t bytes = 0;
   int days = 0;
   int firstWeekday = 0;  // 1 Sunday to 7 Saturday
 };
@@ -38,7 +47,7 @@ struct CalendarMonth {
 CalendarMonth MonthOf(const FixedText<8>& date) {
   const auto first = ParseFileDate(std::string(date.bytes, 6) + "01");
   if (!first) throw RunTimeError(kBadCall);
-  return {MonthKey(date), DayNumber(AddMonths(*first, 1)) - DayNumber(*first), Weekday(*first)};
+  return {MonthBytes(date), DayNumber(AddMonths(*first, 1)) - DayNumber(*first), Weekday(*first)};
 }
 
 // The figures of the load, and the bars as they are made. It goes by value from run to run of
@@ -53,35 +62,35 @@ class Loader {
         recType_(recType) {}
 
   void Day(const PriceRec& rec, std::int32_t number) {
-    const std::ptrdiff_t index = next_ - bars_;
-    ChartBar& bar = *next_++;
-    const float high = rec.High, low = rec.Low, close = rec.Close;
-    std::int32_t volume = rec.Volume;
-    // A bar index is held against a record number here: in a slice that starts late in the
-    // file the first days without a close stay as they are.
-    if (close == 0 && index > firstDataRec_) {
-      std::memset(bar.Date, 0, sizeof bar.Date);
-      bar.Open = bar.High = bar.Low = bar.Close = previousClose_;
-      bar.Volume = volume = 0;
-    } else {
-      static_assert(offsetof(ChartBar, SourceRec) == offsetof(PriceRec, AdjFactor));
-      std::memcpy(&bar, &rec, offsetof(ChartBar, SourceRec));  // Date to Volume, as they stand
-      if (high == 0 && HasRange()) bar.Open = bar.High = bar.Low = close;
-      previousClose_ = close;
+    ChartBar& bar = *next_;
+    static_assert(offsetof(ChartBar, SourceRec) == offsetof(PriceRec, AdjFactor));
+    std::memcpy(&bar, &rec, offsetof(ChartBar, SourceRec));  // Date to Volume, as they stand
+    bar.SourceRec = IsZero(rec.AdjFactor) ? 0 : number;
+    float high = rec.High, low = rec.Low;
+    if (IsZero(high) || IsZero(low) || IsZero(rec.Close) || recType_ == kAdvanceDecline) {
+      if (IsZero(high) || recType_ == kAdvanceDecline) high = rec.Close;
+      if (IsZero(low) || recType_ == kAdvanceDecline) low = rec.Close;
+      // A bar index is held against a record number here: in a slice that starts late in the
+      // file the first days without a close stay as they are.
+      if (IsZero(rec.Close) && next_ - bars_ > firstDataRec_) {
+        std::memset(bar.Date, 0, sizeof bar.Date);
+        bar.Open = bar.High = bar.Low = bar.Close = next_[-1].Close;
+        bar.Volume = 0;
+      } else if (IsZero(rec.High) && HasRange()) {
+        bar.Open = bar.High = bar.Low = rec.Close;
+      }
     }
-    bar.SourceRec = rec.AdjFactor != 0 ? number : 0;
-
-    const bool closeOnly = recType_ == kAdvanceDecline;
-    RaiseHigh(high == 0 || closeOnly ? close : high);
-    LowerLow(low == 0 || closeOnly ? close : low);
-    CountVolume(volume);
+    ++next_;
+    RaiseHigh(high);
+    LowerLow(low);
+    CountVolume(bar.Volume);
   }
 
   void Week(const PriceRec& rec, std::int32_t number) {
+    const int before = weekday_;
     weekday_ = WeekdayOf(rec.RecDate);
-    if (weekday_ < previousWeekday_) Flush(rec.RecDate);
+    if (weekday_ < before) Flush(rec.RecDate);
     Accumulate(rec, number, rec.Volume);
-    previousWeekday_ = weekday_;
   }
 
   void Month(const PriceRec& rec, std::int32_t number) {
@@ -134,29 +143,32 @@ class Loader {
 
   // Error 5 when the text is no calendar date.
   int WeekdayOf(const FixedText<8>& date) {
-    if (MonthKey(date) != month_.key) month_ = MonthOf(date);
+    if (MonthBytes(date) != month_.bytes) month_ = MonthOf(date);
     const int tens = date.bytes[6] - '0', ones = date.bytes[7] - '0';
     const int day = tens * 10 + ones;
     if (tens < 0 || ones < 0 || ones > 9 || day < 1 || day > month_.days)
       throw RunTimeError(kBadCall);
-    return (month_.firstWeekday + day - 2) % 7 + 1;
+    static constexpr std::uint8_t kWeekdays[] = {1, 2, 3, 4, 5, 6, 7, 1, 2, 3, 4, 5, 6,
+                                                 7, 1, 2, 3, 4, 5, 6, 7, 1, 2, 3, 4, 5,
+                                                 6, 7, 1, 2, 3, 4, 5, 6, 7, 1, 2};
+    return kWeekdays[month_.firstWeekday + day - 2];
   }
 
   // A price that is no number is neither above nor below.
   void RaiseHigh(float high) { chartHigh_ = high > chartHigh_ ? high : chartHigh_; }
-  void LowerLow(float low) { chartLow_ = low != 0 && low < chartLow_ ? low : chartLow_; }
+  void LowerLow(float low) { chartLow_ = !IsZero(low) && low < chartLow_ ? low : chartLow_; }
 
   void Accumulate(const PriceRec& rec, std::int32_t number, std::int32_t volume) {
-    if (weekday_ == 1 || period_.Open == 0) period_.Open = rec.Open;
+    if (weekday_ == 1 || IsZero(period_.Open)) period_.Open = rec.Open;
     period_.LastDate = rec.RecDate;
     const float high = HasRange() ? rec.High : rec.Close;
     const float low = HasRange() ? rec.Low : rec.Close;
     period_.High = high > period_.High ? high : period_.High;
-    period_.Low = low != 0 && low < period_.Low ? low : period_.Low;
+    period_.Low = !IsZero(low) && low < period_.Low ? low : period_.Low;
     period_.Close = rec.Close;
-    period_.LastGoodClose = rec.Close != 0 ? rec.Close : period_.LastGoodClose;
+    period_.LastGoodClose = IsZero(rec.Close) ? period_.LastGoodClose : rec.Close;
     period_.Volume += volume;
-    period_.Source = rec.AdjFactor != 0 ? number : 0;
+    period_.Source = IsZero(rec.AdjFactor) ? 0 : number;
     period_.HasData = true;
   }
 
@@ -197,7 +209,7 @@ class Loader {
   }
 
   void CountVolume(std::int32_t volume) {
-    if (!volumeOption_ || volume == 0) return;
+    if (volume == 0) return;
     ++volumeCount_;
     volumeSum_ += volume;
     volMax_ = volume > volMax_ ? volume : volMax_;
@@ -214,22 +226,28 @@ class Loader {
   std::int32_t volMax_ = 0, volMin_ = 100000000;
   std::int64_t volumeSum_ = 0;  // exact: 32767 bars of 32 bits are far from 64
   std::int32_t volumeCount_ = 0;
-  float previousClose_ = 0;
 
   Period period_;
   CalendarMonth month_;
-  int weekday_ = 0;  // stays 0 where periods are months
-  int previousWeekday_ = 0;
+  int weekday_ = 0;  // of the record in hand; stays 0 where periods are months
   std::uint64_t lastMonth_ = 0;
   bool lastMonthSet_ = false;
 };
 
-// The loader after it took the run, whose first record has the number `first`.
+// The loader after it took the run, whose first record has the number `first`. `current` is the
+// record in hand, for failures; taking days has none.
+Loader TakeDays(Loader loader, std::span<const PriceRec> run, std::int32_t first,
+                std::int16_t& current) {
+  for (const PriceRec& rec : run) loader.Day(rec, first++);
+  current = static_cast<std::int16_t>(first - 1);  // never above LastDataRec
+  return loader;
+}
+
 template <void (Loader::*kTake)(const PriceRec&, std::int32_t)>
-Loader TakeRun(Loader loader, std::span<const PriceRec> run, std::int32_t first,
-               std::int16_t& current) {
+Loader TakePeriods(Loader loader, std::span<const PriceRec> run, std::int32_t first,
+                   std::int16_t& current) {
   for (const PriceRec& rec : run) {
-    current = static_cast<std::int16_t>(first);  // never above LastDataRec
+    current = static_cast<std::int16_t>(first);
     (loader.*kTake)(rec, first++);
   }
   return loader;
@@ -248,9 +266,9 @@ void LoadChartBars(const PriceFile& file, std::string_view chartPeriod, bool vol
   out.bars.resize(size_t(out.BarCount) + 1);
 
   Loader loader(out, out.bars.data(), volumeOption, recType);
-  const auto takeRun = chartPeriod == "A"   ? TakeRun<&Loader::Day>
-                       : chartPeriod == "W" ? TakeRun<&Loader::Week>
-                                            : TakeRun<&Loader::Month>;
+  const auto takeRun = chartPeriod == "A"   ? TakeDays
+                       : chartPeriod == "W" ? TakePeriods<&Loader::Week>
+                                            : TakePeriods<&Loader::Month>;
   std::array<PriceRec, kRecordsPerRead> buffer;
   std::span<PriceRec> run;
   const std::int32_t last = out.LastDataRec;

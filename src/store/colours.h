@@ -66,14 +66,14 @@ void LoadColours(const Files& files, const std::string& systemPath, std::string_
 // entries read so far over the defaults; false then.
 bool LoadUserColours(const Files& files, const std::string& systemPath, ChartColours& colours);
 
-// Writes entries 0 to 49 to Koraclr.dat.
+// Writes entries 0 to 49 to Koraclr.dat. Errors of Files::WriteAll.
 void SaveColours(const Files& files, const std::string& systemPath, const ChartColours& colours);
 
 // koraprn.dat, 4 bytes.
 struct PrinterColours {
   bool asked = false;  // false: the file is missing or empty
-  std::int16_t ColourPrinter = 0;
-  std::int16_t WhiteAsBlack = 1;
+  std::int16_t ColourPrinter = 0;  // 1 colour, 0 black and white
+  std::int16_t WhiteAsBlack = 1;   // 1: white prints in black
 };
 PrinterColours ReadPrinterColours(const Files& files, const std::string& systemPath);
 // Puts the two questions of the printer and writes the answers; a cancelled write is passed over.

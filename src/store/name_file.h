@@ -44,7 +44,9 @@ struct CurrentName {
   std::int16_t NameRecNo = 0;    // record last found
   std::int16_t NameCount = 0;    // records in the file at the last open
   std::string CurrentCode;
-  std::string CurrentDataFile;   // full DOS path of the price file, empty when not found
+  // The price file: its full DOS path after LocateCurrentCode, its name alone ("ORE.WDT") where
+  // chart selection or chart window chose the security; empty when not found.
+  std::string CurrentDataFile;
 };
 
 // Pads and upper-cases CurrentCode, finds its record and sets CurrentDataFile to data folder +

@@ -6,7 +6,9 @@
 #include "base/dates.h"
 #include "chart/composer.h"
 #include "store/price_rec.h"
+#include "tests/support/records.h"
 #include "tests/support/recording_surface.h"
+#include "tests/support/script_lines.h"
 #include "tests/support/scripted_dialogs.h"
 #include "tests/support/temp_home.h"
 
@@ -38,13 +40,7 @@ struct ComposerFixture {
 
   PriceRec& Day(std::string_view date, float open, float high, float low, float close,
                 std::int32_t volume = 0) {
-    PriceRec rec = NewPriceRec(date);
-    rec.Open = open;
-    rec.High = high;
-    rec.Low = low;
-    rec.Close = close;
-    rec.Volume = volume;
-    days.push_back(rec);
+    days.push_back(test::Day(date, open, high, low, close, volume));
     return days.back();
   }
   // `count` calendar days from `date` on, each flat at 10 but with a range of 9 to 11.
@@ -63,19 +59,8 @@ struct ComposerFixture {
     return ComposeChart(services, request, chart);
   }
 
-  std::vector<std::string> Script() const {
-    std::vector<std::string> out;
-    LineReader reader(script.text());
-    std::string_view line;
-    while (reader.Next(line)) out.emplace_back(line);
-    return out;
-  }
-  std::vector<std::string> Lines(char letter) const {
-    std::vector<std::string> out;
-    for (const std::string& line : Script())
-      if (line[0] == letter) out.push_back(line);
-    return out;
-  }
+  std::vector<std::string> Script() const { return LinesOf(script); }
+  std::vector<std::string> Lines(char letter) const { return LinesOf(script, letter); }
   bool Wrote(const std::string& line) const {
     for (const std::string& l : Script())
       if (l == line) return true;

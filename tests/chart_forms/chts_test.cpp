@@ -665,6 +665,25 @@ TEST_F(ChtsFormTest, WhileAMessageStandsNothingElseStarts) {
   EXPECT_EQ(shown(), "CCC.WDT");
 }
 
+TEST_F(ChtsFormTest, AChartThatFailedIsTriedAgainAtAnotherSize) {
+  Open();
+  const std::string prices = home.Get("drive_c/korawin/data/BBB.WDT");
+  session->files.Remove("c:\\korawin\\data\\BBB.WDT");
+  Key(Qt::Key_PageDown);
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  form->resize(700, 520);
+  QCoreApplication::processEvents();
+  form->resize(720, 540);
+  QCoreApplication::processEvents();
+  EXPECT_EQ(dialogs.said.size(), 1u) << "it does not say so again at every size";
+  EXPECT_FALSE(form->window().Chart.ChartDrawn);
+  home.Put("drive_c/korawin/data/BBB.WDT", prices);
+  form->resize(740, 560);
+  ASSERT_TRUE(WaitFor([&] { return form->window().Chart.ChartDrawn; }));
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_EQ(dialogs.said.size(), 1u);
+}
+
 TEST_F(ChtsFormTest, ANameFileThatShrinksOrVanishesWhilePagingIsTold) {
   Open();
   Key(Qt::Key_PageDown);

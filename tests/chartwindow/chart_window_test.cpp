@@ -6,6 +6,7 @@
 
 #include "base/dates.h"
 #include "lists/chart_list.h"
+#include "tests/support/failing_io.h"
 #include "tests/support/recording_surface.h"
 #include "tests/support/records.h"
 #include "tests/support/scripted_dialogs.h"
@@ -213,6 +214,90 @@ TEST_F(ChartWindowTest, ASecurityWithoutAPriceFileIsToldAndPassedByTheNextStep) 
   EXPECT_TRUE(window().NextChart());
   EXPECT_EQ(shown(), "CCC.WDT");
   EXPECT_FALSE(dialogs.busy);
+}
+
+TEST_F(ChartWindowTest, AChartThatFailedIsTriedAgainAtAnotherSizeAndItsFailureToldOnce) {
+  PutThree();
+  home.files().Remove("c:\\korawin\\data\\AAA.WDT");
+  EXPECT_FALSE(window().NextChart());
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  for (int i = 0; i < 3; ++i) EXPECT_FALSE(window().Resized());
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  PutPrices("AAA");
+  EXPECT_TRUE(window().Resized());
+  EXPECT_TRUE(window().Chart.ChartDrawn);
+  EXPECT_EQ(shown(), "AAA.WDT");
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  // It failed anew, of which the user knows nothing.
+  home.files().Remove("c:\\korawin\\data\\AAA.WDT");
+  EXPECT_FALSE(window().Resized());
+  EXPECT_EQ(dialogs.said.size(), 2u);
+  EXPECT_FALSE(window().Resized());
+  EXPECT_EQ(dialogs.said.size(), 2u);
+  EXPECT_FALSE(window().Refresh());
+  EXPECT_EQ(dialogs.said.size(), 3u) << "the user asked";
+}
+
+TEST_F(ChartWindowTest, AChartThatFailsWhereABadRecordIsInSightStandsAtASmallerSize) {
+  PutThree();
+  // 400 days: 80 weeks, 20 units each. The oldest record has no date of the calendar.
+  std::vector<PriceRec> days;
+  for (int i = 0; i < 400; ++i) {
+    const std::int32_t day = DayNumber({2020, 1, 6}) + i / 5 * 7 + i % 5;
+    days.push_back(Day(FormatFileDate(DateOfDayNumber(day)), 10, 11, 9, 10));
+  }
+  days[0].RecDate.set("19999999");
+  home.Put("drive_c/korawin/data/AAA.WDT", Bytes(days));
+  window();
+  state.ChartPeriod = "W";
+  state.BarSpacing = 20;
+  surface.SetWidth(2000);
+  EXPECT_FALSE(window().NextChart());
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  surface.SetWidth(1900);
+  EXPECT_FALSE(window().Resized());
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  surface.SetWidth(638);
+  EXPECT_TRUE(window().Resized());
+  EXPECT_GT(window().Chart.Bars.BarCount, 20);
+  EXPECT_EQ(dialogs.said.size(), 1u);
+}
+
+TEST_F(ChartWindowTest, APairWhoseSecondChartFailsIsToldOnceForAllSizes) {
+  PutThree();
+  window().SetChart2([] {});
+  window().NextChart();
+  window().StartSplitScreen();
+  home.files().Remove("c:\\korawin\\data\\BBB.WDT");
+  EXPECT_FALSE(window().NextChart());
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  for (int i = 0; i < 3; ++i) window().Resized();
+  EXPECT_EQ(dialogs.said.size(), 1u);
+}
+
+TEST_F(ChartWindowTest, ADiskThatIsNotReadyIsAskedForOnceForAllSizes) {
+  PutThree();
+  struct NotReady : test::FailingIo {
+    bool ready = true;
+    std::unique_ptr<HostFile> Open(const std::string& path, OpenMode mode) override {
+      if (!ready && path.ends_with(".WDT")) throw RunTimeError(kDiskNotReady);
+      return FailingIo::Open(path, mode);
+    }
+  } drive;
+  const Files files(home.path(), drive);
+  ChartWindow charts({.files = files, .dialogs = dialogs, .settings = settings, .ini = ini,
+                      .user = user, .colours = colours, .current = current, .state = state,
+                      .price = surface, .panel = panel});
+  charts.Load();
+  drive.ready = false;
+  dialogs.answers = {Answer::kCancel, Answer::kCancel, Answer::kCancel};
+  EXPECT_FALSE(charts.NextChart());
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_FALSE(charts.Resized());
+  EXPECT_FALSE(charts.Resized());
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  drive.ready = true;
+  EXPECT_TRUE(charts.Resized());
 }
 
 TEST_F(ChartWindowTest, ACodeThatIsNoFileNameIsToldAndReadsNothing) {
@@ -582,6 +667,19 @@ TEST_F(OscillatorTest, ItIsNotPartOfTheNextChartButStaysAtAnotherSize) {
   EXPECT_EQ(state.OscCode, "");
 }
 
+TEST_F(OscillatorTest, OneThatCannotBeShownIsToldOnceForAllSizes) {
+  state.OscShown = true;
+  state.OscSelected = state.OscCode = "RMO";
+  window().SetPeriod("W");
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].text, "RMO only available on Daily Charts");
+  for (int i = 0; i < 3; ++i) {
+    state.OscCode = "RMO";
+    EXPECT_TRUE(window().Resized());
+  }
+  EXPECT_EQ(dialogs.said.size(), 1u);
+}
+
 TEST_F(OscillatorTest, OneThatChartSelectionChoseIsPartOfEveryChart) {
   state.OscShown = true;
   state.OscCode = state.OscSelected = "MACD";
@@ -852,7 +950,7 @@ TEST_F(SaveTest, AnotherEndingIsRefused) {
 
 TEST_F(SaveTest, AFileThatIsThereIsReplacedOnlyOnOk) {
   home.Put("drive_c/korawin/chtsave/a.cht", "old");
-  dialogs.answers = {Answer::kCancel};
+  dialogs.answers = {Answer::kCancel, Answer::kCancel, Answer::kCancel};
   EXPECT_EQ(Save("a.cht"), " CHART NOT SAVED ");
   EXPECT_EQ(dialogs.said[0].text,
             "c:\\korawin\\chtsave\\a.cht already exists - Overwrite");

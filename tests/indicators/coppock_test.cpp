@@ -6,7 +6,7 @@
 
 #include "indicators/oscillators.h"
 #include "indicators/value_frame.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -73,9 +73,9 @@ TEST(CoppockTest, TitleLabelsAndLines) {
   EXPECT_SEGMENT(lines[1], 42, 121, 630, 121);
   EXPECT_SEGMENT(lines[2], 42, 127, 630, 127);
   // A digit is 6.1 wide: 12 and 6.
-  EXPECT_EQ(Texts(f), (std::vector<std::string>{"T,8.25,44,313,Coppock    2 Period,27",
-                                                "T,8.25,25,325,13,27", "T,8.25,31,423,0,27",
-                                                "T,8.25,31,429,0,27"}));
+  EXPECT_EQ(f.Lines('T'),
+            (std::vector<std::string>{"T,8.25,44,313,Coppock    2 Period,27", "T,8.25,25,325,13,27",
+                                      "T,8.25,31,423,0,27", "T,8.25,31,429,0,27"}));
 }
 
 TEST(CoppockTest, AStateBeyond16BitsEndsInTheMessage) {

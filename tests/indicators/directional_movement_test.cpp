@@ -5,7 +5,7 @@
 #include <cmath>
 
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -114,7 +114,7 @@ TEST(DirectionalMovementTest, APeriodOfZeroBecomesTen) {
   OscFixture f;
   SetBars(f, ConstantDx(40));
   ShowDirectionalMovement(f.host);
-  EXPECT_EQ(Texts(f), std::vector<std::string>{
+  EXPECT_EQ(f.Lines('T'), std::vector<std::string>{
                           "T,8.25,44,313,Directional Movement ( 10 period )    ADX 10 period,27"});
 }
 

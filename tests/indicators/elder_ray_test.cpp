@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -52,7 +52,7 @@ TEST(ElderRayTest, TitleAndZeroLines) {
   SetBars(f, kFour);
   ShowElderRay(f.host);
   // 138 * 0.3 = 41.4 and 138 * 0.75 = 103.5, half to even.
-  EXPECT_EQ(Texts(f), (std::vector<std::string>{
+  EXPECT_EQ(f.Lines('T'), (std::vector<std::string>{
                           "T,8.25,44,313,Elder Ray ( 2  Period )  ,27", "T,8.25,22,343,0.0,27",
                           "T,8.25,22,406,0.0,27", "T,8.25,43,343,Bull,27",
                           "T,8.25,43,406,Bear,27"}));
@@ -84,7 +84,7 @@ TEST(ElderRayTest, NoRaysAtAllKeepTheStartingRangesAndShowTheEmptyPanel) {
   SetBars(f, kFour);
   ShowElderRay(f.host);
   EXPECT_EQ(f.Lines('L').size(), 2u);
-  EXPECT_EQ(Texts(f).size(), 5u);
+  EXPECT_EQ(f.Lines('T').size(), 5u);
 }
 
 TEST(ElderRayTest, ARangeOfZeroOnEitherSideLeavesTheFrame) {

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -70,7 +70,7 @@ TEST(HolyGrailTest, TitleLabelsAndLines) {
   f.settings.osc.HolyD.daily = 2;
   f.Closes(kCloses);
   ShowHolyGrail(f.host);
-  const auto texts = Texts(f);
+  const auto texts = f.Lines('T');
   ASSERT_EQ(texts.size(), 4u);
   EXPECT_EQ(texts[0], "T,8.25,44,313,Jones Holy Grail    2 Period,27");
   EXPECT_NE(texts[1].find(",325,1.500,27"), std::string::npos) << texts[1];

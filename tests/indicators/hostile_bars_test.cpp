@@ -4,7 +4,7 @@
 #include <limits>
 
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 // What no market has, and files can: every panel ends, tells at most one message, leaves the
 // pointer free and the script closed, and writes no coordinate that is no number.

@@ -4,7 +4,7 @@
 
 #include "indicators/ema_column.h"
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -77,7 +77,7 @@ TEST(MacdTest, TitleAndGuides) {
   OscFixture f;
   Rise(f, 60);
   ShowMACD(f.host);
-  const auto texts = Texts(f);
+  const auto texts = f.Lines('T');
   ASSERT_EQ(texts.size(), 6u);
   EXPECT_EQ(texts[0], "T,8.25,44,313,MACD ( 12 / 26 / 9  Period )  ,27");
   EXPECT_EQ(texts[1], "T,8.25,22,371,0.0,27");  // 138 / 2, not moved by the frame's top
@@ -153,7 +153,7 @@ TEST(MacdTest, WeeksAndMonthsReadTheTwinsAndOtherLettersNothing) {
   f.settings.osc.Md1.twin = 5;
   f.request.ChartPeriod = "M";
   ShowMACD(f.host);
-  EXPECT_EQ(Texts(f).at(0), "T,8.25,44,313,MACD ( 5 / 26 / 9  Period )  ,27");
+  EXPECT_EQ(f.Lines('T').at(0), "T,8.25,44,313,MACD ( 5 / 26 / 9  Period )  ,27");
 
   OscFixture other;
   Rise(other, 60);

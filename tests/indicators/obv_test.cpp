@@ -5,7 +5,7 @@
 #include <limits>
 
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 #include "tests/support/error_of.h"
 
 using namespace kora;
@@ -69,7 +69,7 @@ TEST(ObvTest, TheScaleStandsAtTheQuartersWithItsTotals) {
   EXPECT_SEGMENT(dashed[0], 42, 99.6, 630, 99.6);
   EXPECT_SEGMENT(dashed[1], 42, 44.4, 630, 44.4);
 
-  const auto texts = Texts(f);
+  const auto texts = f.Lines('T');
   ASSERT_EQ(texts.size(), 6u);
   EXPECT_EQ(texts[0], "T,8.25,44,313,On-Balance Volume (base 10000),27");
   const char* labels[] = {"100.3k", "100.4k", "100.5k", "100.5k", "100.6k"};

@@ -5,7 +5,7 @@
 #include <algorithm>
 
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -156,7 +156,7 @@ TEST(ParabolicTest, TheLastStopIsPrintedAtTheRightEdge) {
   ShowParabolic(f.host);
   const std::string text = "Parabolic last stop : 9.39";
   const double x = 630 - f.price.TextWidth(text);
-  EXPECT_EQ(Texts(f), std::vector<std::string>{"T,8.25," + Str(x) + ",50," + text + ",27"});
+  EXPECT_EQ(f.Lines('T'), std::vector<std::string>{"T,8.25," + Str(x) + ",50," + text + ",27"});
 }
 
 TEST(ParabolicTest, AStopUnder20CentsHasThreeDecimals) {
@@ -164,7 +164,7 @@ TEST(ParabolicTest, AStopUnder20CentsHasThreeDecimals) {
   SetPriceMap(f, 0.001f);
   SetHighLows(f, {{0.10f, 0.09f}, {0.11f, 0.10f}, {0.12f, 0.11f}, {0.13f, 0.12f}});
   ShowParabolic(f.host);
-  EXPECT_NE(Texts(f).at(0).find("Parabolic last stop : 0.094,"), std::string::npos);
+  EXPECT_NE(f.Lines('T').at(0).find("Parabolic last stop : 0.094,"), std::string::npos);
 }
 
 TEST(ParabolicTest, AYOfZeroAndAStopBelowZeroAreNotPlotted) {
@@ -267,7 +267,7 @@ TEST(ParabolicOnAverageTest, StartsWithThe21stCloseAndIsNotRounded) {
     EXPECT_NEAR(n[1], stops[i], 1e-4);
     EXPECT_EQ(n[2], 45);
   }
-  EXPECT_TRUE(Texts(f).empty());
+  EXPECT_TRUE(f.Lines('T').empty());
 }
 
 TEST(ParabolicOnAverageTest, TheAverageIsRoundedHalfToEven) {

@@ -7,7 +7,6 @@
 #include <limits>
 
 #include "tests/indicators/compare_fixture.h"
-#include "tests/indicators/real_prices.h"
 #include "tests/support/error_of.h"
 
 using namespace kora;
@@ -293,7 +292,7 @@ TEST(RmoTest, BarBeyond16BitsIsAnOverflow) {
 }
 
 TEST(RmoTest, RealPricesAgreeWithAPlainComputation) {
-  const std::vector<ChartBar> prices = RealBars("AAPL.csv"), index = RealBars("INTC.csv");
+  const std::vector<ChartBar> prices = RealBars("AAPL"), index = RealBars("INTC");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";
   constexpr size_t P = 30, A = 10;
   Rmo f(P, A);

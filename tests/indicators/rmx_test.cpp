@@ -7,7 +7,6 @@
 #include <limits>
 
 #include "tests/indicators/compare_fixture.h"
-#include "tests/indicators/real_prices.h"
 #include "tests/support/error_of.h"
 #include "tests/support/failing_io.h"
 
@@ -300,7 +299,7 @@ TEST(RmxTest, BarBeyond16BitsIsAnOverflow) {
 }
 
 TEST(RmxTest, RealPricesAgreeWithAPlainComputation) {
-  std::vector<ChartBar> prices = RealBars("AAPL.csv"), index = RealBars("INTC.csv");
+  std::vector<ChartBar> prices = RealBars("AAPL"), index = RealBars("INTC");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";
   prices.erase(prices.begin(), prices.end() - 1000);
   constexpr size_t P = 100, A = 20;

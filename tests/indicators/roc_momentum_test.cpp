@@ -7,7 +7,6 @@
 #include <limits>
 
 #include "tests/indicators/osc_fixture.h"
-#include "tests/indicators/real_prices.h"
 #include "tests/support/error_of.h"
 
 using namespace kora;
@@ -294,7 +293,7 @@ TEST(RocTest, BarBeyond16BitsIsAnOverflow) {
 }
 
 TEST(RocTest, RealPricesAgreeWithAPlainComputation) {
-  const std::vector<ChartBar> prices = test::RealBars("ORCL.csv");
+  const std::vector<ChartBar> prices = test::RealBars("ORCL");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";
   Change f(21, 10);
   for (const ChartBar& bar : prices) f.AddBar(bar);

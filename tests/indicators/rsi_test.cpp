@@ -5,7 +5,7 @@
 #include <limits>
 
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -61,7 +61,7 @@ TEST(RsiTest, ThePlacesOfTitleAndGuides) {
   // Height 118 from 13 on: 48.4, 95.6, 72. Labels are 22 wide.
   EXPECT_EQ(f.Lines('L'), (std::vector<std::string>{"L,42,356,630,356,16", "L,42,404,630,404,16",
                                                     "L,42,380,630,380,16"}));
-  EXPECT_EQ(Texts(f), (std::vector<std::string>{
+  EXPECT_EQ(f.Lines('T'), (std::vector<std::string>{
                           "T,8.25,44,313,Relative Strength Index Oscillator (14 Period),27",
                           "T,8.25,15,350,70%,27", "T,8.25,15,398,30%,27",
                           "T,8.25,15,374,50%,27"}));
@@ -85,7 +85,7 @@ TEST(RsiTest, WeeklyChartsReadTheTwin) {
   f.request.ChartPeriod = "W";
   f.Closes({1, 2, 3});
   ShowRSI(f.host);
-  EXPECT_EQ(Texts(f)[0], "T,8.25,44,313,Relative Strength Index Oscillator (9 Period),27");
+  EXPECT_EQ(f.Lines('T')[0], "T,8.25,44,313,Relative Strength Index Oscillator (9 Period),27");
 }
 
 TEST(RsiTest, APriceWithoutBoundsEndsInTheMessage) {

@@ -7,7 +7,6 @@
 #include <limits>
 
 #include "tests/indicators/osc_fixture.h"
-#include "tests/indicators/real_prices.h"
 
 using namespace kora;
 using kora::test::OscFixture;
@@ -430,7 +429,7 @@ TEST(StochasticTest, BarBeyond16BitsIsAnOverflow) {
 }
 
 TEST(StochasticTest, RealPricesAgreeWithAPlainComputation) {
-  const std::vector<ChartBar> prices = test::RealBars("AAPL.csv");
+  const std::vector<ChartBar> prices = test::RealBars("AAPL");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";
   constexpr int K = 10, D = 5;
   Stochastic f(K, D);

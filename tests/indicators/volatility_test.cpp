@@ -6,7 +6,7 @@
 #include <limits>
 
 #include "indicators/oscillators.h"
-#include "tests/indicators/osc_data.h"
+#include "tests/indicators/osc_fixture.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -89,7 +89,7 @@ TEST(VolatilityTest, GuidesArePlacesOnThePanelAndNoValues) {
   SetBars(f, kFour);
   ShowVolatility(f.host);
   // 36.6, 107.4 and 72, though the values run from 20 to 30.
-  EXPECT_EQ(Texts(f), (std::vector<std::string>{
+  EXPECT_EQ(f.Lines('T'), (std::vector<std::string>{
                           "T,8.25,44,313,Volatility (3 Period),27", "T,8.25,15,339,80%,27",
                           "T,8.25,15,409,20%,27", "T,8.25,15,374,50%,27"}));
   const auto guides = Drawn(f, 'L', 16);

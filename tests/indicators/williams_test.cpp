@@ -7,7 +7,6 @@
 #include <limits>
 
 #include "tests/indicators/osc_fixture.h"
-#include "tests/indicators/real_prices.h"
 
 using namespace kora;
 using kora::test::OscFixture;
@@ -186,7 +185,7 @@ TEST(WilliamsTest, BarBeyond16BitsKeepsTheLastPlace) {
 }
 
 TEST(WilliamsTest, RealPricesAgreeWithAPlainComputation) {
-  const std::vector<ChartBar> prices = test::RealBars("INTC.csv");
+  const std::vector<ChartBar> prices = test::RealBars("INTC");
   if (prices.empty()) GTEST_SKIP() << "no real prices here";
   constexpr size_t P = 7;
   Williams f(P);

@@ -1,9 +1,10 @@
 #include "chartwindow/forms/ChtOptions.h"
 
-#include <QHBoxLayout>
 #include <QLabel>
 #include <QListWidget>
 #include <QPushButton>
+
+#include "platform/qt/form_parts.h"
 
 namespace kora {
 
@@ -24,16 +25,9 @@ ChtOptions::ChtOptions(const ChtOptionsServices& services, QWidget* parent)
   label1_->setFrameStyle(QFrame::Panel | QFrame::Sunken);
   label1_->setMargin(fontMetrics().height() / 6);
 
-  auto* choose = new QPushButton("&OK", this);
-  choose->setObjectName("Command1");
-  choose->setDefault(true);
-  auto* close = new QPushButton("&Close", this);
-  close->setObjectName("Command2");
-  close->setAutoDefault(false);
-  auto* buttons = new QHBoxLayout;
-  buttons->addStretch();
-  buttons->addWidget(choose);
-  buttons->addWidget(close);
+  auto* buttons = new ButtonRow(this);
+  QPushButton* choose = buttons->Add("Command1", "&OK", [this] { Choose(); });
+  buttons->Add("Command2", "&Close", [this] { reject(); });
 
   auto* rows = new QVBoxLayout(this);
   rows->addWidget(list1_, 1);
@@ -43,8 +37,6 @@ ChtOptions::ChtOptions(const ChtOptionsServices& services, QWidget* parent)
 
   connect(list1_, &QListWidget::currentRowChanged, this, [this] { ShowChoice(); });
   connect(list1_, &QListWidget::itemDoubleClicked, choose, &QPushButton::click);
-  connect(choose, &QPushButton::clicked, this, [this] { Choose(); });
-  connect(close, &QPushButton::clicked, this, &QDialog::reject);
   list1_->setCurrentRow(services.chartListNo - kFullList);
 }
 

@@ -14,6 +14,7 @@
 #include "chartwindow/forms/ChtOptions.h"
 #include "lists/forms/IndClass.h"
 #include "lists/forms/Search.h"
+#include "platform/qt/to_qt.h"
 
 
 namespace kora {
@@ -34,7 +35,7 @@ ChtSel::ChtSel(ChtSelServices services, QWidget* parent)
   combo2_ = new QComboBox(this);
   combo2_->setObjectName("Combo2");
   for (const OscChoice& osc : OscChoices())
-    combo2_->addItem(QString::fromUtf8(osc.caption.data(), qsizetype(osc.caption.size())));
+    combo2_->addItem(ToQt(osc.caption));
   combo2_->setMaxVisibleItems(int(OscChoices().size()));
   combo3_ = new QComboBox(this);
   combo3_->setObjectName("Combo3");

@@ -31,16 +31,13 @@
 #include "base/text.h"
 #include "indicators/price_overlays.h"
 #include "platform/qt/picture.h"
+#include "platform/qt/to_qt.h"
 
 // Resources of a library are taken in by hand, outside of any namespace.
 static void TakeIcons() { Q_INIT_RESOURCE(chts_icons); }
 
 namespace kora {
 namespace {
-
-QString ToQt(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 struct Entry {
   const char* name;     // empty: a separator
@@ -189,8 +186,7 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
   resized_.setInterval(0);
   resized_.callOnTimeout(this, [this] {
     if (busy_) sizeWaits_ = true;
-    // A chart that could not be drawn would only say so again at every size.
-    else if (window_.Chart.ChartDrawn || window_.ChartFromFile) Do([this] { window_.Resized(); });
+    else Do([this] { window_.Resized(); });
   });
   for (PictureBox* picture : {picture1_, picture2_})
     picture->Resized = [this, picture] {

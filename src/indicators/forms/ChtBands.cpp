@@ -23,16 +23,12 @@ ChtBands::ChtBands(ChtBandsServices services, BandForm form, QWidget* parent)
   auto* grid = new QGridLayout(this);
   for (int i = 0; i < 2; ++i) {
     text_[i] = NewField(this, QString("Text%1").arg(i + 1), 4, 6);
-    text_[i]->setText(FormText(i == 0 ? standing.first : standing.second));
+    text_[i]->setText(ToQt(i == 0 ? standing.first : standing.second));
     grid->addWidget(NewLabel(this, captions[i], text_[i]), i, 0);
     grid->addWidget(text_[i], i, 1);
   }
   grid->setColumnStretch(2, 1);
-  grid->setRowStretch(2, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 3, 0, 1, 3);
+  AddOkCancel(this, grid, [this] { Save(); });
   FocusField(text_[0]);
 }
 

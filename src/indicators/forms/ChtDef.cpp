@@ -165,13 +165,13 @@ bool ChtDef::eventFilter(QObject* object, QEvent* event) {
 
 void ChtDef::Fill(const ChartDefaults& form) {
   const auto twin = [](const Twin& fields, const ChartDefaults::Twin& texts) {
-    fields.first->setText(FormText(texts.daily));
-    fields.second->setText(FormText(texts.twin));
+    fields.first->setText(ToQt(texts.daily));
+    fields.second->setText(ToQt(texts.twin));
   };
   for (size_t i = 0; i < periods_.size(); ++i) twin(periods_[i], form.periods[i]);
   twin(average1_, form.average1);
   twin(average2_, form.average2);
-  compFile_->setText(FormText(form.CompFile));
+  compFile_->setText(ToQt(form.CompFile));
   avOne_->Set(form.AvOne);
   avTwo_->Set(form.AvTwo);
   avCalc_->Set(form.AvCalc);

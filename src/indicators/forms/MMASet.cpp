@@ -15,7 +15,7 @@ namespace kora {
 MMASet::MMASet(LookServices services, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("MMASet");
-  setWindowTitle(FormText(kMMASetTitle));
+  setWindowTitle(ToQt(kMMASetTitle));
   auto* grid = new QGridLayout(this);
   const char* captions[] = {"&Short", "&Long"};
   for (int i = 0; i < 12; ++i) {
@@ -36,7 +36,7 @@ MMASet::MMASet(LookServices services, QWidget* parent)
 }
 
 void MMASet::Fill(const std::array<std::int16_t, 12>& periods) {
-  for (size_t i = 0; i < 12; ++i) text1_[i]->setText(FormText(Str(std::int32_t(periods[i]))));
+  for (size_t i = 0; i < 12; ++i) text1_[i]->setText(ToQt(Str(std::int32_t(periods[i]))));
 }
 
 void MMASet::Save() {

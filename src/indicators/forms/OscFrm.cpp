@@ -40,11 +40,7 @@ OscFrm::OscFrm(OscFrmServices services, std::string_view oscCode, QWidget* paren
                           kCompareLimit);
   }
   grid->setColumnStretch(1, 1);
-  grid->setRowStretch(grid->rowCount(), 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, grid->rowCount(), 0, 1, 2);
+  AddOkCancel(this, grid, [this] { Save(); });
   if (!fields_.empty()) FocusField(fields_[0]);
 }
 
@@ -52,7 +48,7 @@ QLineEdit* OscFrm::AddField(const QString& name, const QString& label, const std
                             int columns, int limit) {
   auto* grid = static_cast<QGridLayout*>(layout());
   // What stands in the box is shown whole, however long: a cut number would be another one.
-  const QString text = FormText(value);
+  const QString text = ToQt(value);
   QLineEdit* field = NewField(this, name, columns, std::max(limit, int(text.size())));
   field->setText(text);
   field->installEventFilter(this);

@@ -16,7 +16,7 @@ namespace kora {
 StpLs::StpLs(LookServices services, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("StpLs");
-  setWindowTitle(FormText(kStopLossTitle));
+  setWindowTitle(ToQt(kStopLossTitle));
   const ChartSettings& charts = services_.settings.charts;
   on_ = new QRadioButton("O&n", this);
   on_->setObjectName("Option1(0)");
@@ -24,7 +24,7 @@ StpLs::StpLs(LookServices services, QWidget* parent)
   off->setObjectName("Option1(1)");
   (charts.StopLoss ? on_ : off)->setChecked(true);
   text1_ = NewField(this, "Text1", 6, 10);
-  text1_->setText(FormText(Str(charts.StopLossPct)));
+  text1_->setText(ToQt(Str(charts.StopLossPct)));
 
   auto* grid = new QGridLayout(this);
   grid->addWidget(NewLabel(this, "Stop loss"), 0, 0);
@@ -36,11 +36,7 @@ StpLs::StpLs(LookServices services, QWidget* parent)
   grid->addWidget(NewLabel(this, "&Percent below the low", text1_), 1, 0);
   grid->addWidget(text1_, 1, 1);
   grid->setColumnStretch(2, 1);
-  grid->setRowStretch(2, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 3, 0, 1, 3);
+  AddOkCancel(this, grid, [this] { Save(); });
   FocusField(text1_);
 }
 

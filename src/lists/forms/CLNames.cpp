@@ -3,7 +3,8 @@
 #include <QGridLayout>
 #include <QLabel>
 #include <QLineEdit>
-#include <QPushButton>
+
+#include "platform/qt/form_parts.h"
 
 namespace kora {
 
@@ -28,22 +29,13 @@ CLNames::CLNames(ListFormServices services, QWidget* parent)
     connect(text1_[i], &QLineEdit::textEdited, this, [this] { changed_ = true; });
   }
   grid->setColumnStretch(1, 1);
-  auto* save = new QPushButton("&Save", this);
-  save->setObjectName("Command1");
-  save->setDefault(true);
-  auto* close = new QPushButton("C&lose", this);
-  close->setObjectName("Command2");
-  close->setAutoDefault(false);
-  auto* buttons = new QHBoxLayout;
-  buttons->addStretch();
-  buttons->addWidget(save);
-  buttons->addWidget(close);
-  grid->addLayout(buttons, kUserLists, 0, 1, 2);
-  grid->setRowStretch(kUserLists, 1);
-  connect(save, &QPushButton::clicked, this, [this] {
+  auto* buttons = new ButtonRow(this);
+  buttons->Add("Command1", "&Save", [this] {
     if (Save()) accept();
   });
-  connect(close, &QPushButton::clicked, this, &QDialog::reject);
+  buttons->Add("Command2", "C&lose", [this] { reject(); });
+  grid->addLayout(buttons, kUserLists, 0, 1, 2);
+  grid->setRowStretch(kUserLists, 1);
 }
 
 bool CLNames::Save() {

@@ -1,11 +1,11 @@
 #include "lists/forms/IndClass.h"
 
 #include <QHeaderView>
-#include <QPushButton>
 #include <QTableWidget>
 #include <QVBoxLayout>
 
 #include "lists/forms/list_box.h"
+#include "platform/qt/form_parts.h"
 
 namespace kora {
 
@@ -36,22 +36,13 @@ IndClass::IndClass(const Files& files, Dialogs& dialogs, const std::string& syst
   if (grid_->rowCount() > 0) grid_->selectRow(0);
   grid_->setMinimumSize(fontMetrics().averageCharWidth() * 55, fontMetrics().height() * 18);
 
-  auto* select = new QPushButton("&Select", this);
-  select->setObjectName("Command1");
-  select->setDefault(true);
-  auto* close = new QPushButton("&Close", this);
-  close->setObjectName("Command2");
-  close->setAutoDefault(false);
-  auto* buttons = new QHBoxLayout;
-  buttons->addStretch();
-  buttons->addWidget(select);
-  buttons->addWidget(close);
+  auto* buttons = new ButtonRow(this);
+  buttons->Add("Command1", "&Select", [this] { accept(); });
+  buttons->Add("Command2", "&Close", [this] { reject(); });
   auto* rows = new QVBoxLayout(this);
   rows->addWidget(grid_);
   rows->addLayout(buttons);
 
-  connect(select, &QPushButton::clicked, this, &QDialog::accept);
-  connect(close, &QPushButton::clicked, this, &QDialog::reject);
   connect(grid_, &QTableWidget::itemDoubleClicked, this, &QDialog::accept);
 }
 

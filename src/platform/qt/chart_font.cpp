@@ -4,6 +4,7 @@
 #include <QStringList>
 #include <algorithm>
 
+#include "platform/qt/to_qt.h"
 #include "platform/text_metrics.h"
 
 namespace kora {
@@ -16,7 +17,7 @@ bool CanBeFace(const SurfaceFont& font) {
 }
 
 ChartFont MakeChartFont(const SurfaceFont& of) {
-  const QString name = QString::fromUtf8(of.name.data(), qsizetype(of.name.size()));
+  const QString name = ToQt(of.name);
   ChartFont made;
   made.standard = HasStandardMetrics(of) || !QFontDatabase::hasFamily(name);
   QFont& font = made.font;

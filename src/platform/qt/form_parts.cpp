@@ -1,17 +1,15 @@
 #include "platform/qt/form_parts.h"
 
 #include <QDialog>
+#include <QGridLayout>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QSpinBox>
 #include <QStyle>
 #include <QToolButton>
 
 namespace kora {
-
-QString FormText(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 QLineEdit* NewField(QWidget* form, const QString& name, int columns, int limit) {
   auto* field = new QLineEdit(form);
@@ -22,6 +20,14 @@ QLineEdit* NewField(QWidget* form, const QString& name, int columns, int limit) 
   field->setMinimumWidth(width);
   // A short box stays short where its column is wide.
   if (columns <= 12) field->setMaximumWidth(width);
+  return field;
+}
+
+QSpinBox* NewNumber(QWidget* form, const QString& name, int least, int most, int value) {
+  auto* field = new QSpinBox(form);
+  field->setObjectName(name);
+  field->setRange(least, most);
+  field->setValue(value);
   return field;
 }
 
@@ -65,7 +71,26 @@ QPushButton* ButtonRow::Add(const QString& name, const QString& caption,
   return button;
 }
 
+QPushButton* ButtonRow::AddOkCancel(std::function<void()> ok) {
+  QPushButton* button = Add("Command1", "&OK", std::move(ok));
+  Add("Command2", "&Cancel", [form = form_] { form->reject(); });
+  return button;
+}
+
+QPushButton* AddOkCancel(QDialog* form, QGridLayout* grid, std::function<void()> ok) {
+  grid->setRowStretch(grid->rowCount(), 1);
+  auto* buttons = new ButtonRow(form);
+  QPushButton* button = buttons->AddOkCancel(std::move(ok));
+  grid->addLayout(buttons, grid->rowCount(), 0, 1, -1);
+  return button;
+}
+
 void FocusField(QLineEdit* field) {
+  field->setFocus(Qt::OtherFocusReason);
+  field->selectAll();
+}
+
+void FocusField(QSpinBox* field) {
   field->setFocus(Qt::OtherFocusReason);
   field->selectAll();
 }

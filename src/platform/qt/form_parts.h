@@ -3,13 +3,15 @@
 #include <QBoxLayout>
 #include <QString>
 #include <functional>
-#include <string>
-#include <string_view>
+
+#include "platform/qt/to_qt.h"
 
 class QDialog;
+class QGridLayout;
 class QLabel;
 class QLineEdit;
 class QPushButton;
+class QSpinBox;
 class QToolButton;
 class QWidget;
 
@@ -18,10 +20,12 @@ namespace kora {
 // What the small forms are put together from. Widgets belong to `form`; `name` becomes the
 // objectName, by which tests and screen readers find a control.
 
-QString FormText(std::string_view text);
+inline QString FormText(std::string_view text) { return ToQt(text); }
 
 // A box of about `columns` digits or letters that takes `limit` characters.
 QLineEdit* NewField(QWidget* form, const QString& name, int columns, int limit);
+// A box of whole numbers from `least` to `most`.
+QSpinBox* NewNumber(QWidget* form, const QString& name, int least, int most, int value);
 // A label; with a buddy its mnemonic leads there.
 QLabel* NewLabel(QWidget* form, const QString& caption, QWidget* buddy = nullptr);
 // A label for sentences: it wraps at about `columns` letters.
@@ -36,13 +40,20 @@ class ButtonRow : public QHBoxLayout {
  public:
   explicit ButtonRow(QDialog* form);
   QPushButton* Add(const QString& name, const QString& caption, std::function<void()> pressed);
+  // "OK" (`Command1`) and "Cancel" (`Command2`), which rejects the form. Returns the first.
+  QPushButton* AddOkCancel(std::function<void()> ok);
 
  private:
   QDialog* form_;
   bool any_ = false;
 };
 
+// Ends a form that is laid out in `grid`: below what is there a row that takes the height to
+// spare, and below that OK and Cancel. Returns the OK button.
+QPushButton* AddOkCancel(QDialog* form, QGridLayout* grid, std::function<void()> ok);
+
 // Focus into the box with its text selected.
 void FocusField(QLineEdit* field);
+void FocusField(QSpinBox* field);
 
 }  // namespace kora

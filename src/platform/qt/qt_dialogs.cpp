@@ -6,12 +6,10 @@
 #include <QMessageBox>
 #include <QProgressDialog>
 
+#include "platform/qt/to_qt.h"
+
 namespace kora {
 namespace {
-
-QString ToQt(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 // What a dialog stands over, and gives the keyboard back to: the form that holds the others back,
 // which has just opened and may not be active yet.

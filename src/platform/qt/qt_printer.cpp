@@ -20,6 +20,7 @@
 #include "platform/qt/chart_font.h"
 #include "platform/qt/line_cut.h"
 #include "platform/qt/qt_surface.h"
+#include "platform/qt/to_qt.h"
 #include "platform/text_metrics.h"
 
 namespace kora {
@@ -38,10 +39,6 @@ struct Paper {
 constexpr Paper kPapers[] = {{"A4", QPageSize::A4},         {"A3", QPageSize::A3},
                              {"A5", QPageSize::A5},         {"Letter", QPageSize::Letter},
                              {"Legal", QPageSize::Legal},   {"Tabloid", QPageSize::Tabloid}};
-
-QString ToQt(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 std::optional<QPageSize::PageSizeId> PaperId(std::string_view name) {
   for (const Paper& paper : kPapers)

@@ -9,6 +9,7 @@
 #include "base/runtime_error.h"
 #include "platform/qt/chart_font.h"
 #include "platform/qt/line_cut.h"
+#include "platform/qt/to_qt.h"
 #include "platform/text_metrics.h"
 
 namespace kora {
@@ -27,10 +28,6 @@ bool Finite(double a, double b, double c, double d) {
 void SetDots(QImage& image) {
   image.setDotsPerMeterX(3780);
   image.setDotsPerMeterY(3780);
-}
-
-QString ToQt(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
 }
 
 }  // namespace

@@ -25,13 +25,13 @@ double PixelsInTenMillimetres(const QScreen* screen) {
 BlankSpc::BlankSpc(LookServices services, QWidget* parent, double pixelsPerUnit)
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("BlankSpc");
-  setWindowTitle(FormText(kBlankSpaceTitle));
+  setWindowTitle(ToQt(kBlankSpaceTitle));
   const ChartSettings& charts = services_.settings.charts;
   text1_ = NewField(this, "Text1", 4, 6);
-  text1_->setText(FormText(Str(std::int32_t(charts.BlankSpace))));
+  text1_->setText(ToQt(Str(std::int32_t(charts.BlankSpace))));
   const double units = RoundHalfEven(PixelsInTenMillimetres(screen()) / pixelsPerUnit);
-  auto* width = NewLabel(
-      this, "10mm = " + FormText(Str(units)) + " approx (varies with some monitors)");
+  auto* width =
+      NewLabel(this, "10mm = " + ToQt(Str(units)) + " approx (varies with some monitors)");
   width->setObjectName("Label2");
   slider1_ = new QSlider(Qt::Horizontal, this);
   slider1_->setObjectName("Slider1");
@@ -52,18 +52,14 @@ BlankSpc::BlankSpc(LookServices services, QWidget* parent, double pixelsPerUnit)
   grid->addWidget(slider1_, 2, 1);
   grid->addWidget(label4_, 2, 2);
   grid->setColumnStretch(1, 1);
-  grid->setRowStretch(3, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 4, 0, 1, 3);
+  AddOkCancel(this, grid, [this] { Save(); });
   connect(slider1_, &QSlider::valueChanged, this, [this] { ShowWeek(); });
   ShowWeek();
   FocusField(text1_);
 }
 
 void BlankSpc::ShowWeek() {
-  label4_->setText(FormText(Format(WeekFactorOfStep(slider1_->value()), "0.00")));
+  label4_->setText(ToQt(Format(WeekFactorOfStep(slider1_->value()), "0.00")));
 }
 
 void BlankSpc::Save() {

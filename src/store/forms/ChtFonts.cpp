@@ -16,7 +16,7 @@ namespace {
 std::optional<FontChoice> PickFromPlatform(QWidget* over, const FontChoice& standing,
                                            bool printerFontsOnly) {
   QFont font = over->font();
-  if (!standing.name.empty()) font.setFamily(FormText(standing.name));
+  if (!standing.name.empty()) font.setFamily(ToQt(standing.name));
   if (standing.points > 0) font.setPointSizeF(standing.points);
   bool chosen = false;
   font = QFontDialog::getFont(&chosen, font, over, {},
@@ -71,11 +71,7 @@ ChtFonts::ChtFonts(LookServices services, QWidget* parent, PickFont pick)
   options->addStretch();
   grid->addLayout(options, 5, 0, 1, 2);
   grid->setColumnStretch(1, 1);
-  grid->setRowStretch(6, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 7, 0, 1, 2);
+  AddOkCancel(this, grid, [this] { Save(); });
   first->setFocus();
 }
 
@@ -90,11 +86,11 @@ void ChtFonts::Pick(int index) {
 void ChtFonts::ShowChoice(int index) {
   const FontChoice& choice = choice_[index];
   QFont shown = font();
-  if (!choice.name.empty()) shown.setFamily(FormText(choice.name));
+  if (!choice.name.empty()) shown.setFamily(ToQt(choice.name));
   label3_[index]->setFont(shown);
   label3_[index]->setText(choice.name.empty()
                               ? QString("(none)")
-                              : FormText(choice.name + "  " + Str(choice.points)));
+                              : ToQt(choice.name + "  " + Str(choice.points)));
 }
 
 void ChtFonts::Save() {

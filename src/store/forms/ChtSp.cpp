@@ -13,24 +13,17 @@ ChtSp::ChtSp(LookServices services, char chartStyle, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("ChtSp");
   setWindowTitle("Chart Spacing");
-  text1_ = new QSpinBox(this);
-  text1_->setObjectName("Text1");
-  text1_->setRange(LeastSpacing(chartStyle), kMostSpacing);
   // 0 was never set: charts stand 2 apart then.
   const std::int16_t spacing = services_.settings.charts.Spacing;
-  text1_->setValue(spacing == 0 ? 2 : spacing);
+  text1_ = NewNumber(this, "Text1", LeastSpacing(chartStyle), kMostSpacing,
+                     spacing == 0 ? 2 : spacing);
 
   auto* grid = new QGridLayout(this);
   grid->addWidget(NewLabel(this, "Chart &Spacing", text1_), 0, 0);
   grid->addWidget(text1_, 0, 1);
   grid->setColumnStretch(2, 1);
-  grid->setRowStretch(1, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 2, 0, 1, 3);
-  text1_->setFocus();
-  text1_->selectAll();
+  AddOkCancel(this, grid, [this] { Save(); });
+  FocusField(text1_);
 }
 
 void ChtSp::Save() {

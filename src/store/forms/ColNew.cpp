@@ -111,7 +111,7 @@ ColNew::ColNew(ColNewServices services, QWidget* parent)
   for (int i = 0; i < kItems; ++i) {
     label2_[i] = new ColourItem(this);
     label2_[i]->setObjectName(QString("Label2(%1)").arg(i));
-    label2_[i]->setText(FormText(ColourRoleName(EntryOf(i))));
+    label2_[i]->setText(ToQt(ColourRoleName(EntryOf(i))));
     // For an item in the colour of the background.
     label2_[i]->setToolTip(label2_[i]->text());
     // Entries beyond the roles colour nothing.

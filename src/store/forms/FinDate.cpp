@@ -15,17 +15,13 @@ FinDate::FinDate(FinDateServices services, QWidget* parent)
   setWindowTitle("Finish Date");
   text1_ = NewField(this, "Text1", 10, 10);
   text1_->setPlaceholderText("d/m/yy");
-  text1_->setText(FormText(FinishDateText(services_.FinishDate)));
+  text1_->setText(ToQt(FinishDateText(services_.FinishDate)));
 
   auto* grid = new QGridLayout(this);
   grid->addWidget(NewLabel(this, "&Finish Date (d/m/yy)", text1_), 0, 0);
   grid->addWidget(text1_, 0, 1);
   grid->setColumnStretch(2, 1);
-  grid->setRowStretch(1, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 2, 0, 1, 3);
+  AddOkCancel(this, grid, [this] { Save(); });
   FocusField(text1_);
 }
 

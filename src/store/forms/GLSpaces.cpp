@@ -14,10 +14,10 @@ namespace kora {
 GLSpaces::GLSpaces(LookServices services, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("GLSpaces");
-  setWindowTitle(FormText(kGridSpaceTitle));
+  setWindowTitle(ToQt(kGridSpaceTitle));
   const ChartSettings& charts = services_.settings.charts;
   text1_ = NewField(this, "Text1", 4, 6);
-  text1_->setText(FormText(Str(std::int32_t(charts.GridSpace))));
+  text1_->setText(ToQt(Str(std::int32_t(charts.GridSpace))));
   check1_ = new QCheckBox("&Intermediate horizontal grid", this);
   check1_->setObjectName("Check1");
   check1_->setChecked(charts.HalfGrid);
@@ -33,11 +33,7 @@ GLSpaces::GLSpaces(LookServices services, QWidget* parent)
       3);
   grid->addWidget(check1_, 3, 0, 1, 3);
   grid->setColumnStretch(2, 1);
-  grid->setRowStretch(4, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 5, 0, 1, 3);
+  AddOkCancel(this, grid, [this] { Save(); });
   FocusField(text1_);
 }
 

@@ -13,10 +13,8 @@ PLW::PLW(LookServices services, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("PLW");
   setWindowTitle("Line Width (Printing)");
-  text1_ = new QSpinBox(this);
-  text1_->setObjectName("Text1");
-  text1_->setRange(kLeastLineWidth, kMostLineWidth);
-  text1_->setValue(PrintedLineWidth(services_.settings));
+  text1_ = NewNumber(this, "Text1", kLeastLineWidth, kMostLineWidth,
+                     PrintedLineWidth(services_.settings));
 
   auto* grid = new QGridLayout(this);
   grid->addWidget(NewNote(this, "Select a line width to be used on your PRINTED charts"), 0, 0,
@@ -26,13 +24,8 @@ PLW::PLW(LookServices services, QWidget* parent)
   grid->addWidget(NewLabel(this, "&Line width", text1_), 2, 0);
   grid->addWidget(text1_, 2, 1);
   grid->setColumnStretch(2, 1);
-  grid->setRowStretch(3, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 4, 0, 1, 3);
-  text1_->setFocus();
-  text1_->selectAll();
+  AddOkCancel(this, grid, [this] { Save(); });
+  FocusField(text1_);
 }
 
 void PLW::Save() {

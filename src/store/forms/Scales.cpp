@@ -21,7 +21,7 @@ Scales::Scales(ScalesServices services, QWidget* parent)
   auto* grid = new QGridLayout(this);
   const std::string title =
       FromAnsi(record.Code.trimmed()) + "  " + FromAnsi(Trim(record.Name.trimmed()));
-  auto* label1 = NewLabel(this, any ? FormText(title) : QString("No chart is selected"));
+  auto* label1 = NewLabel(this, any ? ToQt(title) : QString("No chart is selected"));
   label1->setObjectName("Label1");
   label1->setTextFormat(Qt::PlainText);
   grid->addWidget(label1, 0, 0, 1, 3);
@@ -30,17 +30,13 @@ Scales::Scales(ScalesServices services, QWidget* parent)
   const float values[] = {record.Base, record.Top, record.PFInc};
   for (int i = 0; i < 3; ++i) {
     text_[i] = NewField(this, QString("Text%1").arg(i + 1), 10, 20);
-    if (any) text_[i]->setText(FormText(ScaleText(values[i])));
+    if (any) text_[i]->setText(ToQt(ScaleText(values[i])));
     text_[i]->setEnabled(any);
     grid->addWidget(NewLabel(this, captions[i], text_[i]), i + 1, 0);
     grid->addWidget(text_[i], i + 1, 1);
   }
   grid->setColumnStretch(2, 1);
-  grid->setRowStretch(4, 1);
-  auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); })->setEnabled(any);
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 5, 0, 1, 3);
+  AddOkCancel(this, grid, [this] { Save(); })->setEnabled(any);
   FocusField(text_[0]);
 }
 

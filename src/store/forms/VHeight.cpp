@@ -28,8 +28,7 @@ VHeight::VHeight(LookServices services, QWidget* parent)
   }
   layout->addStretch();
   auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
+  buttons->AddOkCancel([this] { Save(); });
   layout->addLayout(buttons);
 }
 

@@ -1,5 +1,6 @@
 #include <benchmark/benchmark.h>
 
+#include <algorithm>
 #include <cmath>
 #include <string>
 #include <vector>
@@ -9,13 +10,15 @@
 #include "platform/headless/console_dialogs.h"
 #include "platform/headless/headless_surface.h"
 
-// The panels and trails of this half drawn with a script in memory, on 300, 1,000 and 5,000
-// bars, and beside those that every indicator library has a floor: a plain single-pass loop over
-// the same bars that draws nothing.
+// Panels and trails drawn with a script in memory, on 300, 1,000 and 5,000 bars, and beside those
+// that every indicator library has a floor: a plain single-pass loop over the same bars that
+// draws nothing.
 
 namespace {
 
 using namespace kora;
+
+constexpr const char* kData = "c:\\korawin\\data\\";
 
 struct Panel {
   bench::Home home;
@@ -27,7 +30,7 @@ struct Panel {
   HeadlessSurface price{1280, 400}, panel{1280, 144};
 
   explicit Panel(int n) : home(n) {
-    const PriceFile file(home.files(), "c:\\korawin\\data\\BENCH.WDT");
+    const PriceFile file(home.files(), std::string(kData) + "BENCH.WDT");
     chart.Bars.FirstDataRec = 1;
     chart.Bars.LastDataRec = static_cast<std::int16_t>(n);
     LoadChartBars(file, "A", true, kShare, chart.Bars);
@@ -43,22 +46,36 @@ struct Panel {
     for (const OscKey& key : OscKeys())
       settings.osc.*key.value = {key.defaultDaily, key.defaultTwin};
     settings.osc.FillIn = true;
+    settings.osc.RFAve = true;
+    settings.paths.CurrentDataPath = kData;
+    settings.osc.CompFile = std::string(kData) + "INDEX.WDT";
+    PutIndex(file);
+  }
+  // A compare file of the same length: the security's own prices, newest first.
+  void PutIndex(const PriceFile& file) {
+    const std::vector<PriceRec> records = file.ReadAll();
+    std::string bytes;
+    for (auto record = records.rbegin(); record != records.rend(); ++record)
+      bytes.append(reinterpret_cast<const char*>(&*record), sizeof *record);
+    home.files().WriteAll(settings.osc.CompFile, bytes);
   }
   // The length of the script.
-  size_t Draw(const char* code) {
+  size_t Draw(const char* code, bool slow) {
     ChartScript script;
     OscHost host{home.files(), dialogs, settings, colours, request, chart, price, panel, &script};
     host.OscCode = code;
+    host.SlowStochastic = slow;
     ShowOscillatorPanel(host);
     return script.text().size();
   }
 };
 
-void Run(benchmark::State& state, const char* code, PeriodPair OscSettings::*period = nullptr) {
+void Run(benchmark::State& state, const char* code, bool slow = false,
+         PeriodPair OscSettings::*period = nullptr) {
   Panel panel(static_cast<int>(state.range(0)));
   if (period) (panel.settings.osc.*period).daily = 200;
   size_t bytes = 0;
-  for (auto _ : state) benchmark::DoNotOptimize(bytes = panel.Draw(code));
+  for (auto _ : state) benchmark::DoNotOptimize(bytes = panel.Draw(code, slow));
   if (bytes < size_t(state.range(0)) * 5) state.SkipWithError("the panel drew no data");
   state.counters["script_bytes"] = double(bytes);
 }
@@ -73,6 +90,42 @@ void Floor(benchmark::State& state, Loop loop) {
     benchmark::DoNotOptimize(out.data());
     benchmark::ClobberMemory();
   }
+}
+
+void FloorStochastic(benchmark::State& state) {
+  Floor(state, [](const auto& bars, auto& out) {
+    constexpr size_t K = 10;
+    for (size_t i = K; i < bars.size(); ++i) {
+      float high = bars[i].High, low = bars[i].Low;
+      for (size_t j = i - K; j < i; ++j) {
+        high = std::max(high, bars[j].High);
+        low = std::min(low, bars[j].Low);
+      }
+      out[i] = 100.0 * (bars[i].Close - low) / (high - low);
+    }
+  });
+}
+
+void FloorWilliams(benchmark::State& state) {
+  Floor(state, [](const auto& bars, auto& out) {
+    constexpr size_t P = 7;
+    for (size_t i = P; i < bars.size(); ++i) {
+      float high = bars[i].High, low = bars[i].Low;
+      for (size_t j = i - P + 1; j < i; ++j) {
+        high = std::max(high, bars[j].High);
+        low = std::min(low, bars[j].Low);
+      }
+      out[i] = 100.0 * (high - bars[i].Close) / (high - low);
+    }
+  });
+}
+
+void FloorRoc(benchmark::State& state) {
+  Floor(state, [](const auto& bars, auto& out) {
+    constexpr size_t P = 21;
+    for (size_t i = P; i < bars.size(); ++i)
+      out[i] = 100.0 * (bars[i].Close - bars[i - P].Close) / bars[i - P].Close;
+  });
 }
 
 void FloorRsi(benchmark::State& state) {
@@ -145,19 +198,36 @@ void Longest(benchmark::internal::Benchmark* b) {
   b->Arg(5000)->Unit(benchmark::kMicrosecond);
 }
 
+BENCHMARK_CAPTURE(Run, StochasticFast, "STO")->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, StochasticSlow, "STO", true)->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, StochasticK200, "STO", false, &OscSettings::StochK)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, StochasticD200, "STO", true, &OscSettings::StochD)->Apply(Longest);
+BENCHMARK(FloorStochastic)->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, FX, "FX")->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, RocAndFx, "R/F")->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, ROC, "ROC")->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, RocAverage200, "ROC", false, &OscSettings::RocA)->Apply(Longest);
+BENCHMARK(FloorRoc)->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, Momentum, "MOM")->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, Williams, "WMS")->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, WilliamsP200, "WMS", false, &OscSettings::WmsA)->Apply(Longest);
+BENCHMARK(FloorWilliams)->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, RMO, "RMO")->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, RMX, "RMX")->Apply(Sizes);
+BENCHMARK_CAPTURE(Run, RmxP200, "RMX", false, &OscSettings::RmxP)->Apply(Longest);
 BENCHMARK_CAPTURE(Run, RSI, "RSI")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, RsiP200, "RSI", &OscSettings::RsiP)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, RsiP200, "RSI", false, &OscSettings::RsiP)->Apply(Longest);
 BENCHMARK(FloorRsi)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, Volatility, "VTY")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, VolatilityP200, "VTY", &OscSettings::VtyD)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, VolatilityP200, "VTY", false, &OscSettings::VtyD)->Apply(Longest);
 BENCHMARK_CAPTURE(Run, MACD, "MACD")->Apply(Sizes);
 BENCHMARK(FloorMacd)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, DirectionalMovement, "DM")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, DirectionalMovementN200, "DM", &OscSettings::DMA)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, DirectionalMovementN200, "DM", false, &OscSettings::DMA)->Apply(Longest);
 BENCHMARK_CAPTURE(Run, ElderRay, "ERY")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, Coppock, "COP")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, HolyGrail, "JHG")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, HolyGrailP200, "JHG", &OscSettings::HolyD)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, HolyGrailP200, "JHG", false, &OscSettings::HolyD)->Apply(Longest);
 BENCHMARK_CAPTURE(Run, OBV, "OBV")->Apply(Sizes);
 BENCHMARK(FloorObv)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, Parabolic, "PARA")->Apply(Sizes);
