@@ -75,8 +75,7 @@ class DayUpdate {
     if (run_.current.Rec.Code.raw()[0] == '\0') run_.current.Rec = NewNameRec("");
   }
 
-  // False when all or part of it was abandoned.
-  bool UpdateFromDownload();
+  UpdateEnd UpdateFromDownload();
 
  private:
   bool WholeMarket();
@@ -132,7 +131,7 @@ void DayUpdate::Step(int done, int total) {
     throw Stopped();
 }
 
-bool DayUpdate::UpdateFromDownload() {
+UpdateEnd DayUpdate::UpdateFromDownload() {
   TargetPath_ = run_.settings.paths.CurrentDataPath;
   if (!IsService(1) && !download_.UpdateAll)
     for (const UpdateRow& row : ReadUpdateList(run_.files, run_.settings.paths.SystemPath))
@@ -146,14 +145,14 @@ bool DayUpdate::UpdateFromDownload() {
           "Separate destination directories for Whole Market data have not been defined. Select "
           "Paths option and define ALL data directories.",
           "W/M Paths");
-      return false;
+      return UpdateEnd::kNotBegun;
     }
     good = WholeMarket();
   } else {
     run_.display.ShowState("Updating ");
     if (!run_.files.CheckFile(SelectedDownloadFile_)) {
       run_.dialogs.Message("File does not exist", "Update");
-      return false;
+      return UpdateEnd::kNotBegun;
     }
     good = UpdateFile();
   }
@@ -168,7 +167,7 @@ bool DayUpdate::UpdateFromDownload() {
     }
     UpdateSecurityDetails(run_.files, download_);
   }
-  return good;
+  return good ? UpdateEnd::kUpdated : UpdateEnd::kAbandoned;
 }
 
 bool DayUpdate::WholeMarket() {
@@ -234,12 +233,12 @@ bool DayUpdate::UpdateFile() {
     if (append && (SourceId_ == 'S' || SourceId_ == 'F' || SourceId_ == 'P')) NoTradePass();
     return true;
   }
-  if (EqualNoCase(LastOf(SelectedDownloadFile_, 1), "D")) {
-    try {
-      run_.files.Rename(SelectedDownloadFile_, SelectedDownloadFile_ + "X");
-    } catch (const RunTimeError&) {
-      // It stays listed.
-    }
+  // A file of the internet that keeps the ending ".ASX" gets neither.
+  if (!EqualNoCase(LastOf(SelectedDownloadFile_, 1), "D")) return true;
+  try {
+    run_.files.Rename(SelectedDownloadFile_, SelectedDownloadFile_ + "X");
+  } catch (const RunTimeError&) {
+    // It stays listed.
   }
   if (!IsService(1) && append) NoTradePass();
   return true;
@@ -450,7 +449,7 @@ void DayUpdate::AddName(const DayLine& day) {
   }
   {
     NameFile file(run_.files, NameFilePath(TargetPath_), OpenMode::kCreate);
-    file.Write(std::int32_t(names_.size()) + 1, rec);
+    file.Append(rec);
   }
   names_.push_back(rec);
   places_.try_emplace(day.code, names_.size() - 1);
@@ -507,16 +506,22 @@ void DayUpdate::NoTradePass() {
   }
 }
 
+// Shown from the first record of a run to the last.
+class Running {
+ public:
+  explicit Running(UpdateDisplay& display) : display_(display) { display_.SetRunning(true); }
+  ~Running() { display_.SetRunning(false); }
+  Running(const Running&) = delete;
+  Running& operator=(const Running&) = delete;
+
+ private:
+  UpdateDisplay& display_;
+};
+
 UpdateEnd UpdateDay(const UpdateRun& run, const std::string& entry, bool MoreToCome) {
-  struct Running {
-    UpdateDisplay& display;
-    explicit Running(UpdateDisplay& d) : display(d) { display.SetRunning(true); }
-    ~Running() { display.SetRunning(false); }
-  } running(run.display);
   try {
     run.display.ShowDate(entry);
-    return DayUpdate(run, entry, MoreToCome).UpdateFromDownload() ? UpdateEnd::kUpdated
-                                                                  : UpdateEnd::kAbandoned;
+    return DayUpdate(run, entry, MoreToCome).UpdateFromDownload();
   } catch (const Stopped&) {
   } catch (const RunTimeError& e) {
     run.dialogs.Message(DownloadErrorText(e), "Error");
@@ -535,22 +540,33 @@ void ClearTexts(UpdateDisplay& display) {
 }  // namespace
 
 UpdateEnd UpdateOneDay(const UpdateRun& run, DownloadEntries& entries, size_t selected) {
-  const UpdateEnd end = UpdateDay(run, entries.at(selected), false);
+  UpdateEnd end;
+  {
+    const Running running(run.display);
+    end = UpdateDay(run, entries.at(selected), false);
+  }
   if (end == UpdateEnd::kUpdated)
     entries.erase(entries.begin() + std::ptrdiff_t(selected));
   ClearTexts(run.display);
-  if (end != UpdateEnd::kStopped) run.display.ShowState("FINISHED");
+  const bool finished = end == UpdateEnd::kUpdated || end == UpdateEnd::kAbandoned;
+  run.display.ShowState(finished ? "FINISHED" : "");
   return end;
 }
 
 UpdateEnd UpdateAllDays(const UpdateRun& run, const DownloadEntries& entries,
                         const std::function<void(size_t)>& select) {
   UpdateEnd all = UpdateEnd::kUpdated;
+  // Events are handled between the days too, and must not find the form at rest there.
+  const Running running(run.display);
   for (size_t i = 0; i < entries.size(); ++i) {
     if (select) select(i);
     const UpdateEnd end = UpdateDay(run, entries[i], i + 1 < entries.size());
-    if (end == UpdateEnd::kStopped) return end;
-    if (end == UpdateEnd::kAbandoned) all = end;
+    if (end == UpdateEnd::kStopped) {
+      all = end;
+      run.display.ShowState("");
+      break;
+    }
+    if (end != UpdateEnd::kUpdated) all = UpdateEnd::kAbandoned;
     run.dialogs.Yield();
   }
   ClearTexts(run.display);

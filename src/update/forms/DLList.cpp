@@ -116,9 +116,13 @@ void DLList::UpdateDay() {
   const int selected = list1_->currentRow();
   if (running_ || selected < 0) return;
   const UpdateEnd end = UpdateOneDay(Run(), entries_, size_t(selected));
+  if (end == UpdateEnd::kStopped) {
+    ListAgain();
+    return;
+  }
   const bool last = end == UpdateEnd::kAbandoned && selected == list1_->count() - 1;
   FillList(end == UpdateEnd::kUpdated ? 0 : selected);
-  if (end != UpdateEnd::kStopped && (entries_.empty() || last)) Leave();
+  if (entries_.empty() || last) Leave();
 }
 
 void DLList::UpdateAll() {
@@ -129,9 +133,15 @@ void DLList::UpdateAll() {
     Leave();
     return;
   }
-  // Some dates may be done.
-  BuildDownloadList(services_.files, services_.settings.download, services_.dialogs, entries_);
+  ListAgain();
+}
+
+// Behind a run that stopped: what was done before is off the list.
+void DLList::ListAgain() {
+  const ListResult result = BuildDownloadList(services_.files, services_.settings.download,
+                                              services_.dialogs, entries_);
   FillList(0);
+  if (result == ListResult::kNothingWaits) Leave();
 }
 
 void DLList::RemoveDate() {
