@@ -78,7 +78,7 @@ class DayUpdate {
   UpdateEnd UpdateFromDownload();
 
  private:
-  bool WholeMarket();
+  bool WholeMarket(const WmPaths& lines);
   bool UpdateFile();
   void CheckData();
   void RemoveBlankLines();
@@ -139,15 +139,18 @@ UpdateEnd DayUpdate::UpdateFromDownload() {
   run_.display.ShowSecond("");
 
   bool good = false;
+  std::string bulletins = run_.settings.paths.CurrentDataPath;
   if (IsService(3)) {
-    if (!WmPathsComplete(ReadWmPaths(run_.files, run_.settings.paths.SystemPath))) {
+    const WmPaths lines = ReadWmPaths(run_.files, run_.settings.paths.SystemPath);
+    if (!WmPathsComplete(lines)) {
       run_.dialogs.Message(
           "Separate destination directories for Whole Market data have not been defined. Select "
           "Paths option and define ALL data directories.",
           "W/M Paths");
       return UpdateEnd::kNotBegun;
     }
-    good = WholeMarket();
+    bulletins = WithBackslash(Trim(lines[kWmAsx]));
+    good = WholeMarket(lines);
   } else {
     run_.display.ShowState("Updating ");
     if (!run_.files.CheckFile(SelectedDownloadFile_)) {
@@ -159,19 +162,13 @@ UpdateEnd DayUpdate::UpdateFromDownload() {
 
   if (!MoreToCome_) run_.display.ShowSecond(" Data files updated with " + SelectedDownloadFile_);
   if (IsService(1) || IsService(3)) {
-    if (run_.CheckBulletins) {
-      const WmPaths lines = ReadWmPaths(run_.files, run_.settings.paths.SystemPath);
-      run_.CheckBulletins(IsService(3) ? WithBackslash(lines[kWmAsx])
-                                       : run_.settings.paths.CurrentDataPath,
-                          std::string(LastOf(baseName_, 7)));
-    }
+    if (run_.CheckBulletins) run_.CheckBulletins(bulletins, std::string(LastOf(baseName_, 7)));
     UpdateSecurityDetails(run_.files, download_);
   }
   return good ? UpdateEnd::kUpdated : UpdateEnd::kAbandoned;
 }
 
-bool DayUpdate::WholeMarket() {
-  const WmPaths lines = ReadWmPaths(run_.files, run_.settings.paths.SystemPath);
+bool DayUpdate::WholeMarket(const WmPaths& lines) {
   // The first point of the whole path ends the base, even one in a folder's name.
   baseName_ = SelectedDownloadFile_.substr(0, SelectedDownloadFile_.find('.'));
   bool good = true;
