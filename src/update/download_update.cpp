@@ -93,7 +93,7 @@ class DayUpdate {
   void AddName(const DayLine& day);
   void NoTradePass();
   bool OptionLives(std::int32_t number, NameRec& rec);
-  void Step(int done, int total);
+  bool StopAsked(int done, int total);
 
   bool IsService(int service) const { return download_.DataService == service; }
   std::string_view ShownName() const { return NameOf(SelectedDownloadFile_); }
@@ -124,11 +124,10 @@ class DayUpdate {
   std::unordered_set<std::string> priceFiles_;  // "BHP.WDT" of TargetPath, upper case
 };
 
-void DayUpdate::Step(int done, int total) {
-  if (run_.display.Step(done, total)) return;
-  if (run_.dialogs.Ask("The update is not finished. Stop it ?", "Update", Buttons::kYesNo) ==
-      Answer::kYes)
-    throw Stopped();
+bool DayUpdate::StopAsked(int done, int total) {
+  return !run_.display.Step(done, total) &&
+         run_.dialogs.Ask("The update is not finished. Stop it ?", "Update", Buttons::kYesNo) ==
+             Answer::kYes;
 }
 
 UpdateEnd DayUpdate::UpdateFromDownload() {
@@ -391,7 +390,7 @@ void DayUpdate::TakeLines() {
   DayLine day;
   while (lines.Next(line)) {
     if (lines.number() <= skipLines_) continue;
-    Step(lines.number(), total);
+    if (StopAsked(lines.number(), total)) throw Stopped();
     ReadDayLine(line, OptionsRun_, day);
     if (IsService(4) && download_.VolumeDivisor != 1) day.Volume /= download_.VolumeDivisor;
     if (day.code.empty()) continue;
@@ -472,15 +471,17 @@ bool DayUpdate::OptionLives(std::int32_t number, NameRec& rec) {
   return false;
 }
 
-// Every share that did not trade gets a flat record.
+// Every share that did not trade gets a flat record. The day is off the list by now and has no
+// second pass: a run that is to stop does so behind it.
 void DayUpdate::NoTradePass() {
   run_.display.ShowFirst("");
   run_.display.ShowSecond(" Checking stocks not traded");
   run_.display.ShowState("Checking no-trades");
   const double date = Val(lastDate_);
   const auto total = std::int32_t(names_.size());
+  bool stop = false;
   for (std::int32_t n = 1; n <= total; ++n) {
-    Step(n, total);
+    if (!stop) stop = StopAsked(n, total);
     NameRec& rec = names_[size_t(n - 1)];
     run_.current.Rec = rec;
     run_.current.NameRecNo = CInt(n);
@@ -501,6 +502,7 @@ void DayUpdate::NoTradePass() {
     flat.Open = flat.High = flat.Low = flat.Close = last.Close;
     file.Append(flat);
   }
+  if (stop) throw Stopped();
 }
 
 // Shown from the first record of a run to the last.

@@ -511,6 +511,21 @@ TEST_F(DownloadUpdate, AskingToStopInTheMiddleStops) {
   EXPECT_TRUE(Waits("15SEP98.d"));
 }
 
+TEST_F(DownloadUpdate, StoppingAmongTheFlatRecordsIsDoneBehindThem) {
+  Names({Security("ORE"), Security("ZAP"), Security("OLD")});
+  for (const char* code : {"ORE", "ZAP", "OLD"}) Prices(code, {Flat("19980914", 1)});
+  Download("16SEP98.d", "ORE,19980916,1,1,1,1,1,0\n");
+  Download("15SEP98.d", "ORE,19980915,1,1,1,1,1,0\n");
+  display.stopAt = 2;  // the first share of the pass
+  dialogs.answers = {Answer::kYes};
+  EXPECT_EQ(Update(), UpdateEnd::kStopped);
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(Shown("ZAP"), "19980914 1 0; 19980915 1 0");
+  EXPECT_EQ(Shown("OLD"), "19980914 1 0; 19980915 1 0");
+  EXPECT_TRUE(Waits("15SEP98.dX"));
+  EXPECT_TRUE(Waits("16SEP98.d"));
+}
+
 TEST_F(DownloadUpdate, NoToStoppingGoesOn) {
   display.stopAt = 1;
   dialogs.answers = {Answer::kNo};

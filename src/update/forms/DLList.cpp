@@ -200,7 +200,7 @@ void DLList::SetRunning(bool running) {
 }
 
 bool DLList::Step(int done, int total) {
-  if (shown_.elapsed() >= kRefreshMs || done == 1) {
+  if (shown_.elapsed() >= kRefreshMs) {
     bar_->setRange(0, total);
     bar_->setValue(done);
     ShowTexts();
