@@ -207,10 +207,13 @@ bool DayUpdate::UpdateFile() {
   places_.clear();
   priceFiles_.clear();
   names_ = ReadNames(run_.files, TargetPath_);
+  places_.reserve(names_.size());
   for (size_t i = 0; i < names_.size(); ++i)
     places_.try_emplace(std::string(Trim(names_[i].Code.trimmed())), i);
   // Not the sorted listing: thousands of names are wanted in no order.
-  for (const std::string& name : run_.files.io().List(run_.files.HostPath(TargetPath_)))
+  const auto listed = run_.files.io().List(run_.files.HostPath(TargetPath_));
+  priceFiles_.reserve(listed.size());
+  for (const std::string& name : listed)
     if (std::string upper = UCase(name); upper.ends_with(".WDT"))
       priceFiles_.insert(std::move(upper));
   run_.current.NameCount = CInt(double(names_.size()));
