@@ -217,7 +217,7 @@ bool DayUpdate::UpdateFile() {
     if (std::string upper = UCase(name); upper.ends_with(".WDT"))
       priceFiles_.insert(std::move(upper));
   run_.current.NameCount = CInt(double(names_.size()));
-  run_.display.ShowFirst(" Updating  " + std::string(LastOf(SelectedDownloadFile_, 11)));
+  run_.display.ShowFirst(" Updating  " + std::string(LastOf(ShownName(), 11)));
 
   CheckData();
   if (UpdateMode_ == kModeAbandon) {

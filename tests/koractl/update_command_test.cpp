@@ -213,9 +213,9 @@ TEST_F(UpdateCommand, FortyRealDaysComeOutAsAnImportOfTheSameRows) {
         const Words bars{"bars", code, "--period", period};
         EXPECT_EQ(Out(bars, one), Out(bars, two)) << code;
       }
-      const std::string script = Out({"chart", code, "--out", "-"}, one);
-      EXPECT_GT(script.size(), 5000u) << code;
-      EXPECT_EQ(script, Out({"chart", code, "--out", "-"}, two)) << code;
+      const std::string drawn = Out({"chart", code, "--out", "-"}, one);
+      EXPECT_GT(drawn.size(), 5000u) << code;
+      EXPECT_EQ(drawn, Out({"chart", code, "--out", "-"}, two)) << code;
     }
   }
 }

@@ -35,6 +35,8 @@ TEST_F(DownloadUpdate, AppendsARecordAndTakesTheFileOffTheList) {
   EXPECT_TRUE(entries.empty());
   EXPECT_TRUE(dialogs.said.empty());
   EXPECT_FALSE(display.running);
+  // No folder before the name, though the last 11 characters of the path have one.
+  EXPECT_EQ(display.firsts.front(), " Updating  15SEP98.d");
 }
 
 TEST_F(DownloadUpdate, GivesANewSecurityANameRecord) {
