@@ -6,6 +6,8 @@ kora_packages=(
   libcli11-dev libgtest-dev libbenchmark-dev
   fonts-liberation
 )
+# For tests that are left out without them: those of a print queue.
+test_packages=(cups printer-driver-cups-pdf)
 
 # Installs what is missing of the packages named. Nothing is asked, and nothing is looked up
 # where all are there.

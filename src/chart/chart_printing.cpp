@@ -247,9 +247,12 @@ void SavePrintSetup(SettingsFile& file, Settings& settings, const PrintSetup& se
 }
 
 ChartFrame FrameOnPage(const Printer& printer, const PrintSetup& setup, ChartSize chart) {
+  // The product is a 32-bit float as its factors are, so that 15 times 0.9 is the half that it
+  // looks and rounds to even.
+  const auto scaled = [&](double twips) { return CLng(double(float(twips) * setup.PrintEnlarge)); };
   ChartFrame frame;
-  frame.SX = CLng(printer.TwipsPerPixelX() * double(setup.PrintEnlarge));
-  frame.SY = CLng(printer.TwipsPerPixelY() * double(setup.PrintEnlarge));
+  frame.SX = scaled(printer.TwipsPerPixelX());
+  frame.SY = scaled(printer.TwipsPerPixelY());
   frame.width = CLng(chart.width * frame.SX);
   frame.height = CLng(chart.height * frame.SY);
   frame.PrintLeft = setup.PrintLeft;

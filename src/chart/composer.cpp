@@ -13,6 +13,7 @@
 #include "base/text.h"
 #include "chart/bar_marks.h"
 #include "chart/chart_canvas.h"
+#include "chart/chart_failure.h"
 #include "chart/price_averages.h"
 #include "chart/scale_drawing.h"
 
@@ -127,12 +128,7 @@ void Composer::LoadBars() {
     LoadChartBars(*file_, request_.ChartPeriod, request_.VolumeOption, request_.Name.RecType,
                   chart_.Bars);
   } catch (const RunTimeError&) {
-    try {
-      if (const std::int16_t record = chart_.Bars.CurrentDataRec; record != 0)
-        barDate_ = FromAnsi(file_->Read(record).RecDate.trimmed());
-    } catch (const RunTimeError&) {
-      // The first failure is the one to tell, without its date.
-    }
+    barDate_ = DateForMessage(*file_, chart_.Bars.CurrentDataRec);
     throw;
   }
   chart_.Bars.CurrentDataRec = 0;
@@ -531,48 +527,12 @@ void Composer::AdvanceSlot() {
 }
 
 std::string Composer::FailureText(int number, const std::string& detail) const {
-  const std::int16_t record = chart_.Bars.CurrentDataRec;
-  switch (number) {
-    case 0:
-    case kBadCall:
-    case kOverflow: {
-      std::string text = "There is a problem with the data for " + chart_.DataFile + "\n";
-      if (record != 0) text += " at Rec Number (" + Str(std::int32_t(record)) + ") " + barDate_;
-      else text += " at date (" + barDate_ + ") ";
-      text += request_.Name.RecType == kAdvanceDecline
-                  ? "\nUse Check advance/decline totals procedure to adjust base to a higher "
-                    "positive number."
-                  : "\nUse View/Modify Data procedure to correct.";
-      return text;
-    }
-    case kOutOfMemory:
-    case kOutOfTextSpace:
-    case kOutOfStack:
-      return "There appears to be a memory problem\nOut of memory\nExit Windows then retry";
-    case kBadFileName:
-    case kFileNotFound:
-    case kBadRecordNumber:
-    case kPathAccess:
-    case kPathNotFound:
-      return "There is a problem with " + chart_.DataFile + " Cannot find or open";
-    case kInvalidValue:
-      if (const std::string font = UCase(services_.price.Font().name); !font.empty())
-        return "There is a problem with the Font you have selected for " + font +
-               ". Select another Font and try again - Try MS Sans Serif or MS Serif if available";
-      return "There is a possibly a problem with a Font you have selected. Select another Font "
-             "and try again - Try MS Sans Serif or Arial if available";
-    case kNoPicture:
-      return "There is not enough memory to complete all pages display. Please ring KORA if this "
-             "message appears often.";
-    default: {
-      std::string text =
-          "There is an unexpected error No. " + Str(std::int32_t(number)) + "\n" + detail;
-      if (record != 0)
-        text += " Check data at Record number " + Str(std::int32_t(record)) +
-                " using View/Modify to check and correct.";
-      return text;
-    }
-  }
+  return ChartFailureText(number, detail,
+                          {.file = chart_.DataFile,
+                           .RecType = request_.Name.RecType,
+                           .record = chart_.Bars.CurrentDataRec,
+                           .date = barDate_,
+                           .font = services_.price.Font().name});
 }
 
 }  // namespace

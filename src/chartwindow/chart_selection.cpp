@@ -599,6 +599,13 @@ void ChartSelection::TickAverage(int which, bool ticked) {
   }
 }
 
+void ChartSelection::AveragesChanged() {
+  const ChartSettings& charts = services_.settings.charts;
+  TickAverage(1, charts.AvOne);
+  TickAverage(2, charts.AvTwo);
+  ShowAverages();
+}
+
 bool ChartSelection::ChooseBands(int index) {
   if (index < 0 || index > 2) return false;
   view_.Combo3 = index;

@@ -128,6 +128,8 @@ class ChartSelection {
   bool ChooseBands(int index);
   void ChooseOscillator(int index);
   void TickAverage(int which, bool ticked);  // 1 or 2
+  // After the settings' averages were switched or saved elsewhere: on or off, and their periods.
+  void AveragesChanged();
   void TypeSpacing(std::string_view text);   // as typed, no rule yet
   void LeaveSpacing();
   void StepSpacing(bool up);

@@ -106,12 +106,4 @@ DefaultsSaved SaveChartDefaults(SettingsFile& ini, const Files& files, Dialogs& 
   return DefaultsSaved::kAll;
 }
 
-std::array<AverageCaption, 2> AverageCaptions(const ChartSettings& charts,
-                                              const std::string& chartPeriod,
-                                              const ChartColours& colours) {
-  const bool daily = chartPeriod == "A";
-  return {{{Text(daily ? charts.Av1D : charts.Av1W), colours[charts.AvOne ? kAverage2 : 0]},
-           {Text(daily ? charts.Av2D : charts.Av2W), colours[charts.AvTwo ? kAverage3 : 0]}}};
-}
-
 }  // namespace kora

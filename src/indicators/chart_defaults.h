@@ -45,14 +45,4 @@ enum class DefaultsSaved {
 DefaultsSaved SaveChartDefaults(SettingsFile& ini, const Files& files, Dialogs& dialogs,
                                 const ChartDefaults& typed, Settings& settings);
 
-// How the chart selection shows an average: its period for the chart period on show, in its own
-// colour when it is on and in black when it is off.
-struct AverageCaption {
-  std::string text;
-  std::int32_t colour = 0;
-};
-std::array<AverageCaption, 2> AverageCaptions(const ChartSettings& charts,
-                                              const std::string& chartPeriod,
-                                              const ChartColours& colours);
-
 }  // namespace kora

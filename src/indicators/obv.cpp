@@ -74,7 +74,7 @@ void ShowOBV(OscHost& host) {
     for (bar = 1; bar <= bars.BarCount; ++bar) {
       const std::int32_t total = At(series.totals, bar);
       if (total == 0) continue;
-      const double y = base - (double(total) - series.lowest) / scale;
+      const double y = CInt(base - (double(total) - series.lowest) / scale);
       line.To(panel.BarX(bar), y, panel.colour(y < line.y() ? kOscUp : kOscDown), ++points > 2);
     }
   };

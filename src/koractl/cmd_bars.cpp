@@ -17,32 +17,44 @@ struct BarsOptions {
   std::optional<std::int32_t> first, last;
 };
 
-void LoadSlice(Run& run, const BarsOptions& options, ChartBars& bars) {
-  const PriceFile file(run.session.files, run.session.current.CurrentDataFile);
+constexpr std::string_view kTitle = "Chart Display";
+
+void CheckSlice(Run& run, const BarsOptions& options, std::int32_t count, ChartBars& bars) {
   const std::string name = run.DataFileName();
-  if (file.count() == 0) run.Abandon("No Data for " + name, "Chart Display");
+  if (count == 0) run.Abandon("No Data for " + name, kTitle);
   const std::int32_t first = options.first.value_or(1);
-  const std::int32_t last = options.last.value_or(file.count());
-  if (first < 1 || first > last || last > file.count())
+  const std::int32_t last = options.last.value_or(count);
+  if (first < 1 || first > last || last > count)
     run.Abandon("There are no records " + Str(first) + " to " + Str(last) + " in " + name +
-                    ", which has " + Str(file.count()),
-                "Chart Display");
+                    ", which has " + Str(count),
+                kTitle);
   bars.FirstDataRec = CInt(first);
   bars.LastDataRec = CInt(last);
-  LoadChartBars(file, options.period, options.volume == "on", run.session.current.Rec.RecType,
-                bars);
 }
 
+void LoadSlice(Run& run, const BarsOptions& options, ChartBars& bars) {
+  const std::int16_t kind = run.session.current.Rec.RecType;
+  ChartFailure at{.file = run.DataFileName(), .RecType = kind};
+  try {
+    const PriceFile file(run.session.files, run.session.current.CurrentDataFile);
+    CheckSlice(run, options, file.count(), bars);
+    try {
+      LoadChartBars(file, options.period, options.volume == "on", kind, bars);
+    } catch (const RunTimeError&) {
+      at.record = bars.CurrentDataRec;
+      at.date = DateForMessage(file, at.record);
+      throw;
+    }
+  } catch (const RunTimeError& e) {
+    run.AbandonFile(e, at, kTitle);
+  }
+}
 int Bars(const CommandLine& line, const BarsOptions& options) {
   Run run(line);
   run.Open();
   run.Locate(options.code);
   ChartBars bars;
-  try {
-    LoadSlice(run, options, bars);
-  } catch (const RunTimeError& e) {
-    run.AbandonFile(e, run.DataFileName(), bars.CurrentDataRec);
-  }
+  LoadSlice(run, options, bars);
   Table table("Bar Date Open High Low Close Volume SourceRec");
   for (std::int32_t i = 0; i <= bars.BarCount; ++i) {
     const ChartBar& bar = bars[size_t(i)];

@@ -16,7 +16,9 @@ void AddDemo(CLI::App& app, CommandLine& line) {
       ->check(CLI::Range(1, 40));
   command->add_option("--seed", options->seed, "The same seed gives the same bytes")
       ->capture_default_str()
-      ->check(CLI::NonNegativeNumber);
+      ->check([](const std::string& text) {
+        return text.starts_with('-') ? "The seed " + text + " is negative" : std::string();
+      });
   command->callback([&line, options] {
     line.run = [&line, options] {
       Run run(line);

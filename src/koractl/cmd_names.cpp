@@ -14,7 +14,7 @@ int Names(const CommandLine& line) {
     if (!run.session.files.CheckFile(path)) throw RunTimeError(kFileNotFound);
     names = ReadNames(run.session.files, run.dataPath());
   } catch (const RunTimeError& e) {
-    run.AbandonFile(e, "Names.dat");
+    run.AbandonFile(e, {.file = "Names.dat"});
   }
   Table table(
       "Rec Status Code RecType Name OtherDetails Base Top PFInc MinMove BandUp BandDown "

@@ -22,7 +22,7 @@ int Prices(const CommandLine& line, const std::string& code) {
       table.Number(float(rec.AdjFactor)).Text(rec.AdjDesc.raw()).EndRow();
     }
   } catch (const RunTimeError& e) {
-    run.AbandonFile(e, run.DataFileName());
+    run.AbandonFile(e, {.file = run.DataFileName()});
   }
   table.Print();
   return kDone;

@@ -3,7 +3,7 @@
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "chart/chart_scale.h"
-#include "koractl/command.h"
+#include "koractl/run.h"
 #include "koractl/table.h"
 
 namespace kora {
@@ -19,7 +19,8 @@ float Price(const char* option, const std::string& text) {
   return *value;
 }
 
-int Scale(const ScaleOptions& options) {
+int Scale(const CommandLine& line, const ScaleOptions& options) {
+  Run(line).Open();
   const float high = Price("--high", options.high);
   const float low = Price("--low", options.low);
   ChartScale scale;
@@ -49,7 +50,7 @@ void AddScale(CLI::App& app, CommandLine& line) {
   auto* top = command->add_option("--top", options->top, "Manual scale top")->type_name("T");
   base->needs(top);
   top->needs(base);
-  command->callback([&line, options] { line.run = [options] { return Scale(*options); }; });
+  command->callback([&line, options] { line.run = [&line, options] { return Scale(line, *options); }; });
 }
 
 }  // namespace kora

@@ -46,6 +46,9 @@ int main(int argc, char** argv) {
   } catch (const CLI::CallForHelp& e) {
     return app.exit(e);
   } catch (const CLI::ParseError& e) {
+    const auto strange = app.remaining();
+    if (app.get_subcommands().empty() && !strange.empty() && strange.front()[0] != '-')
+      return Usage(app, "There is no command \"" + strange.front() + "\"");
     return Usage(app, e.what());
   }
   if (answer == "yes") line.answer = Answer::kYes;

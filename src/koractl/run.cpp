@@ -2,7 +2,6 @@
 
 #include <filesystem>
 
-#include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "shell/program_arguments.h"
@@ -46,7 +45,7 @@ void Run::Locate(const std::string& code) {
   try {
     if (!LocateCurrentCode(session.files, dataPath(), dialogs, session.current)) throw Abandoned();
   } catch (const RunTimeError& e) {
-    AbandonFile(e, "Names.dat");
+    AbandonFile(e, {.file = "Names.dat"});
   }
 }
 
@@ -54,27 +53,9 @@ std::string Run::DataFileName() const {
   return CodeFileName(session.current.Rec.Code.trimmed(), ".WDT");
 }
 
-void Run::AbandonFile(const RunTimeError& error, std::string_view file, std::int32_t record) {
-  std::string text;
-  switch (error.number()) {
-    case kBadCall:
-    case kOverflow:
-      text = "There is a problem with the data for " + std::string(file);
-      if (record != 0) text += "\n at Rec Number (" + Str(record) + ") ";
-      text += "\nUse View/Modify Data procedure to correct.";
-      break;
-    case kBadFileName:
-    case kFileNotFound:
-    case kBadRecordNumber:
-    case kPathAccess:
-    case kPathNotFound:
-      text = "There is a problem with " + std::string(file) + " Cannot find or open";
-      break;
-    default:
-      text = "There is an unexpected error No. " + Str(std::int32_t(error.number())) + "\n" +
-             error.what();
-  }
-  Abandon(text, "KORA");
+void Run::AbandonFile(const RunTimeError& error, const ChartFailure& at,
+                      std::string_view title) {
+  Abandon(ChartFailureText(error.number(), error.what(), at), title);
 }
 
 }  // namespace kora

@@ -3,6 +3,7 @@
 #include <string>
 #include <string_view>
 
+#include "chart/chart_failure.h"
 #include "koractl/command.h"
 #include "platform/headless/console_dialogs.h"
 #include "shell/session.h"
@@ -31,10 +32,9 @@ struct Run {
   void Locate(const std::string& code);
   // "ORE.WDT" of the security found.
   std::string DataFileName() const;
-  // Ends the operation in the words that a chart has for a failure with its price file.
-  // `record`: the record being read, 0 none.
-  [[noreturn]] void AbandonFile(const RunTimeError& error, std::string_view file,
-                                std::int32_t record = 0);
+  // Ends the operation in the words that a chart has for a failure with a file.
+  [[noreturn]] void AbandonFile(const RunTimeError& error, const ChartFailure& at,
+                                std::string_view title = "KORA");
 };
 
 }  // namespace kora

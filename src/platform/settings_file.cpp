@@ -30,6 +30,14 @@ bool IsName(std::string_view name, std::string_view breaks) {
          name.find_first_of(std::string_view("\r\n\0", 3)) == std::string_view::npos;
 }
 
+// Folders are read with a backslash at their end, whether it stands there or not.
+bool SameValue(std::string_view a, std::string_view b) {
+  const auto bare = [](std::string_view v) {
+    return v.ends_with('\\') ? v.substr(0, v.size() - 1) : v;
+  };
+  return EqualNoCase(bare(a), bare(b));
+}
+
 }  // namespace
 
 SettingsFile::SettingsFile(const Files& files, std::string path)
@@ -105,6 +113,9 @@ bool SettingsFile::PutSetting(std::string_view section, std::string_view key,
   Load();
   if (!readable_) return false;
   const std::string mapKey = MapKey(sectionName, keyName);
+  if (const auto o = overrides_.find(mapKey);
+      o != overrides_.end() && SameValue(o->second, OneLine(value)))
+    return true;
   const std::string line = keyName + "=" + OneLine(value);
   if (const auto it = index_.find(mapKey); it != index_.end()) {
     if (lines_[it->second] == line) return true;

@@ -39,7 +39,8 @@ class SettingsFile {
   // be lost), or the section or key would not read back as it is ("a=b", "[x", an empty one).
   bool PutSetting(std::string_view section, std::string_view key, std::string_view value);
 
-  // A value for this run only: read in place of the file's, never written.
+  // A value for this run only, read in place of the file's. Putting it back, as a save of all
+  // settings does, writes nothing; another value is the user's own and is written.
   void Override(std::string_view section, std::string_view key, std::string_view value);
 
   // While a Batch lives, writes are gathered and the file is replaced once, at its end.

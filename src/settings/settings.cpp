@@ -58,11 +58,7 @@ void ReadDownload(const SettingsFile& file, DownloadSettings& download) {
   download.InternetAccess = section.Flag("Internet Access");
   download.UpdateAll = section.Flag("UpdateAll", true);
   download.NoWarrants = section.Flag("NoWarrants");
-  if (download.DataService == 1 || download.DataService == 3) {
-    download.ServiceSystem = section.Text("System");
-    download.ServiceIn = section.Text("In");
-    download.ServiceOut = section.Text("Out");
-  }
+  ReadServiceFolders(file, download);
   download.VolumeDivisor = 1;
   const double divisor = section.Number("Volume divisor");
   for (const std::int32_t allowed : {10, 100, 1000, 10000})
@@ -165,6 +161,14 @@ void WritePaths(SettingsFile& file, const Paths& paths) {
 }
 
 }  // namespace
+
+void ReadServiceFolders(const SettingsFile& file, DownloadSettings& download) {
+  const Section section(file, "Download");
+  const bool has = download.DataService == 1 || download.DataService == 3;
+  download.ServiceSystem = has ? section.Text("System") : "";
+  download.ServiceIn = has ? section.Text("In") : "";
+  download.ServiceOut = has ? section.Text("Out") : "";
+}
 
 std::int16_t SettingCInt(const std::string& text) {
   try {

@@ -157,6 +157,9 @@ CommandWords ParseCommandWords(std::string_view commandLine);
 // folders that were never kept are those of SetDefaultPaths on the drive of System.
 bool ReadPaths(SettingsFile& file, const Files& files, Dialogs& dialogs, Settings& settings);
 
+// The folders of the data service: services 1 and 3 have them, of others they are empty.
+void ReadServiceFolders(const SettingsFile& file, DownloadSettings& download);
+
 // Writes the folders, DataService, DLPath and the drive.
 void SavePaths(SettingsFile& file, Settings& settings);
 

@@ -100,4 +100,11 @@ void TextPrintOut::End() {
   printer_.EndDoc();
 }
 
+void PrintTable(Printer& printer, const FontSettings& fonts, const PageSettings& page,
+                const TextTable& table) {
+  TextPrintOut out(printer, fonts, page, table.layout);
+  for (const std::vector<std::string>& row : table.rows) out.Line(row);
+  out.End();
+}
+
 }  // namespace kora

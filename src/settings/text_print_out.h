@@ -67,4 +67,13 @@ class TextPrintOut {
   bool ended_ = false;
 };
 
+// A list that is there as a whole.
+struct TextTable {
+  TextPrintLayout layout;
+  std::vector<std::vector<std::string>> rows;  // UTF-8
+};
+// Prints it as one document. Errors as above; nothing is sent then.
+void PrintTable(Printer& printer, const FontSettings& fonts, const PageSettings& page,
+                const TextTable& table);
+
 }  // namespace kora

@@ -1,5 +1,7 @@
 #include "update/download_settings.h"
 
+#include <algorithm>
+
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
@@ -9,7 +11,10 @@ namespace kora {
 namespace {
 
 constexpr const char* kSection = "Download";
-constexpr std::uint64_t kLargestList = 16u << 20;
+constexpr std::uint64_t kLargestList = 1u << 20;
+constexpr std::uint64_t kLargestUpdateList = 4u << 20;
+constexpr size_t kMostUpdateRows = 100'000;
+constexpr size_t kLongestFolder = 255;
 
 constexpr ServiceEntry kServices[] = {
     {"KORA/Tarvo ( Mainfiles Only) ", 1},
@@ -29,14 +34,21 @@ constexpr FormatEntry kFormats[] = {
     {"yyyymmdd.d       (eg 19980915.d", "YYYYMMDD.D"},
 };
 
-// Line `number` of a small text file, trimmed; empty when it can't be had.
-std::string LineOf(const Files& files, const std::string& path, int number) {
+bool IsControl(char c) { return static_cast<unsigned char>(c) < 0x20; }
+
+// The folder on line `number` of a small text file; empty when none can be had.
+std::string FolderOnLine(const Files& files, const std::string& path, int number) {
   try {
     const std::string text = files.ReadAll(path, kLargestList);
     LineReader lines(text);
     std::string_view line;
-    while (lines.Next(line))
-      if (lines.number() == number) return FromAnsi(Trim(line));
+    while (lines.Next(line)) {
+      if (lines.number() != number) continue;
+      const std::string_view folder = Trim(line);
+      const bool odd = folder.size() > kLongestFolder ||
+                       std::any_of(folder.begin(), folder.end(), IsControl);
+      return odd ? std::string() : FromAnsi(folder);
+    }
   } catch (const RunTimeError&) {
     // Another program's file: without it there is nothing to propose.
   }
@@ -54,12 +66,20 @@ bool PrepareFolders(const Files& files, std::array<std::string, 6>& folders,
     }
   }
   for (const std::string& folder : folders) {
-    if (files.CheckFile(folder)) continue;
+    if (files.IsFolder(folder)) continue;
     const std::string text = "Directory " + folder + std::string(question);
     if (dialogs.Ask(text, "Create Directory", Buttons::kYesNo) == Answer::kYes)
       files.MakeFolder(folder);
   }
   return true;
+}
+
+// A text of one field of a list: what would end the field or the line becomes a blank.
+std::string AsField(std::string_view text, bool last) {
+  std::string out = ToAnsi(text);
+  for (char& c : out)
+    if (IsControl(c) || (c == ',' && !last)) c = ' ';
+  return std::string(Trim(out));
 }
 
 std::array<std::string, 6> Copied(std::span<const std::string, 6> folders) {
@@ -141,6 +161,14 @@ bool SaveWizardFolders(const Files& files, const std::string& systemPath,
   return true;
 }
 
+LocateCase WizardLocate(const WmPaths& lines, int index, const Paths& paths) {
+  static constexpr const char* kPurposes[] = {"ASX stocks",    "Aust Indices",       "SFE Futures",
+                                              "Overseas Data", "Put / Call Options", "Extra stocks"};
+  const auto at = size_t(index);
+  const std::string folder = WizardFolders(lines).at(at);
+  return {kPurposes[at], folder.size() > 2 ? folder : paths.CurrentDataPath};
+}
+
 std::array<bool, 6> WizardTicks(const SettingsFile& ini) {
   std::array<bool, 6> ticks{};
   const std::string text = ini.GetSetting(kSection, "DLWiz");
@@ -180,14 +208,20 @@ std::string ProposedDownloadFolder(const Files& files, std::int16_t DataService,
   std::string folder;
   switch (DataService) {
     case 2:
-      folder = UCase(LineOf(files, systemPath + "BdaPaths.Dat", 3));
+      folder = UCase(FolderOnLine(files, systemPath + "BdaPaths.Dat", 3));
       return folder.empty() ? drive + "\\bda32\\koradata\\" : WithBackslash(folder);
     case 4: return drive + "\\NetData\\";
     case 5:
-      folder = LineOf(files, systemPath + "AlSystem.lst", 4);
+      folder = FolderOnLine(files, systemPath + "AlSystem.lst", 4);
       return folder.empty() ? drive + "\\NetData\\" : WithBackslash(folder);
     default: return drive + "\\korawin\\download\\Out\\";
   }
+}
+
+std::string FormatToStore(std::string_view InternetDLfmt) {
+  if (Trim(InternetDLfmt).empty()) return "ddMMMyy.d";
+  const std::string_view shown = kFormats[FormatIndex(InternetDLfmt)].stored;
+  return std::string(EqualNoCase(shown, InternetDLfmt) ? InternetDLfmt : shown);
 }
 
 std::optional<std::int32_t> VolumeDivisorOf(std::string_view text) {
@@ -207,6 +241,7 @@ bool SaveServiceChoice(const ServiceChoice& choice, SettingsFile& ini, DownloadS
   download.DLPath = path;
   download.InternetDLfmt = download.DataService == 4 ? choice.InternetDLfmt : "";
   download.VolumeDivisor = choice.VolumeDivisor;
+  ReadServiceFolders(ini, download);
   const SettingsFile::Batch batch(ini);
   ini.PutSetting(kSection, "DataService", Str(std::int32_t(download.DataService)));
   ini.PutSetting(kSection, "DLPath", download.DLPath);
@@ -220,7 +255,7 @@ std::string UpdateListFile(const std::string& systemPath) { return systemPath + 
 std::vector<UpdateRow> ReadUpdateList(const Files& files, const std::string& systemPath) {
   std::vector<UpdateRow> rows;
   if (!files.CheckFile(UpdateListFile(systemPath))) return rows;
-  const std::string text = files.ReadAll(UpdateListFile(systemPath), kLargestList);
+  const std::string text = files.ReadAll(UpdateListFile(systemPath), kLargestUpdateList);
   LineReader lines(text);
   std::string_view line;
   while (lines.Next(line)) {
@@ -228,11 +263,13 @@ std::vector<UpdateRow> ReadUpdateList(const Files& files, const std::string& sys
     UpdateRow row;
     row.code = UCase(Trim(fields[0]));
     if (row.code.empty()) continue;
+    if (rows.size() == kMostUpdateRows) throw RunTimeError(kOutOfMemory);
     if (fields.size() > 1) {
       const double category = Val(fields[1]);
       row.category = category >= 0 && category <= 99 ? CInt(category) : std::int16_t(0);
     }
-    if (fields.size() > 2) row.name = FromAnsi(Trim(fields[2]));
+    // The name is the last field, and may have commas of its own.
+    if (fields.size() > 2) row.name = FromAnsi(Trim(line.substr(size_t(fields[2].data() - line.data()))));
     rows.push_back(std::move(row));
   }
   return rows;
@@ -248,15 +285,17 @@ bool SaveUpdateList(const Files& files, const std::string& systemPath,
                     DownloadSettings& download, Dialogs& dialogs) {
   std::string text;
   for (const UpdateRow& row : rows) {
-    const std::string code = UCase(Trim(row.code));
+    const std::string code = UCase(AsField(row.code, false));
     if (code.empty()) continue;
     const bool inRange = row.category >= 0 && row.category <= 99;
-    text += ToAnsi(code) + "," + Str(std::int32_t(inRange ? row.category : 0)) + "," +
-            ToAnsi(row.name) + "\r\n";
+    text += code + "," + Str(std::int32_t(inRange ? row.category : 0)) + "," +
+            AsField(row.name, true) + "\r\n";
   }
-  const std::string path = UpdateListFile(systemPath);
+  const std::string path = UpdateListFile(systemPath), backup = systemPath + "Update.Bak";
   try {
-    files.Rename(path, systemPath + "Update.Bak");
+    // The old list stays in its place until the new one replaces it.
+    if (text.empty()) files.Rename(path, backup);
+    else files.WriteAll(backup, files.ReadAll(path));
   } catch (const RunTimeError&) {
     // There was no list yet, or its copy has to wait for the next save.
   }

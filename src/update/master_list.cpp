@@ -16,14 +16,20 @@ namespace {
 
 constexpr unsigned char kFirstInTable = 48;
 constexpr std::uint64_t kLargestSource = 64u << 20;
+constexpr std::uint64_t kLargestMaster = 16u << 20;  // 270,000 codes
 constexpr size_t kLongestName = 34;
 constexpr size_t kLongestDetails = 14;
 constexpr const char* kMakeTitle = "KORA Master List";
 
 std::string IndexFile(const std::string& systemPath) { return systemPath + "KoraName.idx"; }
 
-bool InTable(unsigned char c, const MasterTable& table) {
-  return c >= kFirstInTable && c < kFirstInTable + table.size();
+// Digits and letters go through the table; what lies between them stays.
+bool IsScrambled(unsigned char c) {
+  return (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z');
+}
+
+unsigned char Readable(unsigned char c, const MasterTable& table) {
+  return IsScrambled(c) ? table[c - kFirstInTable] : c;
 }
 
 // Characters of a record, numbered from 1 with the code.
@@ -33,6 +39,17 @@ std::string_view Characters(const MasterRec& rec, size_t from, size_t to) {
 
 std::string Field(const MasterRec& rec, size_t from, size_t to) {
   return std::string(Trim(Characters(rec, from, to)));
+}
+
+// A number of a record; empty where its characters are none, as those of a foreign file.
+std::string Digits(std::string_view text) {
+  const bool all = text.find_first_not_of("0123456789") == std::string_view::npos;
+  return all ? std::string(text) : std::string();
+}
+
+std::string NumberAs(std::string_view text, std::string_view pattern) {
+  const std::string digits = Digits(text);
+  return digits.empty() ? digits : Format(Val(digits), pattern);
 }
 
 // What is wrong with a line of a plain list.
@@ -75,10 +92,14 @@ MasterRec RecordOf(std::string_view line) {
 void Scramble(MasterRec& rec, const MasterTable& table) {
   for (char& c : rec.Rest.bytes) {
     const auto wanted = static_cast<unsigned char>(c);
-    if (!InTable(wanted, table)) continue;
-    const auto at = std::find(table.begin(), table.end(), wanted);
-    if (at == table.end()) throw BadLine("a character that KoraName.Tab does not have");
-    c = char(kFirstInTable + (at - table.begin()));
+    if (!IsScrambled(wanted)) continue;
+    unsigned char from = kFirstInTable;
+    while (from < kFirstInTable + table.size() &&
+           !(IsScrambled(from) && table[from - kFirstInTable] == wanted))
+      ++from;
+    if (from == kFirstInTable + table.size())
+      throw BadLine("a character that KoraName.Tab does not have");
+    c = char(from);
   }
 }
 
@@ -97,9 +118,12 @@ MasterTable LoadMasterTable(const Files& files, const std::string& systemPath) {
   size_t count = 0;
   while (lines.Next(line)) {
     if (Trim(line).empty()) continue;
+    if (count == table.size()) throw RunTimeError(kBadCall);
     const double value = Val(line);
-    if (count == table.size() || value < 32 || value > 255) throw RunTimeError(kBadCall);
-    table[count++] = static_cast<unsigned char>(CInt(value));
+    if (const size_t at = count++; IsScrambled(static_cast<unsigned char>(kFirstInTable + at))) {
+      if (!(value >= 32 && value <= 255)) throw RunTimeError(kBadCall);
+      table[at] = static_cast<unsigned char>(CInt(value));
+    }
   }
   if (count != table.size()) throw RunTimeError(kBadCall);
   return table;
@@ -108,12 +132,13 @@ MasterTable LoadMasterTable(const Files& files, const std::string& systemPath) {
 std::vector<MasterRec> ReadMasterRecords(const Files& files, const std::string& systemPath) {
   if (!files.CheckFile(MasterFile(systemPath))) return {};
   const MasterTable table = LoadMasterTable(files, systemPath);
-  auto records = RecordFile<MasterRec>(files, MasterFile(systemPath)).ReadAll();
+  const RecordFile<MasterRec> file(files, MasterFile(systemPath));
+  if (std::uint64_t(file.count()) * sizeof(MasterRec) > kLargestMaster)
+    throw RunTimeError(kOutOfMemory);
+  auto records = file.ReadAll();
   if (records.size() < 2) return {};
   for (MasterRec& rec : records)
-    for (char& c : rec.Rest.bytes)
-      if (const auto u = static_cast<unsigned char>(c); InTable(u, table))
-        c = char(table[size_t(u - kFirstInTable)]);
+    for (char& c : rec.Rest.bytes) c = char(Readable(static_cast<unsigned char>(c), table));
   return records;
 }
 
@@ -188,9 +213,9 @@ bool UpdateFromMaster(const Files& files, const std::string& systemPath,
     const std::pair<std::string*, std::string> items[] = {
         {&row.name, entry.name},
         {&row.details, entry.details},
-        {&row.type, entry.type},
-        {&row.category, entry.category.empty() ? "" : Format(Val(entry.category), "#0")},
-        {&row.IndClass, entry.IndClass.empty() ? "" : Format(Val(entry.IndClass), "000")}};
+        {&row.type, Digits(entry.type)},
+        {&row.category, NumberAs(entry.category, "#0")},
+        {&row.IndClass, NumberAs(entry.IndClass, "000")}};
     for (size_t i = 0; i < keep.size(); ++i) {
       const auto& [item, master] = items[i];
       if (!master.empty() && !(keep[i] && !Trim(*item).empty())) *item = master;

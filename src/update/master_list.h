@@ -26,12 +26,13 @@ struct MasterRec {
 #pragma pack(pop)
 static_assert(sizeof(MasterRec) == 62);
 
-// What characters 48 to 122 of a scrambled record stand for; others stand for themselves.
+// What characters 48 to 122 of a scrambled record stand for. Only digits and letters go through
+// it: others, those between them too, stand for themselves.
 using MasterTable = std::array<unsigned char, 75>;
 
 // Each character for itself, unless KoraName.Tab stands beside the list: 75 lines, each the
-// decimal code of what the next character from 48 on stands for. Error 5 for a file that has
-// anything else.
+// decimal code of what the next character from 48 on stands for; those of no digit and no
+// letter are not looked at. Error 5 for a file that has anything else.
 MasterTable LoadMasterTable(const Files& files, const std::string& systemPath);
 
 struct MasterEntry {
@@ -54,7 +55,7 @@ struct MasterList {
 
 std::string MasterFile(const std::string& systemPath);
 
-// The records alone; fewer than 2 count as none.
+// The records alone; fewer than 2 count as none. Error 7 beyond 16 MB.
 std::vector<MasterRec> ReadMasterRecords(const Files& files, const std::string& systemPath);
 // Both files. Raises where the list or its index can't be read; error 5 for an index without
 // 26 numbers.

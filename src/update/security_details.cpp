@@ -3,13 +3,15 @@
 #include <algorithm>
 #include <vector>
 
+#include "base/file_set.h"
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 
 namespace kora {
 namespace {
 
-constexpr std::uint64_t kLargestDetails = 256u << 20;
+constexpr std::uint64_t kLargestDetails = 64u << 20;
+constexpr std::int32_t kMostRecords = 200'000;
 constexpr std::string_view kStore = "SecurityDetails.Stx";
 constexpr std::string_view kIndexName = "Sdix1.inx";
 
@@ -46,12 +48,12 @@ constexpr std::pair<std::string_view, std::string_view> kLabels[] = {
     {"ANNUALDIVIDENDRATE", "Annual Dividend"},
 };
 
-// The delimiter of a header; 0 when it has none.
+// The delimiter of a header; 0 when it has none, as a header in another alphabet.
 char DelimiterOf(std::string_view header) {
   for (const char c : header) {
     const bool name = (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') ||
                       c == ' ' || c == '_';
-    if (!name) return c;
+    if (!name) return c == '\t' || (c > ' ' && c < '\x7F') ? c : 0;
   }
   return 0;
 }
@@ -60,9 +62,9 @@ std::string HeaderText(std::string_view header, char delimiter) {
   const auto names = Split(header, delimiter);
   std::string text = Str(std::int32_t(names.size())) + "\r\n";
   for (const std::string_view name : names) {
-    const std::string upper = UCase(Trim(name));
+    const std::string upper = UCase(name);
     const auto known = std::find_if(std::begin(kLabels), std::end(kLabels),
-                                    [&](const auto& label) { return label.first == upper; });
+                                    [&](const auto& label) { return label.first == Trim(upper); });
     text += known == std::end(kLabels) ? upper : std::string(known->second);
     text += "\r\n";
   }
@@ -90,12 +92,12 @@ void UpdateSecurityDetails(const Files& files, const DownloadSettings& download)
   try {
     if (!files.CheckFile(input)) return;
     const std::string text = files.ReadAll(input, kLargestDetails);
-    LineReader lines(text);
+    LineReader lines(text.starts_with("\xEF\xBB\xBF") ? std::string_view(text).substr(3) : text);
     std::string_view line;
     if (!lines.Next(line)) return;
     const char delimiter = DelimiterOf(line);
     if (delimiter == 0) return;
-    files.WriteAll(system + "STKHeader.txt", HeaderText(line, delimiter));
+    const std::string header = HeaderText(line, delimiter);
 
     std::string store, index;
     std::string last;
@@ -109,14 +111,17 @@ void UpdateSecurityDetails(const Files& files, const DownloadSettings& download)
       rec.Code.set(code);
       rec.Details.set(line.substr(split + 1));
       store.append(reinterpret_cast<const char*>(&rec), sizeof(rec));
-      ++count;
+      if (++count > kMostRecords) return;
       if (const std::string now(rec.Code.trimmed()); now != last) {
         index += now + "," + Str(count) + "\r\n";
         last = now;
       }
     }
-    files.WriteAll(system + std::string(kStore), store);
-    files.WriteAll(system + std::string(kIndexName), index);
+    FileSet set(files);
+    set.Add(system + "STKHeader.txt", header);
+    set.Add(system + std::string(kStore), std::move(store));
+    set.Add(system + std::string(kIndexName), std::move(index));
+    set.Commit();
     files.Rename(input, in + "SecurityDetails.Asx.Bak");
   } catch (const RunTimeError&) {
     // Reference data: the update stands without them, and the input waits for the next run.

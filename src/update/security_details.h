@@ -21,9 +21,10 @@ static_assert(sizeof(DetailsRec) == 312 && offsetof(DetailsRec, Details) == 6);
 bool KoraDetailsReady(const Files& files, const DownloadSettings& download);
 
 // Takes the details file that the service left into the store: STKHeader.txt,
-// SecurityDetails.Stx and Sdix1.inx of the download system folder, each replaced as a whole. The
+// SecurityDetails.Stx and Sdix1.inx of the download system folder, replaced together. The
 // delimiter is the first character of the header that is no letter, digit, blank or
-// underscore. Returns quietly when there is no such file, or it can't be used.
+// underscore. Returns quietly, with everything as it was, when there is no such file, or it can't
+// be used: a header without a delimiter or in another alphabet, more than 200,000 codes.
 void UpdateSecurityDetails(const Files& files, const DownloadSettings& download);
 
 }  // namespace kora

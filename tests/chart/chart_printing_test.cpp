@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "base/runtime_error.h"
+#include "chart/script_player.h"
 #include "tests/chart/composer_fixture.h"
 #include "tests/support/mutate.h"
 #include "tests/support/recording_printer.h"
@@ -90,6 +91,26 @@ TEST(ChartPrintingTest, PointsAreLinesOfNoLengthAtThePrintWeightAndHeavyOnesAt3)
   PrintFixture f;
   EXPECT_EQ(f.Page("P,1,2,5\r\nK,3,4,5\r\n"),
             (Ops{"line solid 4 30,60,30,60 5", "line solid 3 90,120,90,120 5"}));
+}
+
+TEST(ChartPrintingTest, FilledBoxesAndHeavyPointsThatTheScreenSkipsPrint) {
+  const std::string script = "X,1,2,3,4,5\r\nK,1,2,5\r\nL,1,2,3,4,5\r\n";
+  PrintFixture f;
+  EXPECT_EQ(f.Page(script), (Ops{"fill 1 30,60,90,120 5", "line solid 3 30,60,30,60 5",
+                                 "line solid 1 30,60,90,120 5"}));
+  test::RecordingSurface screen(638, 452);
+  EXPECT_TRUE(PlayChartScript(script, screen, f.fonts, f.colours));
+  EXPECT_EQ(screen.ops, (Ops{"line solid 1,2,3,4 5"}));
+}
+
+TEST(ChartPrintingTest, TwipsToTheUnitAreRoundedFromA32BitProduct) {
+  PrintFixture f;
+  // 13.5, 16.5, 19.5 and 22.5 twips.
+  for (const auto& [enlarge, twips] : {std::pair{0.9f, 14}, {1.1f, 16}, {1.3f, 20}, {1.5f, 22}}) {
+    f.setup.PrintEnlarge = enlarge;
+    EXPECT_EQ(FrameOnPage(f.printer, f.setup, kChart).SX, twips) << enlarge;
+    EXPECT_EQ(FrameOnPage(f.printer, f.setup, kChart).SY, twips) << enlarge;
+  }
 }
 
 TEST(ChartPrintingTest, WeightOutsideOneToTenIsTwo) {

@@ -1,3 +1,4 @@
+#include <QAbstractButton>
 #include <QComboBox>
 #include <QDir>
 #include <QFile>
@@ -445,6 +446,32 @@ TEST_F(ChtsTest, PageSetUpAndPrintOpenTheirFormsOverTheChart) {
   EXPECT_TRUE(home.Exists("drive_c/korawin/data/TCht.Tmp"));
 }
 
+TEST_F(ChtsTest, AChartOrASavedChartIsPrintedIntoAPdfOfItsNameOnThePageAsItWasKept) {
+  session->ini.PutSetting("ChtPage", "Orient", "2");
+  Chts& charts = OpenCharts();
+  const QString caption = charts.windowTitle();
+  const auto print = [&](const char* expected) {
+    Find<QAction>(&charts, "cmPrintChart")->trigger();
+    auto* dialog = Find<QDialog>(&charts, "PrintKora");
+    ASSERT_NE(dialog, nullptr);
+    Find<QComboBox>(dialog, "Combo1")->setCurrentText("PDF file");
+    EXPECT_EQ(Find<QLineEdit>(dialog, "Text2")->text(), expected);
+    Click(dialog, "Command1");
+    ASSERT_TRUE(WaitFor([&] { return charts.findChild<QDialog*>("PrintKora") == nullptr; }));
+    EXPECT_EQ(charts.windowTitle(), caption);
+  };
+  print("c:\\korawin\\chtsave\\AAA.pdf");
+  EXPECT_NE(home.Get("drive_c/korawin/chtsave/AAA.pdf").find("/MediaBox [0 0 842"),
+            std::string::npos);
+  EXPECT_EQ(session->settings.page.Orient, 2);
+
+  home.Put("drive_c/korawin/chtsave/Mine.v2.cht", "L,1,2,300,400,255\r\n");
+  charts.window().ShowSaved("c:\\korawin\\chtsave\\Mine.v2.cht");
+  print("c:\\korawin\\chtsave\\Mine.v2.pdf");
+  EXPECT_TRUE(home.Exists("drive_c/korawin/chtsave/Mine.v2.pdf"));
+  EXPECT_TRUE(dialogs.said.empty());
+}
+
 TEST_F(ChtsTest, PricesThatCameInShowOnTheChart) {
   home.Put("drive_c/korawin/download/02NOV26.d", kDay);
   Chts& charts = OpenCharts();
@@ -458,6 +485,19 @@ TEST_F(ChtsTest, PricesThatCameInShowOnTheChart) {
   EXPECT_EQ(charts.window().Chart.Bars.BarCount, bars + 1);
   EXPECT_EQ(shown(), "BBB.WDT");
   EXPECT_EQ(session->current.Rec.Code.trimmed(), "BBB") << "as the update left another";
+}
+
+TEST_F(ChtsTest, AnAverageSwitchedOnInTheDefaultsStandsOnTheChart) {
+  Chts& charts = OpenCharts();
+  ASSERT_FALSE(charts.window().Request.Ma2On);
+  QTimer::singleShot(0, [&] {
+    auto* defaults = Find<QDialog>(&charts, "ChtDef");
+    ASSERT_NE(defaults, nullptr);
+    Find<QAbstractButton>(defaults, "AvTwo")->click();
+    defaults->reject();
+  });
+  Find<QAction>(&charts, "cmChtDef")->trigger();
+  EXPECT_TRUE(charts.window().Request.Ma2On);
 }
 
 TEST_F(ChtsTest, TheUnitOfVolumesStandsOnTheChart) {

@@ -80,16 +80,18 @@ TEST(ObvTest, TheScaleStandsAtTheQuartersWithItsTotals) {
   }
 }
 
-TEST(ObvTest, TheLineBeginsAtTheSecondPointAndIsNotRounded) {
+TEST(ObvTest, TheLineBeginsAtTheSecondPointOnWholeUnits) {
   OscFixture f;
   SetBars(f, kFive);
   ShowOBV(f.host);
   const auto down = Drawn(f, 'H', 40);  // equal counts as down
   ASSERT_EQ(down.size(), 1u);
-  EXPECT_SEGMENT(down[0], 46, 127.2, 48, 127.2);
+  EXPECT_SEGMENT(down[0], 46, 127, 48, 127);
   const auto up = Drawn(f, 'H', 38);
   ASSERT_EQ(up.size(), 1u);
-  EXPECT_SEGMENT(up[0], 48, 127.2, 50, 17.2);  // 110 units, CInt of 110.4
+  // From 127.2, and 300 above the lowest at 300 / 110 a unit: Q is CInt of 110.4, so that the
+  // highest stands at 17.2.
+  EXPECT_SEGMENT(up[0], 48, 127, 50, 17);
 }
 
 TEST(ObvTest, ATotalOfZeroIsNoPoint) {

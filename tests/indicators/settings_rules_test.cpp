@@ -304,31 +304,6 @@ TEST_F(ChartDefaultsRules, OneKeyThatCantBeWrittenIsTheOnlyOneListed) {
   EXPECT_EQ(dialogs.said[0].text, "; StochK");
 }
 
-TEST_F(ChartDefaultsRules, AverageCaptionsShowThePeriodInItsColourOrBlack) {
-  ChartColours colours{};
-  colours[0] = 0;
-  colours[20] = 0x111111;
-  colours[21] = 0x222222;
-  ChartSettings charts;
-  charts.Av1D = 5;
-  charts.Av1W = 6;
-  charts.Av2D = 7;
-  charts.Av2W = 8;
-  charts.AvOne = true;
-  auto captions = AverageCaptions(charts, "A", colours);
-  EXPECT_EQ(captions[0].text, "5");
-  EXPECT_EQ(captions[0].colour, 0x111111);
-  EXPECT_EQ(captions[1].text, "7");
-  EXPECT_EQ(captions[1].colour, 0);
-  charts.AvOne = false;
-  charts.AvTwo = true;
-  captions = AverageCaptions(charts, "M", colours);
-  EXPECT_EQ(captions[0].text, "6");
-  EXPECT_EQ(captions[0].colour, 0);
-  EXPECT_EQ(captions[1].text, "8");
-  EXPECT_EQ(captions[1].colour, 0x222222);
-}
-
 // ---- Overlays
 
 TEST_F(SettingsRules, MultipleAveragesAreKeptAsAList) {

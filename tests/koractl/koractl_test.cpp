@@ -95,7 +95,11 @@ TEST_F(KoractlTest, EveryCommandButInitAndDemoNeedsASettingsFile) {
   home.Put("x.csv", "ABC,20240104,1,3,1,2,100,0\n");
   for (const Words& words :
        {Words{"names"}, Words{"find", "ABC"}, Words{"prices", "ABC"}, Words{"bars", "ABC"},
-        Words{"chart", "ABC", "--out", "-"}, Words{"import", home.path() + "/x.csv"}})
+        Words{"chart", "ABC", "--out", "-"}, Words{"import", home.path() + "/x.csv"},
+        Words{"scale", "--high", "2", "--low", "1"}, Words{"downloads"}, Words{"update"},
+        Words{"master", home.path() + "/x.csv"},
+        Words{"play", "x.cht", "--out", home.path() + "/x.png"},
+        Words{"print", "ABC", "--out", home.path() + "/x.pdf"}})
     ExpectAbandoned(words, "[KORA] There is no Kora.ini in " + home.path() + "/kora.");
   std::filesystem::create_directories(home.path() + "/kora/Kora.ini");
   ExpectAbandoned({"names"}, "[KORA] There is no Kora.ini in ");
@@ -233,6 +237,7 @@ TEST_F(KoractlTest, BarsOfDaysWeeksAndMonths) {
 }
 
 TEST_F(KoractlTest, ScaleOfPricesAndOfAManualRange) {
+  MakeHome();
   // 1500 x 1.02 is 153 tens, 1200 x 0.99 is 119 tens; then outward to hundreds.
   const std::string header = "ScaleLow\tScaleHigh\tGridStep\tGridCount\n";
   // A range of 500 takes its tenth as the step.
@@ -396,6 +401,19 @@ TEST_F(KoractlTest, PrintMakesAPdfOfOnePage) {
   EXPECT_FALSE(home.Exists("kora/" + kHostData + "TCht.Tmp"));
 }
 
+TEST_F(KoractlTest, AChartPrintedAgainIsTheSameFileButForItsDate) {
+  MakeHome();
+  const auto print = [&] {
+    EXPECT_EQ(Out({"print", "ABC", "--osc", "MACD", "--out", home.path() + "/a.pdf"}), "");
+    std::string pdf = home.Get("a.pdf");
+    const size_t date = pdf.find("/CreationDate");
+    EXPECT_NE(date, pdf.npos);
+    return pdf.erase(date, pdf.find('\n', date) - date);
+  };
+  const std::string first = print();
+  for (int again = 0; again < 4; ++again) EXPECT_EQ(print(), first);
+}
+
 TEST_F(KoractlTest, ASavedChartPrintsAsTheChartItself) {
   MakeHome();
   const std::string saved = home.path() + "/a.CHT";
@@ -540,7 +558,8 @@ TEST_F(KoractlTest, AWeekOfDatesThatAreNoneIsAProblemWithTheData) {
   bytes.replace(100, 8, "2024XX08");
   PutData("ABC.WDT", bytes);
   ExpectAbandoned({"bars", "ABC", "--period", "W"},
-                  "There is a problem with the data for ABC.WDT\n at Rec Number (3)");
+                  "[Chart Display] There is a problem with the data for ABC.WDT\n at Rec Number "
+                  "(3) 2024XX08\nUse View/Modify Data procedure to correct.");
   EXPECT_NE(Out({"bars", "ABC"}).find("2024XX08"), std::string::npos);
 }
 
@@ -562,13 +581,31 @@ TEST_F(KoractlTest, OverridesHoldForOneRun) {
   EXPECT_EQ(Run({"find", "ABC", "--set", "koraPATHS.chtdata=c:\\other\\"}).err, kNoFile);
   EXPECT_EQ(home.Get("kora/Kora.ini"), ini);
   EXPECT_EQ(Run({"find", "ABC"}).code, 0);
-  for (const char* text : {"", "x", "A=b", ".k=v", "A.=v", "A.b"})
+  for (const char* text : {"", "x", "A=b", ".k=v", "A.=v", "A.b"}) {
     ExpectUsage({"--set", text, "names"}, "--set");
+    ExpectUsage({"--set", text, "scale", "--high", "2", "--low", "1"}, "--set");
+  }
+}
+
+TEST_F(KoractlTest, AnOverrideIsNotWrittenWhereTheFoldersAreSaved) {
+  MakeHome();
+  std::string ini = home.Get("kora/Kora.ini");
+  const size_t at = ini.find("System=c:\\korawin\\");
+  ini.replace(at, std::string("System=c:\\korawin\\").size(), "System=");
+  home.Put("kora/Kora.ini", ini);
+  // The program folder is looked for, and all folders are saved.
+  EXPECT_EQ(Run({"--set", "Download.DataService=3", "--set", "Download.DLPath=z:\\away", "find",
+                 "ABC"}).code, 0);
+  const std::string after = home.Get("kora/Kora.ini");
+  EXPECT_NE(after.find("System=C:\\korawin\\"), std::string::npos) << after;
+  EXPECT_NE(after.find("DataService=4"), std::string::npos) << after;
+  EXPECT_EQ(after.find("away"), std::string::npos);
 }
 
 TEST_F(KoractlTest, CommandLinesThatAreWrong) {
   ExpectUsage({}, "subcommand");
-  ExpectUsage({"nosuch"}, "");
+  ExpectUsage({"nosuch"}, "There is no command \"nosuch\"");
+  ExpectUsage({"demo", "--seed", "-1"}, "--seed");
   ExpectUsage({"names", "more"}, "");
   ExpectUsage({"--answer", "perhaps", "names"}, "--answer");
   ExpectUsage({"print"}, "");

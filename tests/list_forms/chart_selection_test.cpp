@@ -40,7 +40,12 @@ class ChtSelTest : public test::ListFormTest {
             },
             .showWindow = [this] { ++windows; },
             .closed = [this] { ++closed; },
-            .openChtDef = [this] { taskAtDefaults = state.ChartTask; },
+            .openChtDef =
+                [this](const std::function<void()>& averagesChanged) {
+                  taskAtDefaults = state.ChartTask;
+                  if (atDefaults) atDefaults();
+                  averagesChanged();
+                },
             .openFinDate = [this] {
               state.ChosenLimitText = "9/4/95";
               state.ChosenLimitDate = "19950409";
@@ -68,6 +73,7 @@ class ChtSelTest : public test::ListFormTest {
   std::unique_ptr<ChartSelection> selection;
   int shown = 0, shownIndex = 0, windows = 0, closed = 0, bandsAsked = 0;
   int taskAtDefaults = 0;
+  std::function<void()> atDefaults;
   bool dateChosen = true, folderChanged = true;
 };
 
@@ -425,6 +431,20 @@ TEST_F(ChtSelTest, SetDefaultsTellsItsTask) {
   Open();
   Press("Command7");
   EXPECT_EQ(taskAtDefaults, 777);
+}
+
+TEST_F(ChtSelTest, AveragesSwitchedInTheDefaultsShowWithTheirPeriods) {
+  Open();
+  ASSERT_FALSE(state.Ma1On);
+  atDefaults = [this] {
+    session->settings.charts.AvOne = true;
+    session->settings.charts.Av1D = 33;
+  };
+  Press("Command7");
+  EXPECT_TRUE(state.Ma1On);
+  EXPECT_TRUE(On<QCheckBox>("OAve1")->isChecked());
+  EXPECT_EQ(On<QCheckBox>("OAve1")->text(), "33");
+  EXPECT_FALSE(On<QCheckBox>("OAve2")->isChecked());
 }
 
 TEST_F(ChtSelTest, FormsThatAreNotThereLeaveTheirControlsGreyed) {

@@ -21,8 +21,12 @@ TEST(ConsoleDialogsTest, QuestionTakesTheStandingAnswerWhereItOffersIt) {
   }
   EXPECT_EQ(ConsoleDialogs(Answer::kNo).Ask("q", "t", Buttons::kYesNo), Answer::kNo);
   EXPECT_EQ(ConsoleDialogs(Answer::kCancel).Ask("q", "t", Buttons::kOkCancel), Answer::kCancel);
-  EXPECT_EQ(ConsoleDialogs(Answer::kCancel).Ask("q", "t", Buttons::kYesNo), Answer::kYes);
-  EXPECT_EQ(ConsoleDialogs(Answer::kNo).Ask("q", "t", Buttons::kOkCancel), Answer::kOk);
+  // A box without the word has another for the same.
+  EXPECT_EQ(ConsoleDialogs(Answer::kCancel).Ask("q", "t", Buttons::kYesNo), Answer::kNo);
+  EXPECT_EQ(ConsoleDialogs(Answer::kNo).Ask("q", "t", Buttons::kOkCancel), Answer::kCancel);
+  EXPECT_EQ(ConsoleDialogs(Answer::kNo).Ask("q", "t", Buttons::kRetryCancel), Answer::kCancel);
+  EXPECT_EQ(ConsoleDialogs(Answer::kOk).Ask("q", "t", Buttons::kYesNo), Answer::kYes);
+  EXPECT_EQ(ConsoleDialogs(Answer::kYes).Ask("q", "t", Buttons::kOkCancel), Answer::kOk);
   EXPECT_EQ(ConsoleDialogs(Answer::kNo).Ask("q", "t", Buttons::kOk), Answer::kOk);
   testing::internal::GetCapturedStderr();
 }

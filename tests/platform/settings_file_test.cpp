@@ -159,6 +159,12 @@ TEST(SettingsFileTest, OverrideIsReadButNeverWritten) {
   ini.file.Override("s", "only", "1");
   EXPECT_EQ(ini.Get("s", "k"), "run");
   EXPECT_EQ(ini.Get("s", "only"), "1");
+  EXPECT_TRUE(ini.file.PutSetting("s", "k", "run"));
+  EXPECT_TRUE(ini.file.PutSetting("s", "only", "1"));
+  EXPECT_EQ(ini.text(), "[s]\r\nk=file\r\n") << "as a save of everything puts them back";
+  ini.file.Override("s", "folder", "c:\\a");
+  EXPECT_TRUE(ini.file.PutSetting("s", "folder", "C:\\A\\"));
+  EXPECT_EQ(ini.text(), "[s]\r\nk=file\r\n");
   EXPECT_TRUE(ini.file.PutSetting("s", "k", "kept"));
   EXPECT_TRUE(ini.file.PutSetting("s", "other", "2"));
   EXPECT_EQ(ini.text(), "[s]\r\nk=kept\r\nother=2\r\n");

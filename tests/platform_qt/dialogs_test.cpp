@@ -39,6 +39,22 @@ TEST(QtDialogs, AMessageHasItsTextTitleAndOneButton) {
   EXPECT_TRUE(seen);
 }
 
+TEST(QtDialogs, AMessageOfAFormThatHasJustOpenedStandsOverIt) {
+  QWidget window;
+  window.show();
+  ASSERT_TRUE(QTest::qWaitForWindowExposed(&window));
+  QDialog form(&window);
+  form.open();
+  QtDialogs dialogs;
+  const QWidget* over = nullptr;
+  OnNext<QMessageBox>([&](QMessageBox& box) {
+    over = box.parentWidget();
+    QTest::keyClick(&box, Qt::Key_Return);
+  });
+  dialogs.Message("There is none", "Charts");
+  EXPECT_EQ(over, &form);
+}
+
 TEST(QtDialogs, QuestionsAnswerAsTheirButtons) {
   QtDialogs dialogs;
   const auto press = [](QMessageBox::StandardButton which) {

@@ -2,14 +2,9 @@
 
 #include <gtest/gtest.h>
 
-#include <QDir>
-#include <QFileInfo>
 #include <QImage>
 #include <QPainter>
 #include <QPrinterInfo>
-#include <QProcess>
-#include <QStandardPaths>
-#include <QTest>
 
 #include "base/runtime_error.h"
 #include "tests/support/error_of.h"
@@ -251,51 +246,6 @@ TEST(QtPrinterTest, APreviewHasThePageOfItsPrinterAndSendsNothing) {
   preview.EndDoc();
   EXPECT_EQ(preview.PageCount(), 1u);
   EXPECT_TRUE(f.files.empty());
-}
-
-// A queue that makes PDFs, where CUPS has one; as the administrator of a machine made for tests
-// CUPS is started where it is not running.
-std::string PdfQueue() {
-  const auto find = [] {
-    for (const QPrinterInfo& info : QPrinterInfo::availablePrinters())
-      if (info.makeAndModel().contains("CUPS-PDF", Qt::CaseInsensitive))
-        return info.printerName().toStdString();
-    return std::string();
-  };
-  std::string queue = find();
-  const QString daemon =
-      QStandardPaths::findExecutable("cupsd", {"/usr/sbin", "/usr/local/sbin", "/usr/bin"});
-  if (!queue.empty() || daemon.isEmpty() || QProcess::execute(daemon, {}) != 0) return queue;
-  if (!QTest::qWaitFor([&] { return !(queue = find()).empty(); }, 10000)) return {};
-  return queue;
-}
-
-TEST(QtPrinterTest, AQueueTakesTheDocument) {
-  const std::string queue = PdfQueue();
-  if (queue.empty())
-    GTEST_SKIP() << "no CUPS queue here that makes PDFs (cups, printer-driver-cups-pdf)";
-  // Where that queue leaves its files, for a user and for the administrator.
-  const QStringList folders{QDir::homePath() + "/PDF", "/var/spool/cups-pdf/ANONYMOUS",
-                            "/var/spool/cups-pdf/" + qEnvironmentVariable("USER")};
-  const QString title = QString("kora%1").arg(QCoreApplication::applicationPid());
-  const auto find = [&] {
-    for (const QString& folder : folders)
-      for (const QFileInfo& file : QDir(folder).entryInfoList({"*" + title + "*"}, QDir::Files))
-        if (file.size() > 0) return file.filePath();
-    return QString();
-  };
-  QtPrinter printer({});
-  printer.SetDevice(queue);
-  printer.SetOrientation(kLandscape);
-  EXPECT_GT(printer.Page().width, printer.Page().height);
-  printer.StartDoc(title.toStdString());
-  printer.FilledBox(1000, 1000, 5000, 3000, 0x0000FF);
-  printer.EndDoc();
-  EXPECT_TRUE(QTest::qWaitFor([&] { return !find().isEmpty(); }, 30000));
-  QFile made(find());
-  ASSERT_TRUE(made.open(QIODevice::ReadOnly));
-  EXPECT_EQ(made.read(5), "%PDF-");
-  made.remove();
 }
 
 }  // namespace

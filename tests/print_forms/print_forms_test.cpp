@@ -341,7 +341,31 @@ TEST_F(PrintForms, APdfNeedsAFileNameAndAsksBeforeItOverwrites) {
   EXPECT_EQ(pdf.device, QtPrinter::kPdfPrinter);
 }
 
-TEST_F(PrintForms, WithoutAPrinterTheCopyDialogAsksToChooseOne) {
+TEST_F(PrintForms, WithoutADefaultPrinterThePdfIsChosen) {
+  PdfPrinter pdf;
+  pdf.device.clear();
+  PrintServices services{session->files,   session->ini,     dialogs, session->settings,
+                         session->colours, session->printer, pdf};
+  PrintChoice choice;
+  choice.pdfFile = "c:\\korawin\\AAA.pdf";
+  PrintKora form(services, choice, nullptr);
+  form.show();
+  EXPECT_EQ(Find<QComboBox>(&form, "Combo1")->currentText(), "PDF file");
+  EXPECT_TRUE(Find<QLineEdit>(&form, "Text2")->isEnabled());
+  EXPECT_EQ(pdf.device, "") << "looking chooses nothing";
+  Click(&form, "Command1");
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_FALSE(choice.PrintCancelled);
+  EXPECT_EQ(pdf.device, "PDF file");
+
+  for (const char* gone : {"", "A press that was sold"}) {
+    pdf.device = gone;
+    PrinterSetup setup(services, nullptr);
+    EXPECT_EQ(Find<QComboBox>(&setup, "Combo1")->currentText(), "PDF file");
+  }
+}
+
+TEST_F(PrintForms, WithoutAnyPrinterTheCopyDialogSaysSo) {
   printer.device.clear();
   PrintChoice choice;
   Open<PrintKora>(choice);

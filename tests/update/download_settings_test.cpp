@@ -1,6 +1,8 @@
 #include "update/download_settings.h"
 
 #include "platform/settings_file.h"
+#include "tests/support/error_of.h"
+#include "tests/support/mutate.h"
 #include "tests/update/update_fixture.h"
 
 using namespace kora;
@@ -169,4 +171,159 @@ TEST_F(DownloadSettingsTest, ReadsOddUpdateListsWithoutHarm) {
   ASSERT_EQ(rows.size(), 3u);
   EXPECT_EQ(rows[0].code, "ORE");
   EXPECT_EQ(rows[1].category, 0);
+  EXPECT_EQ(rows[1].name, "\"Z\",more");
+}
+
+TEST_F(DownloadSettingsTest, AnEmptyPathIsAllowedAndGivesAnEmptyDLPath) {
+  ini.PutSetting("KoraPaths", "System", kSystem);
+  ini.PutSetting("Download", "DLPath", "c:\\in\\");
+  ASSERT_TRUE(SaveServiceChoice({4, "  ", "", 1}, ini, settings.download, dialogs));
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_EQ(settings.download.DLPath, "");
+  Settings read;
+  ASSERT_TRUE(ReadPaths(ini, home.files(), dialogs, read));
+  EXPECT_EQ(read.download.DLPath, "");
+}
+
+TEST_F(DownloadSettingsTest, AStoredDivisorOf7LoadsAs1) {
+  ini.PutSetting("KoraPaths", "System", kSystem);
+  ini.PutSetting("Download", "Volume divisor", "7");
+  Settings read;
+  ASSERT_TRUE(ReadPaths(ini, home.files(), dialogs, read));
+  EXPECT_EQ(read.download.VolumeDivisor, 1);
+  ini.PutSetting("Download", "Volume divisor", "1000");
+  ASSERT_TRUE(ReadPaths(ini, home.files(), dialogs, read));
+  EXPECT_EQ(read.download.VolumeDivisor, 1000);
+}
+
+TEST_F(DownloadSettingsTest, WithUpdateAllTheSavedListKeepsItsRows) {
+  home.Put(kHostSystem + "Update.Lst", "ORE,5,Ore Ltd\r\n");
+  UpdateChoice choice = UpdateChoice::kAll;
+  EXPECT_TRUE(Save(ReadUpdateList(home.files(), kSystem), choice));
+  EXPECT_EQ(home.Get(kHostSystem + "Update.Lst"), "ORE,5,Ore Ltd\r\n");
+  EXPECT_EQ(Key("UpdateAll"), "True");
+}
+
+TEST_F(DownloadSettingsTest, TheKeyWrittenWithABlankIsTheOneThatIsRead) {
+  ini.PutSetting("KoraPaths", "System", kSystem);
+  UpdateChoice choice = UpdateChoice::kListed;
+  EXPECT_TRUE(Save({{"ORE", 1, ""}}, choice));
+  Settings read;
+  ASSERT_TRUE(ReadPaths(ini, home.files(), dialogs, read));
+  EXPECT_FALSE(read.download.UpdateAll);
+  EXPECT_NE(home.Get("Kora.ini").find("\r\nUpdateAll=False\r\n"), std::string::npos);
+}
+
+TEST_F(DownloadSettingsTest, AnEmptiedListGoesToTheCopy) {
+  home.Put(kHostSystem + "Update.Lst", "ORE,5,Ore Ltd\r\n");
+  UpdateChoice choice = UpdateChoice::kAll;
+  EXPECT_FALSE(Save({}, choice));
+  EXPECT_FALSE(home.Exists(kHostSystem + "Update.Lst"));
+  EXPECT_EQ(home.Get(kHostSystem + "Update.Bak"), "ORE,5,Ore Ltd\r\n");
+}
+
+TEST_F(DownloadSettingsTest, AFullDiskLeavesTheOldUpdateListAndItsChoice) {
+  const std::string old = "ORE,5,Ore Ltd\r\n";
+  home.Put(kHostSystem + "Update.Lst", old);
+  for (int at = 1;; ++at) {
+    UpdateChoice choice = UpdateChoice::kListed;
+    io.Reset(at);
+    io.lasting = true;
+    const int error = ErrorOf([&] { Save({{"NEW", 1, ""}}, choice); });
+    const bool cut = io.calls >= at;
+    io.Reset();
+    if (!cut) break;
+    const std::string now = home.Get(kHostSystem + "Update.Lst");
+    EXPECT_EQ(now, error ? old : "NEW,1,\r\n") << at;
+    EXPECT_EQ(settings.download.UpdateAll, error != 0) << at;
+    home.Put(kHostSystem + "Update.Lst", old);
+    settings.download.UpdateAll = true;
+  }
+}
+
+TEST_F(DownloadSettingsTest, TextsCannotBreakTheListsLines) {
+  UpdateChoice choice = UpdateChoice::kListed;
+  EXPECT_TRUE(Save({{"a,b", 1, "x\r\nEVIL,1,y"}, {"\n", 1, "none"}, {"c\xC3\xA9", 1, "Smith, Jones"}},
+                   choice));
+  EXPECT_EQ(home.Get(kHostSystem + "Update.Lst"),
+            "A B,1,x  EVIL,1,y\r\nC\xE9,1,Smith, Jones\r\n");
+  const auto rows = ReadUpdateList(home.files(), kSystem);
+  ASSERT_EQ(rows.size(), 2u);
+  EXPECT_EQ(rows[1].name, "Smith, Jones");
+}
+
+TEST_F(DownloadSettingsTest, AHugeUpdateListIsRefused) {
+  home.Put(kHostSystem + "Update.Lst", "ORE,1,\r\n");
+  std::filesystem::resize_file(home.path() + "/" + kHostSystem + "Update.Lst", 5u << 20);
+  EXPECT_EQ(ErrorOf([&] { ReadUpdateList(home.files(), kSystem); }), kOutOfMemory);
+  std::string text;
+  for (int i = 0; i < 100'000; ++i) text += "A\n";
+  home.Put(kHostSystem + "Update.Lst", text);
+  EXPECT_EQ(ReadUpdateList(home.files(), kSystem).size(), 100'000u);
+  home.Put(kHostSystem + "Update.Lst", text + "B");
+  EXPECT_EQ(ErrorOf([&] { ReadUpdateList(home.files(), kSystem); }), kOutOfMemory);
+}
+
+TEST_F(DownloadSettingsTest, DamagedListsAreReadForWhatTheyHave) {
+  Mutator(13).Run({"ORE,1,Ore Ltd\r\nZAP,2,Zap\r\n", "c:\\1\\\r\nb\r\nc\r\nd\r\ne\r\n4\r\ng\r\n", ""},
+                  300, [&](const std::string& text) {
+                    home.Put(kHostSystem + "Update.Lst", text);
+                    for (const UpdateRow& row : ReadUpdateList(home.files(), kSystem)) {
+                      EXPECT_FALSE(row.code.empty());
+                      EXPECT_GE(row.category, 0);
+                      EXPECT_LE(row.category, 99);
+                    }
+                    home.Put(kHostSystem + "WMPaths.lst", text);
+                    const WmPaths lines = ReadWmPaths(home.files(), kSystem);
+                    const std::string chosen = WmChosenFolder(lines);
+                    EXPECT_TRUE(chosen.empty() || chosen.back() == '\\');
+                  });
+}
+
+TEST_F(DownloadSettingsTest, OddFilesOfOtherProgramsProposeNothing) {
+  const std::string nul("x\ny\nc:\\a\0b\nd:\\a\x01\n", 17);
+  for (const std::string& text : {std::string(), std::string("x\ny"), "x\ny\n" + std::string(300, 'c'),
+                                  "x\ny\n" + std::string(900'000, 'c'), nul, std::string(2u << 20, '\n')}) {
+    home.Put(kHostSystem + "BdaPaths.Dat", text);
+    home.Put(kHostSystem + "AlSystem.lst", "w\n" + text);
+    EXPECT_EQ(ProposedDownloadFolder(home.files(), 2, kSystem), "c:\\bda32\\koradata\\");
+    EXPECT_EQ(ProposedDownloadFolder(home.files(), 5, kSystem), "c:\\NetData\\");
+  }
+}
+
+TEST_F(DownloadSettingsTest, AFormThatMatchesNoneIsKeptAsTheOneThatShows) {
+  EXPECT_EQ(FormatToStore(""), "ddMMMyy.d");
+  EXPECT_EQ(FormatToStore("rubbish"), "DDMMMYY.D");
+  EXPECT_EQ(FormatToStore("ddMMMyy.d"), "ddMMMyy.d");
+  EXPECT_EQ(FormatToStore("YYMMDD.ASX"), "YYMMDD.ASX");
+}
+
+TEST_F(DownloadSettingsTest, TheServiceFoldersFollowTheService) {
+  ini.PutSetting("Download", "System", "c:\\sys\\");
+  ini.PutSetting("Download", "In", "c:\\in\\");
+  ASSERT_TRUE(SaveServiceChoice({1, "", "", 1}, ini, settings.download, dialogs));
+  EXPECT_EQ(settings.download.ServiceSystem, "c:\\sys\\");
+  EXPECT_EQ(settings.download.ServiceIn, "c:\\in\\");
+  EXPECT_EQ(settings.download.ServiceOut, "");
+  ASSERT_TRUE(SaveServiceChoice({4, "", "", 1}, ini, settings.download, dialogs));
+  EXPECT_EQ(settings.download.ServiceSystem, "");
+}
+
+TEST_F(DownloadSettingsTest, AFileInTheWayOfAFolderIsNotTakenForIt) {
+  home.Put("drive_c/2", "a file");
+  EXPECT_NE(ErrorOf([&] { SaveWmPaths(home.files(), kSystem, kFolders, 0, dialogs); }), 0);
+  EXPECT_FALSE(home.Exists(kHostSystem + "WMPaths.lst"));
+}
+
+TEST_F(DownloadSettingsTest, EachBoxOfTheWizardOpensOnItsFolder) {
+  const WmPaths lines{"c:\\1\\", "c:\\2\\", "c:\\3\\", "c:\\4\\", "c:", "0", "c:\\7\\"};
+  const std::pair<const char*, const char*> wanted[] = {
+      {"ASX stocks", "c:\\1\\"},    {"Aust Indices", "c:\\2\\"},
+      {"SFE Futures", "c:\\3\\"},   {"Overseas Data", "c:\\4\\"},
+      {"Put / Call Options", kData.c_str()}, {"Extra stocks", "c:\\7\\"}};
+  for (int i = 0; i < 6; ++i) {
+    const LocateCase what = WizardLocate(lines, i, settings.paths);
+    EXPECT_EQ(what.purpose, wanted[i].first);
+    EXPECT_EQ(what.start, wanted[i].second);
+  }
 }

@@ -1,5 +1,6 @@
 #include "update/security_details.h"
 
+#include "tests/support/mutate.h"
 #include "tests/update/update_fixture.h"
 
 using namespace kora;
@@ -79,6 +80,93 @@ TEST_F(DetailsTest, AFullDiskLeavesTheOldStore) {
     EXPECT_TRUE(home.Exists("drive_c/in/SecurityDetails.Asx.Stk")) << at;
   }
   EXPECT_NE(Sys("SecurityDetails.Stx"), old);
+}
+
+TEST_F(DetailsTest, AFailureAtAnyWriteLeavesHeaderStoreAndIndexTogether) {
+  Take("A|B\r\nBHP|old\r\n");
+  const auto before = Everything();
+  for (int at = 1;; ++at) {
+    home.Put("drive_c/in/SecurityDetails.Asx.Stk", "A|B|C\r\nAMC|new\r\nBHP|new\r\n");
+    io.Reset(at);
+    UpdateSecurityDetails(home.files(), settings.download);
+    const bool cut = io.calls >= at;
+    io.Reset();
+    if (!cut) break;
+    const bool took = Sys("STKHeader.txt")[0] == '3';
+    EXPECT_EQ(Sys("SecurityDetails.Stx").size(), took ? 624u : 312u) << at;
+    EXPECT_EQ(Sys("Sdix1.inx"), took ? "AMC,1\r\nBHP,2\r\n" : "BHP,1\r\n") << at;
+    EXPECT_TRUE(home.Exists("drive_c/in/SecurityDetails.Asx.Stk")) << at;
+  }
+  EXPECT_EQ(Sys("Sdix1.inx"), "AMC,1\r\nBHP,2\r\n");
+  EXPECT_EQ(Everything().size(), before.size());
+}
+
+TEST_F(DetailsTest, ACodeThatComesAgainIsIndexedAtEachChange) {
+  Take("A|B\r\nBHP|1\r\nORE|2\r\nBHP|3\r\n");
+  EXPECT_EQ(Sys("Sdix1.inx"), "BHP,1\r\nORE,2\r\nBHP,3\r\n");
+}
+
+TEST_F(DetailsTest, EachNameOfTheServiceHasItsLabel) {
+  const std::pair<const char*, const char*> labels[] = {
+      {"SHORTDESCRIPTION", "Description"}, {"SECURITYTYPE", "Type"},
+      {"FIRSTACTIVEDATE", "First Active"}, {"FIRSTQUOTEDDATE", "First Quoted"},
+      {"LASTQUOTEDATE", "Last Quoted"}, {"SUSPENSIONSTARTDATE", "Suspension Start"},
+      {"SUSPENSIONENDDATE", "Suspension End"}, {"TOTALCLASSISSUE", "Total Issued"},
+      {"PARVALUE", "Par Value"}, {"PAIDUPVALUE", "Paid Value"},
+      {"ASSETBACKING", "Asset backing"}, {"DIVENDRATEPERSHARE", "DPS"},
+      {"DIVIDENDSPAIDMONTHS", "Div. Mths"}, {"CURRENTDIVIDENDAMOUNT", "Current Div"},
+      {"DIVIDENTTYPE", "Div. Type"}, {"DIVIDENDPAYABLEDATE", "Div. Payable  "},
+      {"EXDATE", "Ex Div Date"}, {"FRANKINGPERCENT", "Franking %"},
+      {"CLASSAFRANKEDAMOUNT", "Class A Franked $"}, {"CLASSBFRANKEDAMOUNT", "Class B Franked $"},
+      {"CLASSCFRANKEDAMOUNT", "Class C Franked $"}, {"GROSSDIVIDENDAMOUNT", "Gross Div."},
+      {"MINAPPLICATIONMONEY", "Min. Applic.Money"}, {"MAXAPPLICATIONMONEY", "Max Applic. Money"},
+      {"APPLICATIONCLOSEDATE", "Applic.Close"}, {"QUOTEDSECURITYINDICATOR", "Security Ind."},
+      {"STAMPDUTYINDICATOR", "Stamp Duty Ind."}, {"SHORTSELLINDICATOR", "Short Sell Ind."},
+      {"PARIPASSUINDICATOR", "Pari Passu Ind."}, {"ANNUALDIVIDENDRATE", "Annual Dividend"}};
+  std::string header, wanted = std::to_string(std::size(labels)) + "\r\n";
+  for (const auto& [name, label] : labels) {
+    header += (header.empty() ? "" : "\t") + LCase(name);
+    wanted += std::string(label) + "\r\n";
+  }
+  Take(header + "\r\n");
+  EXPECT_EQ(Sys("STKHeader.txt"), wanted);
+}
+
+TEST_F(DetailsTest, AHeaderInAnotherAlphabetChangesNothing) {
+  Take("A|B\r\nBHP|old\r\n");
+  const std::string store = Sys("SecurityDetails.Stx");
+  for (const std::string& text :
+       {std::string("\xFF\xFE" "A\0|\0", 6), std::string("A\0|\0B\0", 6), std::string("A\x01""B\n"),
+        std::string("A\xA6" "B\n"), std::string(1 << 20, 'A')}) {
+    Take(text);
+    EXPECT_EQ(Sys("SecurityDetails.Stx"), store);
+    EXPECT_TRUE(home.Exists("drive_c/in/SecurityDetails.Asx.Stk"));
+  }
+  Take("\xEF\xBB\xBF" "A|B\nBHP|new\n");
+  EXPECT_EQ(Sys("STKHeader.txt"), "2\r\nA\r\nB\r\n");
+}
+
+TEST_F(DetailsTest, MoreCodesThanThereAreSecuritiesChangeNothing) {
+  Take("A|B\r\nBHP|old\r\n");
+  const std::string store = Sys("SecurityDetails.Stx");
+  std::string text = "A|B\n";
+  for (int i = 0; i <= 200'000; ++i) text += "AB|\n";
+  Take(text);
+  EXPECT_EQ(Sys("SecurityDetails.Stx"), store);
+  std::filesystem::resize_file(home.path() + "/drive_c/in/SecurityDetails.Asx.Stk", 65u << 20);
+  UpdateSecurityDetails(home.files(), settings.download);
+  EXPECT_EQ(Sys("SecurityDetails.Stx"), store);
+}
+
+TEST_F(DetailsTest, DamagedFilesLeaveWholeRecordsAndAnIndexIntoThem) {
+  Mutator(12).Run(
+      {"Code|ShortDescription|PARVALUE\r\nBHP|Big Hole|1.00\r\nORE|Ore|3\r\n", "", "|||\n|||\n|||"},
+      150, [&](const std::string& text) {
+        Take(text);
+        const std::string store = Sys("SecurityDetails.Stx");
+        ASSERT_EQ(store.size() % 312, 0u);
+        for (size_t at = 0; at < store.size(); at += 312) EXPECT_NE(store[at], ' ');
+      });
 }
 
 TEST_F(DetailsTest, TheUpdateOfServicesOneAndThreeTakesThem) {

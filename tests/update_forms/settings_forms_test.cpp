@@ -1,12 +1,18 @@
+#include <QAbstractItemView>
 #include <QCheckBox>
 #include <QComboBox>
+#include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QMenu>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QTableWidget>
+#include <map>
 
+#include "settings/forms/Locate.h"
 #include "tests/forms/form_fixture.h"
+#include "tests/support/recording_printer.h"
 #include "update/forms/DLWizard.h"
 #include "update/forms/INUpList.h"
 #include "update/forms/ModDetails.h"
@@ -28,7 +34,8 @@ class SettingsForms : public test::FormTest {
                            .dialogs = dialogs,
                            .settings = session->settings,
                            .serviceSaved = [this] { ++saved; },
-                           .pathChosen = [this] { ++chosen; }},
+                           .pathChosen = [this] { ++chosen; },
+                           .print = print},
         nullptr);
     Form& out = *made;
     form = std::move(made);
@@ -49,6 +56,7 @@ class SettingsForms : public test::FormTest {
 
   std::unique_ptr<QDialog> form;
   int saved = 0, chosen = 0;
+  std::function<void(const TextTable&)> print;
 };
 
 // ---- ModDetails
@@ -99,6 +107,23 @@ TEST_F(SettingsForms, ModDetailsKeepsAnEmptyFormatAsTheFirst) {
   EXPECT_EQ(Kept("InternetDLfmt"), "ddMMMyy.d");
 }
 
+TEST_F(SettingsForms, ModDetailsKeepsAFormThatMatchesNoneAsTheFirst) {
+  download().InternetDLfmt = "rubbish";
+  Open<ModDetails>();
+  EXPECT_EQ(Find<QComboBox>(form.get(), "Combo2")->currentIndex(), 0);
+  Click(form.get(), "Command3");
+  EXPECT_EQ(Kept("InternetDLfmt"), "DDMMMYY.D");
+}
+
+TEST_F(SettingsForms, ModDetailsAllowsAnEmptyPath) {
+  Open<ModDetails>();
+  Type("Text1", "");
+  Click(form.get(), "Command3");
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_FALSE(form->isVisible());
+  EXPECT_EQ(download().DLPath, "");
+}
+
 TEST_F(SettingsForms, ModDetailsRefusesAPathWithoutBackslash) {
   Open<ModDetails>();
   Type("Text1", "c:\\in");
@@ -140,6 +165,40 @@ TEST_F(SettingsForms, ModDetailsOpensTheWizardForTheWholeMarketByHandAlone) {
   combo->setFocus();
   QTest::keyClick(combo, Qt::Key_Down);
   EXPECT_NE(form->findChild<DLWizard*>(), nullptr);
+}
+
+TEST_F(SettingsForms, ModDetailsOpensNoWizardForTheServiceThatItHasAlready) {
+  download().DataService = 3;
+  Open<ModDetails>();
+  auto* combo = Find<QComboBox>(form.get(), "Combo1");
+  combo->showPopup();
+  QTest::keyClick(combo->view(), Qt::Key_Return);
+  EXPECT_EQ(combo->currentIndex(), 1);
+  EXPECT_EQ(form->findChild<DLWizard*>(), nullptr);
+}
+
+TEST_F(SettingsForms, ModDetailsChecksTheDivisorBeforeTheUpdateList) {
+  Open<ModDetails>();
+  Type("Text2", "7");
+  Click(form.get(), "Command1");
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said.back().title, "Volume Divisor");
+  EXPECT_EQ(form->findChild<INUpList*>(), nullptr);
+  QCoreApplication::processEvents();
+  EXPECT_EQ(dialogs.said.size(), 1u);  // told once
+}
+
+TEST_F(SettingsForms, ModDetailsPicksItsFolder) {
+  home.Put("drive_c/korawin/download/in/x", "");
+  Open<ModDetails>();
+  Click(form.get(), "Picture1");
+  auto* locate = form->findChild<Locate*>();
+  ASSERT_NE(locate, nullptr);
+  auto* list = Find<QListWidget>(locate, "Dir1");
+  list->setCurrentRow(1);
+  QTest::keyClick(list, Qt::Key_Return);
+  Click(locate, "Command1");
+  EXPECT_EQ(Text("Text1")->text(), "c:\\korawin\\download\\in\\");
 }
 
 // ---- WMPath and DLWizard
@@ -191,6 +250,82 @@ TEST_F(SettingsForms, DLWizardSavesTicksAndFolders) {
   EXPECT_FALSE(form->isVisible());
 }
 
+TEST_F(SettingsForms, WMPathTakesAChosenFolderThatIsFilledInLaterAsItSaves) {
+  Open<WMPath>();
+  Click(form.get(), "Option1(1)");
+  EXPECT_EQ(chosen, 0);
+  for (int i = 1; i <= 6; ++i)
+    Type(("Text" + std::to_string(i)).c_str(), ("c:\\m" + std::to_string(i)).c_str());
+  Click(form.get(), "Command1");
+  EXPECT_EQ(chosen, 1);
+  EXPECT_EQ(session->settings.paths.CurrentDataPath, "c:\\m2\\");
+}
+
+TEST_F(SettingsForms, WMPathPicksItsFolders) {
+  home.Put(kSystem + "WMPaths.lst", "a\r\nb\r\nc:\\korawin\\\r\nd\r\ne\r\n4\r\ng\r\n");
+  Open<WMPath>();
+  Click(form.get(), "Picture1(2)");
+  auto* locate = form->findChild<Locate*>();
+  ASSERT_NE(locate, nullptr);
+  EXPECT_EQ(Find<QLabel>(locate, "Label3(1)")->text(), "SFE Futures");
+  Click(locate, "Command1");
+  EXPECT_EQ(Text("Text3")->text(), "c:\\korawin\\");
+  EXPECT_EQ(Text("Text4")->text(), "d");
+}
+
+TEST_F(SettingsForms, DLWizardPicksItsFolders) {
+  home.Put(kSystem + "WMPaths.lst", "a\r\nb\r\nc\r\nc:\\korawin\\\r\ne\r\n4\r\ng\r\n");
+  const std::pair<std::string, std::string> wanted[] = {
+      {"ASX stocks", "c:\\korawin\\data\\"},    {"Aust Indices", "c:\\korawin\\data\\"},
+      {"SFE Futures", "c:\\korawin\\data\\"},   {"Overseas Data", "c:\\korawin\\"},
+      {"Put / Call Options", "c:\\korawin\\data\\"}, {"Extra stocks", "c:\\korawin\\data\\"}};
+  Open<DLWizard>();
+  for (int i = 0; i < 6; ++i) {
+    Click(form.get(), ("Picture1(" + std::to_string(i) + ")").c_str());
+    auto* locate = form->findChild<Locate*>();
+    ASSERT_NE(locate, nullptr);
+    EXPECT_EQ(Find<QLabel>(locate, "Label3(1)")->text().toStdString(), wanted[i].first);
+    EXPECT_EQ(Find<QLabel>(locate, "Label3(0)")->text().toStdString(), wanted[i].second);
+    Click(locate, "Command1");
+    EXPECT_EQ(Text(("Text1(" + std::to_string(i) + ")").c_str())->text().toStdString(),
+              wanted[i].second);
+    delete locate;
+  }
+}
+
+TEST_F(SettingsForms, AFolderThatIsNotChosenStays) {
+  home.Put(kSystem + "WMPaths.lst", "a\r\nb\r\nc\r\nd\r\ne\r\n4\r\ng\r\n");
+  Open<DLWizard>();
+  Click(form.get(), "Picture1(0)");
+  QTest::keyClick(form->findChild<Locate*>(), Qt::Key_Escape);
+  EXPECT_EQ(Text("Text1(0)")->text(), "a");
+}
+
+// A mnemonic that two controls share leads to none of them at once.
+TEST_F(SettingsForms, NoTwoControlsOfAFormShareAMnemonic) {
+  const auto check = [this] {
+    std::map<QChar, int> uses;
+    const auto note = [&](const QString& text) {
+      const qsizetype at = text.indexOf('&');
+      if (at >= 0 && at + 1 < text.size()) ++uses[text[at + 1].toUpper()];
+    };
+    for (auto* button : form->findChildren<QAbstractButton*>()) note(button->text());
+    for (auto* label : form->findChildren<QLabel*>()) note(label->text());
+    for (auto* menu : form->findChildren<QMenu*>()) note(menu->title());
+    EXPECT_FALSE(uses.empty());
+    for (const auto& [letter, count] : uses)
+      EXPECT_EQ(count, 1) << form->objectName().toStdString() << " " << QString(letter).toStdString();
+  };
+  Open<ModDetails>();
+  check();
+  Open<WMPath>();
+  check();
+  Open<DLWizard>();
+  check();
+  Open<INUpList>();
+  check();
+}
+
 // ---- INUpList
 
 class UpdateListForm : public SettingsForms {
@@ -229,7 +364,10 @@ TEST_F(UpdateListForm, AddsCheckedItemsInOrderAndSavesThem) {
   EXPECT_EQ(Kept("UpdateAll"), "False");
   auto* box = form->findChild<RecSav*>();
   ASSERT_NE(box, nullptr);
+  EXPECT_TRUE(box->isVisible());
+  EXPECT_EQ(QApplication::activeWindow(), form.get());  // keys still go to the list
   EXPECT_TRUE(WaitFor([this] { return form->findChild<RecSav*>() == nullptr; }));
+  EXPECT_EQ(QApplication::activeWindow(), form.get());
 }
 
 TEST_F(UpdateListForm, SavesAChangedListOnClosing) {
@@ -245,6 +383,97 @@ TEST_F(UpdateListForm, SavesAChangedListOnClosing) {
   EXPECT_FALSE(form->isVisible());
   EXPECT_EQ(home.Get(kSystem + "Update.Lst"), "ZAP,1,\r\nNEW,0,\r\n");
   EXPECT_EQ(home.Get(kSystem + "Update.Bak"), "ORE,3,Mine\r\nZAP,1,\r\n");
+}
+
+TEST_F(UpdateListForm, TheGridIsLockedAndGreyUnlessTheListIsInUse) {
+  Master();
+  home.Put(kSystem + "Update.Lst", "ORE,3,Mine\r\n");
+  Open<INUpList>();
+  const auto live = [this] {
+    EXPECT_EQ(Find<QPushButton>(form.get(), "Command1")->isEnabled(),
+              Find<QAction>(form.get(), "ulAdd")->isEnabled());
+    EXPECT_EQ(Find<QAction>(form.get(), "ulDel")->isEnabled(),
+              Find<QAction>(form.get(), "ulAdd")->isEnabled());
+    return Find<QAction>(form.get(), "ulAdd")->isEnabled();
+  };
+  EXPECT_FALSE(live());
+  EXPECT_NE(Grid()->palette().color(QPalette::Base), QColor(Qt::white));
+  Click(form.get(), "Option1(1)");
+  EXPECT_TRUE(live());
+  EXPECT_EQ(Grid()->palette().color(QPalette::Base), QColor(Qt::white));
+  Click(form.get(), "Option1(2)");
+  EXPECT_FALSE(live());
+  Trigger("ulSave");
+  EXPECT_EQ(home.Get(kSystem + "Update.Lst"), "ORE,3,Mine\r\n");
+  EXPECT_EQ(Kept("UpdateAll"), "True");
+  EXPECT_EQ(Kept("NoWarrants"), "True");
+}
+
+TEST_F(UpdateListForm, WhatIsBeingTypedIsSaved) {
+  download().UpdateAll = false;
+  home.Put(kSystem + "Update.Lst", "ORE,3,Mine\r\n");
+  Open<INUpList>();
+  Trigger("ulAdd");
+  QTest::keyClicks(Grid(), "z");
+  auto* editor = Grid()->findChild<QLineEdit*>();
+  ASSERT_NE(editor, nullptr);
+  QTest::keyClicks(editor, "a,p toolong");
+  EXPECT_EQ(editor->text(), "zaptoo");
+  Trigger("ulSave");
+  EXPECT_EQ(Grid()->item(1, 0)->text(), "ZAPTOO");
+  EXPECT_EQ(home.Get(kSystem + "Update.Lst"), "ORE,3,Mine\r\nZAPTOO,0,\r\n");
+}
+
+TEST_F(UpdateListForm, ALostSaveDoesNotHoldTheForm) {
+  download().UpdateAll = false;
+  home.Put(kSystem + "Update.Lst", "ORE,3,Mine\r\n");
+  Open<INUpList>();
+  Grid()->item(0, 2)->setText("Other");
+  home.Put(kSystem + "Update.Lst.tmp~/x", "");  // a folder where the new list would be written
+  dialogs.answers = {Answer::kNo, Answer::kYes};
+  QTest::keyClick(form.get(), Qt::Key_Escape);
+  EXPECT_TRUE(form->isVisible());
+  EXPECT_EQ(dialogs.said.back().text, "The list could not be saved. Close without saving ?");
+  QTest::keyClick(form.get(), Qt::Key_Escape);
+  EXPECT_FALSE(form->isVisible());
+  EXPECT_EQ(home.Get(kSystem + "Update.Lst"), "ORE,3,Mine\r\n");
+}
+
+TEST_F(UpdateListForm, PrintsTheRowsUnderTheirHeadings) {
+  Open<INUpList>();
+  EXPECT_FALSE(Find<QAction>(form.get(), "UlPrint")->isEnabled());  // no printing, no entry
+  test::RecordingPrinter printer;
+  print = [&](const TextTable& table) {
+    PrintTable(printer, session->settings.fonts, session->settings.page, table);
+  };
+  home.Put(kSystem + "Update.Lst", "ORE,3,Mine, Old\r\nZAP,12,Zap\r\n");
+  Open<INUpList>();
+  Trigger("UlPrint");
+  ASSERT_EQ(printer.sent.size(), 1u);
+  std::string texts;
+  for (const std::string& op : printer.sent[0]) texts += op + "\n";
+  size_t at = 0;
+  for (const char* text : {" DOWNLOAD UPDATE LIST ", " Page  1 ", " ASX Code ", " CAT. ", " Name ",
+                           " ORE ", " 3 ", " Mine, Old ", " ZAP ", " 12 ", " Zap "}) {
+    at = texts.find(text, at);
+    ASSERT_NE(at, std::string::npos) << text << "\n" << texts;
+  }
+}
+
+TEST_F(UpdateListForm, TellsThatThereIsNothingToPrintOrNoPrinter) {
+  test::RecordingPrinter printer;
+  printer.device.clear();
+  print = [&](const TextTable& table) {
+    PrintTable(printer, session->settings.fonts, session->settings.page, table);
+  };
+  Open<INUpList>();
+  Trigger("UlPrint");
+  EXPECT_EQ(dialogs.said.back().text, "No records to print");
+  home.Put(kSystem + "Update.Lst", "ORE,3,Mine\r\n");
+  Open<INUpList>();
+  Trigger("UlPrint");
+  EXPECT_EQ(dialogs.said.back().text, "There is a device problem. Check and retry");
+  EXPECT_EQ(printer.started, 0);
 }
 
 TEST_F(UpdateListForm, AnEmptyListIsResetToAll) {

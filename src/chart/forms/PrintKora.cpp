@@ -8,6 +8,7 @@
 
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "chart/forms/printer_list.h"
 #include "platform/qt/form_parts.h"
 #include "platform/qt/qt_printer.h"
 
@@ -24,11 +25,7 @@ PrintKora::PrintKora(const PrintServices& services, PrintChoice& choice, QWidget
   setObjectName("PrintKora");
   setWindowTitle(FormText(kTitle));
   choice_.PrintCancelled = true;
-  combo1_ = new QComboBox(this);
-  combo1_->setObjectName("Combo1");
-  for (const std::string& name : services_.printer.DeviceNames())
-    combo1_->addItem(FormText(name));
-  combo1_->setCurrentIndex(combo1_->findText(FormText(services_.printer.DeviceName())));
+  combo1_ = NewPrinterList(this, services_.printer);
   text1_ = new QSpinBox(this);
   text1_->setObjectName("Text1");
   text1_->setRange(1, kMostCopies);
@@ -50,7 +47,8 @@ PrintKora::PrintKora(const PrintServices& services, PrintChoice& choice, QWidget
   grid->addLayout(buttons, 4, 0, 1, 3);
   connect(combo1_, &QComboBox::currentIndexChanged, this, [this] { PrinterChosen(); });
   PrinterChosen();
-  text1_->setFocus();
+  QWidget* first = IsPdf() ? static_cast<QWidget*>(text2_) : text1_;
+  first->setFocus();
   text1_->selectAll();
 }
 

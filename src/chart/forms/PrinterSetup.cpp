@@ -7,6 +7,7 @@
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
+#include "chart/forms/printer_list.h"
 #include "platform/qt/form_parts.h"
 
 namespace kora {
@@ -16,16 +17,11 @@ PrinterSetup::PrinterSetup(const PrintServices& services, QWidget* parent)
   setObjectName("PrinterSetup");
   setWindowTitle("Printer Setup");
   const Printer& printer = services_.printer;
-  const auto choice = [this](const char* name, const std::vector<std::string>& items,
-                             const std::string& current) {
-    auto* box = new QComboBox(this);
-    box->setObjectName(name);
-    for (const std::string& item : items) box->addItem(FormText(item));
-    box->setCurrentIndex(box->findText(FormText(current)));
-    return box;
-  };
-  combo1_ = choice("Combo1", printer.DeviceNames(), printer.DeviceName());
-  combo2_ = choice("Combo2", printer.PaperNames(), printer.PaperName());
+  combo1_ = NewPrinterList(this, printer);
+  combo2_ = new QComboBox(this);
+  combo2_->setObjectName("Combo2");
+  for (const std::string& name : printer.PaperNames()) combo2_->addItem(FormText(name));
+  combo2_->setCurrentIndex(combo2_->findText(FormText(printer.PaperName())));
   auto* portrait = new QRadioButton("Por&trait", this);
   portrait->setObjectName("Option1(0)");
   landscape_ = new QRadioButton("&Landscape", this);

@@ -1,5 +1,8 @@
 #include "chart/forms/print_job.h"
 
+#include <QCoreApplication>
+#include <QPointer>
+
 namespace kora {
 namespace {
 
@@ -24,8 +27,15 @@ void AskAndPrint(const PrintServices& services, PrintChoice& choice, PrintJob jo
   }
   auto* form = new PrintKora(services, choice, parent);
   form->setAttribute(Qt::WA_DeleteOnClose);
-  QObject::connect(form, &QDialog::finished, form, [services, &choice, job = std::move(job)] {
-    if (!choice.PrintCancelled) PrintCopies(services, choice, job);
+  QObject::connect(form, &QDialog::finished, form, [services, &choice, job = std::move(job),
+                                                      over = QPointer<QWidget>(parent)] {
+    if (!choice.PrintCancelled) {
+      // The question goes from the screen before the work begins. Where it asked about a file
+      // it goes together with what it stood over, and the keyboard would be nobody's.
+      if (over) over->activateWindow();
+      QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
+      PrintCopies(services, choice, job);
+    }
     if (job.done) job.done();
   });
   form->open();

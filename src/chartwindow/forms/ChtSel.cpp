@@ -141,7 +141,10 @@ ChtSel::ChtSel(ChtSelServices services, QWidget* parent)
   });
   connect(command7_, &QPushButton::clicked, this, [this] {
     services_.state.ChartTask = kTaskSelectionDefaults;
-    services_.openChtDef();
+    services_.openChtDef([this] {
+      services_.selection.AveragesChanged();
+      Refresh();
+    });
   });
 
   services_.selection.Load();

@@ -30,7 +30,8 @@ struct ChtSelServices {
   std::function<void()> showWindow;    // shows the chart window, on the way from the start
   std::function<void()> closed;        // the chart window closes, the menus come back
   std::function<void()> secondDropped = {};  // the second chart of a pair was not chosen
-  std::function<void()> openChtDef;    // chart defaults, modally
+  // Chart defaults, modally; `averagesChanged` is called when an average was switched or saved.
+  std::function<void(const std::function<void()>& averagesChanged)> openChtDef;
   std::function<bool()> openFinDate;   // true when a date was chosen
   std::function<void()> openChtBands;  // percentage bands, modally
   std::function<bool()> openWMPath;    // true when another folder was chosen

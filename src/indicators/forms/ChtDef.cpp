@@ -220,20 +220,14 @@ void ChtDef::Save() {
   }
   // As it was kept: a text that was no number is 0 now.
   Fill(DefaultsFromSettings(services_.settings));
-  ShowAverages();
+  if (services_.averagesChanged) services_.averagesChanged();
 }
 
 // Takes effect before a save.
 void ChtDef::AverageSwitched() {
   services_.settings.charts.AvOne = avOne_->value();
   services_.settings.charts.AvTwo = avTwo_->value();
-  ShowAverages();
-}
-
-void ChtDef::ShowAverages() {
-  if (services_.opener == ChtDefOpener::kChartSelection && services_.showAverages)
-    services_.showAverages(AverageCaptions(services_.settings.charts, services_.chartPeriod,
-                                           services_.colours));
+  if (services_.averagesChanged) services_.averagesChanged();
 }
 
 void ChtDef::OpenScales() {

@@ -27,8 +27,8 @@ struct ChtDefServices {
   std::function<void()> readSettings;   // reads the keys anew when the form opens
   std::function<void()> openScales;     // the form of manual scales
   std::function<void()> refreshChart;   // the chart window's refresh button
-  // The averages as the chart selection shows them.
-  std::function<void(const std::array<AverageCaption, 2>&)> showAverages;
+  // An average was switched, or all was saved: the settings hold what charts are to take.
+  std::function<void()> averagesChanged;
 };
 
 // "Chart Defaults": all periods and switches of charts and oscillators.
@@ -53,7 +53,6 @@ class ChtDef : public QDialog {
   void Save();
   void OpenScales();
   void AverageSwitched();
-  void ShowAverages();
 
   ChtDefServices services_;
   std::array<Twin, 22> periods_;

@@ -1,5 +1,6 @@
 #include "platform/headless/console_dialogs.h"
 
+#include <array>
 #include <cstdio>
 #ifdef _WIN32
 #include <io.h>
@@ -64,7 +65,14 @@ Answer ConsoleDialogs::Ask(std::string_view text, std::string_view title, Button
     }
     return false;
   };
-  if (standing_ && offers(*standing_)) return *standing_;
+  if (standing_) {
+    if (offers(*standing_)) return *standing_;
+    // The word for the same in this box: who declines must not be taken to agree.
+    const bool declines = *standing_ == Answer::kNo || *standing_ == Answer::kCancel;
+    for (const Answer word : declines ? std::array{Answer::kNo, Answer::kCancel}
+                                      : std::array{Answer::kYes, Answer::kOk})
+      if (offers(word)) return word;
+  }
   switch (buttons) {
     case Buttons::kOk:
     case Buttons::kOkCancel: return Answer::kOk;

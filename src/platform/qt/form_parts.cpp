@@ -4,6 +4,8 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QStyle>
+#include <QToolButton>
 
 namespace kora {
 
@@ -35,6 +37,18 @@ QLabel* NewNote(QWidget* form, const QString& text, int columns) {
   label->setWordWrap(true);
   label->setMinimumWidth(form->fontMetrics().averageCharWidth() * columns);
   return label;
+}
+
+QToolButton* NewFolderButton(QWidget* form, const QString& name, std::function<void()> pressed) {
+  auto* button = new QToolButton(form);
+  button->setObjectName(name);
+  button->setIcon(form->style()->standardIcon(QStyle::SP_DirOpenIcon));
+  button->setToolTip("Choose the folder");
+  button->setAccessibleName("Choose the folder");
+  button->setFocusPolicy(Qt::TabFocus);
+  QObject::connect(button, &QToolButton::clicked, form,
+                   [pressed = std::move(pressed)] { pressed(); });
+  return button;
 }
 
 ButtonRow::ButtonRow(QDialog* form) : form_(form) { addStretch(); }

@@ -10,6 +10,7 @@ class QDialog;
 class QLabel;
 class QLineEdit;
 class QPushButton;
+class QToolButton;
 class QWidget;
 
 namespace kora {
@@ -25,6 +26,9 @@ QLineEdit* NewField(QWidget* form, const QString& name, int columns, int limit);
 QLabel* NewLabel(QWidget* form, const QString& caption, QWidget* buddy = nullptr);
 // A label for sentences: it wraps at about `columns` letters.
 QLabel* NewNote(QWidget* form, const QString& text, int columns = 46);
+
+// The small button beside a box by which its folder is chosen.
+QToolButton* NewFolderButton(QWidget* form, const QString& name, std::function<void()> pressed);
 
 // The buttons at the foot of a form. Enter presses the first one added, or the one that has the
 // focus.

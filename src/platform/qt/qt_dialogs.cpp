@@ -13,6 +13,13 @@ QString ToQt(std::string_view text) {
   return QString::fromUtf8(text.data(), qsizetype(text.size()));
 }
 
+// What a dialog stands over, and gives the keyboard back to: the form that holds the others back,
+// which has just opened and may not be active yet.
+QWidget* Below() {
+  QWidget* modal = QApplication::activeModalWidget();
+  return modal ? modal : QApplication::activeWindow();
+}
+
 // While a question stands the pointer is the normal one, whatever goes on behind it.
 class NormalPointer {
  public:
@@ -52,7 +59,7 @@ class ProgressWindow : public Progress {
   }
 
  private:
-  QProgressDialog window_{QApplication::activeWindow()};
+  QProgressDialog window_{Below()};
   QElapsedTimer sincePaint_;
 };
 
@@ -66,7 +73,7 @@ void QtDialogs::Message(std::string_view text, std::string_view title) {
 
 Answer QtDialogs::Ask(std::string_view text, std::string_view title, Buttons buttons) {
   const NormalPointer pointer(busy_);
-  QMessageBox box(QApplication::activeWindow());
+  QMessageBox box(Below());
   box.setObjectName("MessageBox");
   box.setWindowTitle(ToQt(title));
   box.setTextFormat(Qt::PlainText);
@@ -93,7 +100,7 @@ Answer QtDialogs::Ask(std::string_view text, std::string_view title, Buttons but
 std::optional<std::string> QtDialogs::Prompt(std::string_view text, std::string_view title,
                                              std::string_view standing) {
   const NormalPointer pointer(busy_);
-  QInputDialog box(QApplication::activeWindow());
+  QInputDialog box(Below());
   box.setObjectName("Prompt");
   box.setWindowTitle(ToQt(title));
   box.setLabelText(ToQt(text));

@@ -2,12 +2,15 @@
 
 #include <QBuffer>
 #include <QFontMetricsF>
+#include <QHashFunctions>
+#include <QLibrary>
 #include <QPageLayout>
 #include <QPageSize>
 #include <QPainter>
 #include <QPdfWriter>
 #include <QPrinter>
 #include <QPrinterInfo>
+#include <QScopeGuard>
 #include <algorithm>
 #include <cmath>
 #include <memory>
@@ -304,6 +307,19 @@ std::unique_ptr<QPrinter> OpenQueue(const std::string& device, const std::string
   return printer;
 }
 
+// Whether CUPS refused the document that Qt has just handed to it, of which Qt says nothing: a
+// queue that takes none, a service that is gone. Elsewhere there is nobody to ask.
+bool QueueRefused() {
+#ifdef Q_OS_UNIX
+  constexpr int kFirstError = 0x100;  // of IPP; what is below is a success
+  using LastError = int (*)();
+  const auto lastError = LastError(QLibrary::resolve("cups", 2, "cupsLastError"));
+  return lastError && lastError() >= kFirstError;
+#else
+  return false;
+#endif
+}
+
 }  // namespace
 
 Sheet QtPrinter::Page() const {
@@ -351,6 +367,9 @@ bool QtPrinter::Paint(QPagedPaintDevice& device) const {
 }
 
 std::string QtPrinter::Pdf(const std::string& title) const {
+  // The fonts stand in the file in the order of a hash: the same chart is to be the same file.
+  QHashSeed::setDeterministicGlobalSeed();
+  const auto randomAgain = qScopeGuard([] { QHashSeed::resetRandomGlobalSeed(); });
   QByteArray bytes;
   QBuffer out(&bytes);
   out.open(QIODevice::WriteOnly);
@@ -372,7 +391,7 @@ void QtPrinter::SendToQueue(const std::string& title) const {
   const auto printer = OpenQueue(device, paper_, orientation_);
   printer->setDocName(ToQt(title));
   printer->setCreator("KORA Charting");
-  if (!Paint(*printer) || printer->printerState() == QPrinter::Error)
+  if (!Paint(*printer) || printer->printerState() == QPrinter::Error || QueueRefused())
     throw RunTimeError(kDeviceNotAvailable);
 }
 

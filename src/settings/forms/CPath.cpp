@@ -5,10 +5,10 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
-#include <QStyle>
 #include <QToolButton>
 
 #include "base/text.h"
+#include "platform/qt/form_parts.h"
 #include "settings/forms/Locate.h"
 
 namespace kora {
@@ -66,14 +66,9 @@ QLineEdit* CPath::AddField(const char* name, const char* caption, int row, int b
   grid->addWidget(label, row, 0);
   grid->addWidget(field, row, 1);
   if (browse >= 0) {
-    auto* button = new QToolButton(this);
-    button->setObjectName(QString("Picture1(%1)").arg(browse));
-    button->setIcon(style()->standardIcon(QStyle::SP_DirOpenIcon));
-    button->setToolTip("Choose the folder");
-    button->setAccessibleName("Choose the folder");
-    button->setFocusPolicy(Qt::TabFocus);
-    connect(button, &QToolButton::clicked, this, [this, browse] { OpenLocate(browse); });
-    grid->addWidget(button, row, 2);
+    grid->addWidget(NewFolderButton(this, QString("Picture1(%1)").arg(browse),
+                                    [this, browse] { OpenLocate(browse); }),
+                    row, 2);
   }
   return field;
 }

@@ -125,7 +125,7 @@ void ChartDesk::WireWindow() {
   w.SetForm("new", [this] { OpenSelection(); });
   w.SetForm("Chart2", [this] { OpenSecondChart(); });
   w.SetForm("OscFrm", [this] { OpenOscFrm(); });
-  w.SetForm("cmChtDef", [this] { OpenChtDef(true, false); });
+  w.SetForm("cmChtDef", [this] { OpenChtDef(ChtDefOpener::kChartWindow); });
   w.SetForm("cmChtSpaces", [this] { OpenChtSp(); });
   w.SetForm("cmPageSetup", [this] { OpenPage(); });
   w.SetForm("cmPrintChart", [this] { PrintChart(); });
@@ -177,6 +177,12 @@ void ChartDesk::OpenChtSp() {
 // ---- Printing
 
 PrintServices ChartDesk::Printing() {
+  // The printer starts with its page as it was kept; from then on the forms turn it.
+  if (!pageTurned_) {
+    pageTurned_ = true;
+    const std::int16_t kept = session_.settings.page.Orient;
+    if (kept == kPortrait || kept == kLandscape) printer_.SetOrientation(kept);
+  }
   return {session_.files,   session_.ini,     session_.dialogs, session_.settings,
           session_.colours, session_.printer, printer_};
 }
@@ -195,8 +201,13 @@ void ChartDesk::OpenPage() {
 
 void ChartDesk::PrintChart() {
   const QSizeF size = chts_->ChartSize();
-  const std::string code(session_.current.Rec.Code.trimmed());
-  printChoice_.pdfFile = session_.settings.paths.ChartSavePath + code + ".pdf";
+  const ChartWindow& shown = chts_->window();
+  std::string name(session_.current.Rec.Code.trimmed());
+  if (shown.ChartFromFile) {
+    name = shown.SavedChartFile.substr(shown.SavedChartFile.find_last_of('\\') + 1);
+    name = name.substr(0, name.find_last_of('.'));
+  }
+  printChoice_.pdfFile = session_.settings.paths.ChartSavePath + name + ".pdf";
   const QPointer<Chts> window = chts_;
   AskAndPrint(Printing(), printChoice_,
               {.chart = {size.width(), size.height()},
@@ -205,6 +216,8 @@ void ChartDesk::PrintChart() {
                  if (!window) return std::string();
                  const std::string before = window->windowTitle().toStdString();
                  window->setWindowTitle(QString::fromStdString(caption));
+                 // Printing leaves no time for what is painted later.
+                 if (QWidget* frame = window->parentWidget()) frame->repaint();
                  return before;
                },
                .done = {}},
@@ -238,7 +251,9 @@ ChtSelServices ChartDesk::SelectionServices() {
             if (chts_) chts_->parentWidget()->close();
             hooks_.menusBack();
           },
-          .openChtDef = [this] { OpenChtDef(false, true); },
+          .openChtDef = [this](const auto& averagesChanged) {
+            OpenChtDef(ChtDefOpener::kChartSelection, averagesChanged);
+          },
           .openFinDate = [this] { return OpenFinDate(); },
           .openChtBands = [this] { OpenChtBands(); },
           .openWMPath = [this] {
@@ -304,17 +319,17 @@ void ChartDesk::OpenChtBands() {
 
 // ---- Forms of the menu
 
-void ChartDesk::OpenChtDef(bool fromWindow, bool fromSelection) {
-  QWidget* parent = fromSelection && selectionForm_ ? selectionForm_.data() : Over();
+void ChartDesk::OpenChtDef(ChtDefOpener opener, const std::function<void()>& averagesChanged) {
+  QWidget* parent = opener == ChtDefOpener::kChartSelection && selectionForm_
+                        ? selectionForm_.data()
+                        : Over();
   ChtDef form({.ini = session_.ini,
                .files = session_.files,
                .dialogs = session_.dialogs,
                .settings = session_.settings,
                .colours = session_.colours,
                .chartPeriod = session_.charts.ChartPeriod,
-               .opener = fromWindow      ? ChtDefOpener::kChartWindow
-                         : fromSelection ? ChtDefOpener::kChartSelection
-                                         : ChtDefOpener::kShell,
+               .opener = opener,
                .readSettings = hooks_.readSettings,
                .openScales = [this] {
                  Scales scales({.files = session_.files,
@@ -326,12 +341,16 @@ void ChartDesk::OpenChtDef(bool fromWindow, bool fromSelection) {
                  scales.exec();
                },
                .refreshChart = [this] { Refresh(); },
-               .showAverages = {}},
+               .averagesChanged = [this, averagesChanged] {
+                 session_.charts.Ma1On = session_.settings.charts.AvOne;
+                 session_.charts.Ma2On = session_.settings.charts.AvTwo;
+                 if (averagesChanged) averagesChanged();
+               }},
               parent);
   form.exec();
 }
 
-void ChartDesk::OpenDefaults() { OpenChtDef(false, false); }
+void ChartDesk::OpenDefaults() { OpenChtDef(ChtDefOpener::kShell); }
 
 void ChartDesk::OpenFonts() { Show(new ChtFonts(Look([this] { Refresh(); }), over_)); }
 

@@ -7,6 +7,7 @@
 #include "chartwindow/chart_selection.h"
 #include "chartwindow/forms/Chts.h"
 #include "chartwindow/forms/selection_form.h"
+#include "indicators/forms/ChtDef.h"
 #include "platform/qt/qt_printer.h"
 #include "shell/session.h"
 #include "store/forms/look_services.h"
@@ -56,7 +57,7 @@ class ChartDesk {
   ChtSelServices SelectionServices();
   LookServices Look(std::function<void()> saved);
   void Refresh();
-  void OpenChtDef(bool fromWindow, bool fromSelection);
+  void OpenChtDef(ChtDefOpener opener, const std::function<void()>& averagesChanged = {});
   void OpenOscFrm();
   bool OpenFinDate();
   void OpenChtBands();
@@ -74,6 +75,7 @@ class ChartDesk {
   QPointer<QDialog> selectionForm_, secondForm_;
   PrintChoice printChoice_;
   QtPrinter printer_;
+  bool pageTurned_ = false;
   float boxValue_ = 0;  // of the point-and-figure chart, as its settings box left it
 };
 

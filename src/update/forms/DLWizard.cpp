@@ -2,9 +2,11 @@
 
 #include <QCheckBox>
 #include <QGridLayout>
+#include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QToolButton>
 
 #include "update/download_settings.h"
 
@@ -17,36 +19,50 @@ DLWizard::DLWizard(UpdateFormServices services, QWidget* parent)
   static constexpr const char* kKinds[] = {
       "All ASX stocks, warrants", "Top 500, Top 150", "Indices (Aust)",
       "Overseas indices etc.",    "SFE Futures",      "Put / Call Options"};
-  static constexpr const char* kFolders[] = {"ASX stocks",    "Aust Indices",       "SFE Futures",
-                                             "Overseas Data", "Put / Call Options", "Extra stocks"};
+  // By box. The form shows overseas data before futures, as the kinds above.
+  static constexpr const char* kFolders[] = {"&ASX stocks",         "Aust &Indices",
+                                             "SFE &Futures",        "&Overseas Data",
+                                             "&Put / Call Options", "&Extra stocks"};
+  static constexpr int kOrder[] = {0, 1, 3, 2, 4, 5};
   const auto ticks = WizardTicks(services_.ini);
   const auto folders =
       WizardFolders(ReadWmPaths(services_.files, services_.settings.paths.SystemPath));
-  auto* grid = new QGridLayout(this);
-  grid->addWidget(
-      new QLabel("Download packages:  All ASX  Top500  Top150 or All Options", this), 0, 0, 1, 3);
+
+  auto* kinds = new QGroupBox("Data received", this);
+  auto* kindsGrid = new QGridLayout(kinds);
   for (int i = 0; i < 6; ++i) {
-    const auto at = size_t(i);
-    checks_[at] = new QCheckBox(kKinds[i], this);
-    checks_[at]->setObjectName(QString("Check1(%1)").arg(i));
-    checks_[at]->setChecked(ticks[at]);
-    grid->addWidget(checks_[at], i + 1, 0);
+    auto*& check = checks_[size_t(i)];
+    check = new QCheckBox(kKinds[i], this);
+    check->setObjectName(QString("Check1(%1)").arg(i));
+    check->setChecked(ticks[size_t(i)]);
+    kindsGrid->addWidget(check, i % 3, i / 3);
   }
-  for (int i = 0; i < 6; ++i) {
-    const auto at = size_t(i);
+  auto* places = new QGroupBox("Folders", this);
+  auto* grid = new QGridLayout(places);
+  for (int row = 0; row < 6; ++row) {
+    const int i = kOrder[row];
+    auto*& text = texts_[size_t(i)];
     auto* label = new QLabel(kFolders[i], this);
-    texts_[at] = new QLineEdit(Shown(folders[at]), this);
-    texts_[at]->setObjectName(QString("Text1(%1)").arg(i));
-    texts_[at]->setAccessibleName(kFolders[i]);
-    texts_[at]->setMinimumWidth(fontMetrics().averageCharWidth() * 40);
-    grid->addWidget(label, i + 1, 1);
-    grid->addWidget(texts_[at], i + 1, 2);
+    text = new QLineEdit(Shown(folders[size_t(i)]), this);
+    text->setObjectName(QString("Text1(%1)").arg(i));
+    text->setMinimumWidth(fontMetrics().averageCharWidth() * 40);
+    label->setBuddy(text);
+    grid->addWidget(label, row, 0);
+    grid->addWidget(text, row, 1);
+    grid->addWidget(NewDestinationButton(services_, i, text, this), row, 2);
   }
-  grid->setColumnStretch(2, 1);
+  grid->setColumnStretch(1, 1);
+  texts_[5]->setToolTip("Saved as the folder of ASX stocks; Data Destination Paths has its own");
+
+  auto* box = new QVBoxLayout(this);
+  box->addWidget(
+      new QLabel("Download packages:  All ASX  Top500  Top150 or All Options", this));
+  box->addWidget(kinds);
+  box->addWidget(places);
   auto* save = new QPushButton("&Save Settings", this);
   save->setObjectName("Command1");
   save->setDefault(true);
-  grid->addWidget(save, 7, 2, Qt::AlignRight);
+  box->addWidget(save, 0, Qt::AlignRight);
   connect(save, &QPushButton::clicked, this, [this] { Save(); });
 }
 

@@ -1,12 +1,18 @@
 #include "update/forms/INUpList.h"
 
+#include <QFontDatabase>
+#include <QFrame>
 #include <QGridLayout>
 #include <QHeaderView>
 #include <QLabel>
+#include <QLineEdit>
 #include <QListWidget>
 #include <QMenuBar>
 #include <QPushButton>
 #include <QRadioButton>
+#include <QRegularExpressionValidator>
+#include <QScreen>
+#include <QStyledItemDelegate>
 #include <QTableWidget>
 #include <QTimer>
 #include <set>
@@ -20,12 +26,40 @@ namespace {
 
 constexpr int kSavedMs = 900;
 
+// Takes what a code can be.
+class CodeDelegate : public QStyledItemDelegate {
+ public:
+  using QStyledItemDelegate::QStyledItemDelegate;
+  QWidget* createEditor(QWidget* parent, const QStyleOptionViewItem&,
+                        const QModelIndex&) const override {
+    auto* editor = new QLineEdit(parent);
+    editor->setFrame(false);
+    editor->setMaxLength(6);
+    editor->setValidator(new QRegularExpressionValidator(
+        QRegularExpression("[^,\"\\x00-\\x20]*"), editor));
+    return editor;
+  }
+  void setModelData(QWidget* editor, QAbstractItemModel* model,
+                    const QModelIndex& index) const override {
+    const std::string code = static_cast<QLineEdit*>(editor)->text().toStdString();
+    model->setData(index, Shown(UCase(code)));
+  }
+};
+
 }  // namespace
 
-RecSav::RecSav(QWidget* parent) : QDialog(parent) {
+// It takes neither the focus nor a place among the windows.
+RecSav::RecSav(QWidget* parent) : QDialog(parent, Qt::ToolTip) {
   setObjectName("RecSav");
-  auto* box = new QVBoxLayout(this);
-  box->addWidget(new QLabel("Saved", this), 0, Qt::AlignCenter);
+  auto* frame = new QFrame(this);
+  frame->setFrameStyle(QFrame::Box | QFrame::Raised);
+  auto* around = new QVBoxLayout(this);
+  around->setContentsMargins(0, 0, 0, 0);
+  around->addWidget(frame);
+  auto* box = new QVBoxLayout(frame);
+  const int margin = fontMetrics().height() * 2;
+  box->setContentsMargins(margin, margin / 2, margin, margin / 2);
+  box->addWidget(new QLabel("Saved", frame), 0, Qt::AlignCenter);
   setAttribute(Qt::WA_DeleteOnClose);
   QTimer::singleShot(kSavedMs, this, [this] { close(); });
 }
@@ -56,32 +90,43 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   ss1_->horizontalHeader()->setStretchLastSection(true);
   ss1_->setMinimumWidth(fontMetrics().averageCharWidth() * 55);
   ss1_->setSelectionBehavior(QAbstractItemView::SelectRows);
+  ss1_->setAccessibleName("Securities to update");
+  ss1_->setTabKeyNavigation(false);
+  ss1_->setWordWrap(false);
+  ss1_->setItemDelegateForColumn(0, new CodeDelegate(ss1_));
   list1_ = new QListWidget(this);
   list1_->setObjectName("List1");
   list1_->setAccessibleName("Master list");
-  auto* add = new QPushButton("&Add checked items", this);
-  add->setObjectName("Command1");
-  add->setAutoDefault(false);
+  list1_->setUniformItemSizes(true);
+  list1_->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));  // names stand in line
+  command1_ = new QPushButton("&Add checked items", this);
+  command1_->setObjectName("Command1");
+  command1_->setAutoDefault(false);
   grid->addWidget(ss1_, 3, 0, 2, 1);
   grid->addWidget(list1_, 3, 1);
-  grid->addWidget(add, 4, 1);
+  grid->addWidget(command1_, 4, 1);
   grid->setColumnStretch(0, 3);
   grid->setColumnStretch(1, 2);
-  connect(add, &QPushButton::clicked, this, [this] { AddChecked(); });
+  connect(command1_, &QPushButton::clicked, this, [this] { AddChecked(); });
   connect(ss1_, &QTableWidget::itemChanged, this, [this] {
     if (!loading_) changed_ = true;
   });
 
   AddMenu();
   SaveOrTell(services_.dialogs, windowTitle(), [this] {
-    for (const UpdateRow& row :
-         ReadUpdateList(services_.files, services_.settings.paths.SystemPath))
-      AddRow(row);
+    const auto rows = ReadUpdateList(services_.files, services_.settings.paths.SystemPath);
+    ss1_->setRowCount(int(rows.size()));
+    for (size_t i = 0; i < rows.size(); ++i) SetRow(int(i), rows[i]);
     return true;
   });
   LoadMaster();
   ShowChoice();
   loading_ = false;
+  const QFontMetrics metrics = fontMetrics();
+  resize(QSize(metrics.averageCharWidth() * 130, metrics.height() * 34)
+             .boundedTo(screen()->availableSize() * 0.9));
+  ss1_->setColumnWidth(0, metrics.averageCharWidth() * 14);
+  ss1_->setColumnWidth(1, metrics.averageCharWidth() * 9);
 }
 
 void INUpList::AddMenu() {
@@ -93,16 +138,16 @@ void INUpList::AddMenu() {
     return action;
   };
   QMenu* file = bar->addMenu("&File");
-  entry(file, "ulSave", "&Save List", [this] { Save(); });
-  entry(file, "UlPrint", "&Print List", [] {})->setEnabled(false);  // until grids can be printed
+  entry(file, "ulSave", "&Save List", [this] { Save(this); });
+  entry(file, "UlPrint", "&Print List", [this] { Print(); })->setEnabled(bool(services_.print));
   entry(file, "ulClose", "&Close", [this] { reject(); });
   QMenu* edit = bar->addMenu("&Edit");
-  entry(edit, "ulAdd", "&Add Row/s", [this] {
-    if (Choice() != UpdateChoice::kListed) return;
+  ulAdd_ = entry(edit, "ulAdd", "&Add Row/s", [this] {
     AddRow({});
     ss1_->setCurrentCell(ss1_->rowCount() - 1, 0);
+    ss1_->setFocus();
   });
-  entry(edit, "ulDel", "&Delete Row/s", [this] { DeleteRows(); });
+  ulDel_ = entry(edit, "ulDel", "&Delete Row/s", [this] { DeleteRows(); });
 }
 
 void INUpList::LoadMaster() {
@@ -124,8 +169,11 @@ void INUpList::LoadMaster() {
 }
 
 void INUpList::AddRow(const UpdateRow& row) {
-  const int at = ss1_->rowCount();
-  ss1_->insertRow(at);
+  ss1_->insertRow(ss1_->rowCount());
+  SetRow(ss1_->rowCount() - 1, row);
+}
+
+void INUpList::SetRow(int at, const UpdateRow& row) {
   ss1_->setItem(at, 0, new QTableWidgetItem(Shown(row.code)));
   ss1_->setItem(at, 1, new QTableWidgetItem(
                            row.code.empty() ? QString() : Shown(Format(double(row.category), "##0"))));
@@ -156,15 +204,20 @@ UpdateChoice INUpList::Choice() const {
 // The grid lives, on white, while the list is in use; else it is locked and grey.
 void INUpList::ShowChoice() {
   const bool live = Choice() == UpdateChoice::kListed;
-  ss1_->setEditTriggers(live ? QAbstractItemView::AllEditTriggers
+  ss1_->setEditTriggers(live ? QAbstractItemView::DoubleClicked |
+                                   QAbstractItemView::EditKeyPressed |
+                                   QAbstractItemView::AnyKeyPressed
                              : QAbstractItemView::NoEditTriggers);
   QPalette colours = ss1_->palette();
   colours.setColor(QPalette::Base, live ? Qt::white : Qt::lightGray);
+  colours.setColor(QPalette::Text, Qt::black);
   ss1_->setPalette(colours);
+  command1_->setEnabled(live && !master_.Records.empty());
+  ulAdd_->setEnabled(live);
+  ulDel_->setEnabled(live);
 }
 
 void INUpList::AddChecked() {
-  if (Choice() != UpdateChoice::kListed || master_.Records.empty()) return;
   std::set<std::string> there;
   for (const UpdateRow& row : Rows()) there.insert(row.code);
   for (int i = 0; i < list1_->count(); ++i) {
@@ -179,7 +232,6 @@ void INUpList::AddChecked() {
 }
 
 void INUpList::DeleteRows() {
-  if (Choice() != UpdateChoice::kListed) return;
   std::set<int, std::greater<>> rows;
   for (const QModelIndex& index : ss1_->selectionModel()->selectedIndexes())
     rows.insert(index.row());
@@ -187,7 +239,31 @@ void INUpList::DeleteRows() {
   if (!rows.empty()) changed_ = true;
 }
 
-bool INUpList::Save() {
+void INUpList::Print() {
+  EndEditing();
+  TextTable table{.layout = {.heading = "DOWNLOAD UPDATE LIST",
+                             .continued = "  (cont)",
+                             .columns = {"ASX Code", "CAT.", "Name"},
+                             .at = {0, 0.15, 0.25}},
+                  .rows = {}};
+  for (const UpdateRow& row : Rows())
+    if (!row.code.empty())
+      table.rows.push_back({row.code, Format(double(row.category), "##0"), row.name});
+  if (table.rows.empty()) {
+    services_.dialogs.Message("No records to print", "Update List");
+    return;
+  }
+  SaveOrTell(services_.dialogs, windowTitle(), [&] {
+    services_.print(table);
+    return true;
+  });
+}
+
+// What is being typed into a cell counts.
+void INUpList::EndEditing() { ss1_->setFocus(); }
+
+bool INUpList::Save(QWidget* over) {
+  EndEditing();
   UpdateChoice choice = Choice();
   bool written = false;
   if (!SaveOrTell(services_.dialogs, windowTitle(), [&] {
@@ -200,12 +276,16 @@ bool INUpList::Save() {
   options_[size_t(choice)]->setChecked(true);
   ShowChoice();
   changed_ = false;
-  if (written) (new RecSav(parentWidget() ? parentWidget() : this))->show();
+  if (written && over) (new RecSav(over))->show();
   return true;
 }
 
 void INUpList::reject() {
-  if (changed_ && !Save()) return;
+  EndEditing();
+  if (changed_ && !Save(parentWidget()) &&
+      services_.dialogs.Ask("The list could not be saved. Close without saving ?", "Update List",
+                            Buttons::kYesNo) != Answer::kYes)
+    return;
   QDialog::reject();
 }
 

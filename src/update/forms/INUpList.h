@@ -7,7 +7,9 @@
 #include "update/forms/update_form.h"
 #include "update/master_list.h"
 
+class QAction;
 class QListWidget;
+class QPushButton;
 class QRadioButton;
 class QTableWidget;
 
@@ -31,18 +33,23 @@ class INUpList : public QDialog {
   void AddMenu();
   void LoadMaster();
   void AddRow(const UpdateRow& row);
+  void SetRow(int at, const UpdateRow& row);
   std::vector<UpdateRow> Rows() const;
   UpdateChoice Choice() const;
   void ShowChoice();
   void AddChecked();
   void DeleteRows();
-  bool Save();
+  void Print();
+  void EndEditing();
+  bool Save(QWidget* over);  // "Saved" shows over that window
 
   UpdateFormServices services_;
   MasterList master_;
   std::array<QRadioButton*, 3> options_;
   QTableWidget* ss1_;
   QListWidget* list1_;
+  QPushButton* command1_;
+  QAction *ulAdd_, *ulDel_;
   bool loading_ = true;
   bool changed_ = false;
 };

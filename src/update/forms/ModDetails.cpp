@@ -8,6 +8,9 @@
 #include <QPushButton>
 #include <QTimer>
 
+#include <QToolButton>
+#include <utility>
+
 #include "base/numbers.h"
 #include "base/text.h"
 #include "update/download_settings.h"
@@ -15,6 +18,12 @@
 #include "update/forms/INUpList.h"
 
 namespace kora {
+
+namespace {
+
+constexpr int kLongestPath = 60;  // what the settings file gives back
+
+}  // namespace
 
 ModDetails::ModDetails(UpdateFormServices services, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
@@ -29,11 +38,12 @@ ModDetails::ModDetails(UpdateFormServices services, QWidget* parent)
   text1_ = new QLineEdit(Shown(download.DLPath), this);
   text1_->setObjectName("Text1");
   text1_->setMinimumWidth(fontMetrics().averageCharWidth() * 45);
+  text1_->setMaxLength(kLongestPath);
   combo2_ = new QComboBox(this);
   combo2_->setObjectName("Combo2");
   for (const FormatEntry& entry : FormatEntries()) combo2_->addItem(Shown(entry.text));
   combo2_->setCurrentIndex(FormatIndex(download.InternetDLfmt));
-  format_ = download.InternetDLfmt.empty() ? "ddMMMyy.d" : download.InternetDLfmt;
+  format_ = FormatToStore(download.InternetDLfmt);
   text2_ = new QLineEdit(Shown(Str(download.VolumeDivisor)), this);
   text2_->setObjectName("Text2");
   text2_->installEventFilter(this);
@@ -48,6 +58,13 @@ ModDetails::ModDetails(UpdateFormServices services, QWidget* parent)
   };
   add("Data &Service", combo1_, 0);
   add("Download &Folder", text1_, 1);
+  grid->addWidget(NewLocateButton(services_, "Picture1", text1_,
+                                  [this] {
+                                    return LocateCase{"Download Folder",
+                                                      text1_->text().toStdString()};
+                                  },
+                                  this),
+                  1, 2);
   formatLabel_ = add("File &Names", combo2_, 2);
   divisorLabel_ = add("&Volume Divisor", text2_, 3);
   grid->setColumnStretch(1, 1);
@@ -62,14 +79,15 @@ ModDetails::ModDetails(UpdateFormServices services, QWidget* parent)
   buttons->addWidget(command1_);
   buttons->addStretch();
   buttons->addWidget(save);
-  grid->addLayout(buttons, 4, 0, 1, 2);
+  grid->addLayout(buttons, 4, 0, 1, 3);
 
   connect(combo1_, &QComboBox::currentIndexChanged, this, [this] {
+    changed_ = true;
     ShowService();
     ProposeFolder();
   });
   connect(combo1_, &QComboBox::activated, this, [this](int index) {
-    if (ServiceOfIndex(index) != 3) return;
+    if (!std::exchange(changed_, false) || ServiceOfIndex(index) != 3) return;
     auto* wizard = new DLWizard(services_, this);
     wizard->setAttribute(Qt::WA_DeleteOnClose);
     wizard->open();
@@ -77,6 +95,7 @@ ModDetails::ModDetails(UpdateFormServices services, QWidget* parent)
   connect(combo2_, &QComboBox::currentIndexChanged, this,
           [this](int index) { format_ = FormatEntries()[size_t(index)].stored; });
   connect(command1_, &QPushButton::clicked, this, [this] {
+    if (text2_->isVisible() && !CheckDivisor()) return;
     auto* list = new INUpList(services_, this);
     list->setAttribute(Qt::WA_DeleteOnClose);
     list->open();

@@ -22,6 +22,7 @@ class WMPath : public QDialog {
   UpdateFormServices services_;
   std::array<QLineEdit*, 6> texts_;
   std::array<QRadioButton*, 6> options_;
+  bool waiting_ = false;  // a folder was chosen that is not filled in yet
 };
 
 }  // namespace kora

@@ -5,7 +5,13 @@
 #include <string>
 
 #include "platform/dialogs.h"
+#include "settings/locate.h"
 #include "settings/settings.h"
+#include "settings/text_print_out.h"
+
+class QLineEdit;
+class QToolButton;
+class QWidget;
 
 namespace kora {
 
@@ -17,11 +23,22 @@ struct UpdateFormServices {
   Settings& settings;
   std::function<void()> serviceSaved = {};  // the main menu follows the service
   std::function<void()> pathChosen = {};    // CurrentDataPath changed: title, field of CPath
+  // Prints a list, or raises as PrintTable does; without it the entry is greyed.
+  std::function<void(const TextTable&)> print = {};
 };
 
 inline QString Shown(std::string_view text) {
   return QString::fromUtf8(text.data(), qsizetype(text.size()));
 }
+
+// The button beside `box` that opens `Locate` on what `what` says at that time; the folder goes
+// into the box.
+QToolButton* NewLocateButton(const UpdateFormServices& services, const QString& name,
+                             QLineEdit* box, std::function<LocateCase()> what, QWidget* form);
+
+// The same for the box of the folder `index`, 0 to 5, of the whole market; "Picture1(index)".
+QToolButton* NewDestinationButton(const UpdateFormServices& services, int index, QLineEdit* box,
+                                  QWidget* form);
 
 // Runs the saving of a form; a failure of the host is told. False then, and when `save` says so.
 bool SaveOrTell(Dialogs& dialogs, const QString& title, const std::function<bool()>& save);
