@@ -4,6 +4,7 @@
 #include <fcntl.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <filesystem>
 #include <stdexcept>
 
@@ -101,21 +102,25 @@ Market& TheMarket() {
   return market;
 }
 
-// Open, read the last record, append one, close.
-void UpdateFloor(benchmark::State& state) {
+// The bare calls: open, read the last `back` records (the last one at least), write so many and
+// `more`, close.
+void UpdateFloor(benchmark::State& state, int back, int more) {
   Market& market = TheMarket();
   std::vector<std::string> paths;
   for (int i = 0; i < kSecurities; ++i) paths.push_back(market.HostData() + "/" + Code(i) + ".WDT");
+  std::vector<PriceRec> recs(size_t(back + more));
+  const size_t reading = size_t(std::max(back, 1)) * sizeof(PriceRec);
+  const size_t writing = recs.size() * sizeof(PriceRec);
   for (auto _ : state) {
     state.PauseTiming();
     market.Reset();
     state.ResumeTiming();
     for (const std::string& path : paths) {
-      PriceRec rec;
       const int fd = ::open(path.c_str(), O_RDWR | O_CLOEXEC);
       const off_t end = ::lseek(fd, 0, SEEK_END);
-      if (::pread(fd, &rec, sizeof(rec), end - off_t(sizeof(rec))) != ssize_t(sizeof(rec)) ||
-          ::pwrite(fd, &rec, sizeof(rec), end) != ssize_t(sizeof(rec)))
+      if (::pread(fd, recs.data(), reading, end - off_t(reading)) != ssize_t(reading) ||
+          ::pwrite(fd, recs.data(), writing, end - back * off_t(sizeof(PriceRec))) !=
+              ssize_t(writing))
         state.SkipWithError("no record");
       ::close(fd);
     }
@@ -136,15 +141,49 @@ void UpdateDay(benchmark::State& state, double day, int lines, std::int16_t serv
   state.SetItemsProcessed(state.iterations() * kSecurities);
 }
 
+// A market whose folder is emptied, so that `lines` securities are new.
+void EmptyMarket(Market& market, int lines) {
+  std::filesystem::remove_all(market.HostData());
+  std::filesystem::create_directory(market.HostData());
+  market.PutDay(Date(0), lines);
+}
+
+// Open the name file, append, close; make the price file, write, close.
+void NewFloor(benchmark::State& state) {
+  for (auto _ : state) {
+    state.PauseTiming();
+    {
+      Market market;
+      EmptyMarket(market, 1);
+      state.ResumeTiming();
+      const NameRec name = NewNameRec("");
+      const PriceRec rec = NewPriceRec("");
+      for (int i = 0; i < state.range(0); ++i) {
+        int fd = ::open((market.HostData() + "/Names.dat").c_str(), O_RDWR | O_CREAT | O_CLOEXEC,
+                        0666);
+        if (::pwrite(fd, &name, sizeof(name), ::lseek(fd, 0, SEEK_END)) != ssize_t(sizeof(name)))
+          state.SkipWithError("no name");
+        ::close(fd);
+        fd = ::open((market.HostData() + "/" + Code(i) + ".WDT").c_str(),
+                    O_RDWR | O_CREAT | O_CLOEXEC, 0666);
+        if (::pwrite(fd, &rec, sizeof(rec), 0) != ssize_t(sizeof(rec)))
+          state.SkipWithError("no record");
+        ::close(fd);
+      }
+      state.PauseTiming();
+    }
+    state.ResumeTiming();
+  }
+  state.SetItemsProcessed(state.iterations() * state.range(0));
+}
+
 // Names of the market that no price file stands for yet.
 void UpdateNew(benchmark::State& state) {
   for (auto _ : state) {
     state.PauseTiming();
     {
       Market market;
-      std::filesystem::remove_all(market.HostData());
-      std::filesystem::create_directory(market.HostData());
-      market.PutDay(Date(0), int(state.range(0)));
+      EmptyMarket(market, int(state.range(0)));
       state.ResumeTiming();
       market.Update(1);
       state.PauseTiming();
@@ -154,15 +193,22 @@ void UpdateNew(benchmark::State& state) {
   state.SetItemsProcessed(state.iterations() * state.range(0));
 }
 
-BENCHMARK(UpdateFloor)->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateFloor, append, 0, 1)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(UpdateDay, append, kDays, kSecurities, 1)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(UpdateDay, replace, kDays - 1, kSecurities, 1)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(UpdateDay, insert_10_back, kDays - 10.5, kSecurities, 1)
     ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(UpdateDay, no_trades, kDays, 1, 5)
     ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateFloor, replace, 1, 0)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateDay, replace, kDays - 1, kSecurities, 1)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateFloor, insert_10_back, 10, 1)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateDay, insert_10_back, kDays - 10.5, kSecurities, 1)
+    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK(NewFloor)->Arg(1250)->Arg(2500)->Arg(5000)->Iterations(2)->Unit(
+    benchmark::kMillisecond);
 BENCHMARK(UpdateNew)->Arg(1250)->Arg(2500)->Arg(5000)->Iterations(2)->Unit(
     benchmark::kMillisecond);
 

@@ -389,15 +389,26 @@ bool IsFileCode(std::string_view code) {
   for (const char c : code) {
     const auto u = static_cast<unsigned char>(c);
     if (u < 0x21 || u == 0x7F || u >= 0x80) return false;
-    if (std::string_view("\\/:*?\"<>|,;=").find(c) != std::string_view::npos) return false;
+    switch (c) {
+      case '\\': case '/': case ':': case '*': case '?': case '"':
+      case '<': case '>': case '|': case ',': case ';': case '=': return false;
+      default: break;
+    }
   }
-  const std::string stem = UCase(code.substr(0, code.find('.')));
-  for (const char* device : {"CON", "PRN", "AUX", "NUL", "CONIN$", "CLOCK$"})
-    if (stem == device) return false;
-  if (stem.size() == 4 && (stem.rfind("COM", 0) == 0 || stem.rfind("LPT", 0) == 0) &&
-      stem[3] >= '1' && stem[3] <= '9')
+  const std::string_view stem = code.substr(0, code.find('.'));
+  for (const std::string_view device : {"CON", "PRN", "AUX", "NUL", "CONIN$", "CLOCK$"})
+    if (EqualNoCase(stem, device)) return false;
+  const std::string_view port = stem.substr(0, 3);
+  if (stem.size() == 4 && stem[3] >= '1' && stem[3] <= '9' &&
+      (EqualNoCase(port, "COM") || EqualNoCase(port, "LPT")))
     return false;
   return true;
+}
+
+std::string KeptCode(std::string code) {
+  if (code == "PRN") return "PRNX";
+  if (code == "AUX") return "1AUX";
+  return code;
 }
 
 std::string CodeFileName(std::string_view code, std::string_view extension) {

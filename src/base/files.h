@@ -95,6 +95,9 @@ std::string WithBackslash(std::string_view folder);
 // no path or wildcard character, no control byte, no device name ("NUL", "COM1"), no dots
 // at its end. Codes become file names only after this test.
 bool IsFileCode(std::string_view code);
+// The code under which a security is kept whose own can't be a file name: "PRNX" for "PRN",
+// "1AUX" for "AUX"; any other as it is. `code` is trimmed and in upper case.
+std::string KeptCode(std::string code);
 // Trimmed code + extension, as "ORE" and ".WDT" give "ORE.WDT". Error 52 unless IsFileCode.
 std::string CodeFileName(std::string_view code, std::string_view extension);
 

@@ -67,7 +67,19 @@ class RecordFile {
     if (last > count_) count_ = static_cast<std::int32_t>(last);
   }
 
-  void Append(const T& record) { Write(count_ + 1, record); }
+  // What a failing write leaves of the record is taken back.
+  void Append(const T& record) {
+    try {
+      Write(count_ + 1, record);
+    } catch (const RunTimeError&) {
+      try {
+        file_->Truncate(std::uint64_t(count_) * sizeof(T));
+      } catch (const RunTimeError&) {
+        // It does not count.
+      }
+      throw;
+    }
+  }
 
   // Cuts the file behind record n.
   void Truncate(std::int32_t n) {

@@ -22,7 +22,7 @@ void CheckName(const std::string& name) {
 
 int Import(const CommandLine& line, const std::vector<std::string>& sources,
            const ImportOptions& options) {
-  if (!options.Code.empty() && !IsFileCode(options.Code))
+  if (!options.Code.empty() && !IsFileCode(KeptCode(UCase(Trim(options.Code)))))
     throw UsageError("--code: \"" + options.Code + "\" is no code; it has 1 to 6 letters and digits");
   CheckName(options.Name);
   if (!options.Name.empty() && sources.size() > 1 && options.Code.empty())

@@ -16,7 +16,7 @@ void SaveTextPage(SettingsFile& file, const PageSettings& page);
 // How a list looks on paper. Places are shares of the width between the margins.
 struct TextPrintLayout {
   std::string heading;                     // "NAME FILE": on each page, in Font 1
-  std::string continued;                   // behind the heading from page 2 on: "  (cont)"
+  std::string continued = {};              // behind the heading from page 2 on: "  (cont)"
   std::string pageLabel = "Page  ";        // before the page's number
   double pageAt = 0.8;                     // where it stands
   std::vector<std::string> columns;        // headings of the columns; none: no such line

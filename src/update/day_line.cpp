@@ -1,5 +1,7 @@
 #include "update/day_line.h"
 
+#include <array>
+
 #include "base/dates.h"
 #include "base/files.h"
 #include "base/numbers.h"
@@ -11,12 +13,18 @@ namespace {
 
 constexpr size_t kLongestShown = 200;
 
-// Stands for the code that a line is filed under: some codes can't be file names.
-std::string FileCode(std::string_view field) {
-  std::string code = UCase(Trim(Trim(field).substr(0, 6)));
-  if (code == "PRN") return "PRNX";
-  if (code == "AUX") return "1AUX";
-  return code;
+using Fields = std::array<std::string_view, kOptionCommas + 1>;
+
+// Without memory of its own: every line of a market comes here, twice.
+Fields FieldsOf(std::string_view line) {
+  Fields fields;
+  for (std::string_view& field : fields) {
+    const size_t end = line.find(',');
+    field = line.substr(0, end);
+    if (end == std::string_view::npos) break;
+    line.remove_prefix(end + 1);
+  }
+  return fields;
 }
 
 bool IsExpiry(const CalendarDate& date, std::int32_t days) {
@@ -28,26 +36,26 @@ bool IsExpiry(const CalendarDate& date, std::int32_t days) {
 
 std::string ReadDayLine(std::string_view line, bool options, DayLine& day) {
   if (line.find('\0') != std::string_view::npos) return " The line is no text";
-  const auto fields = Split(line, ',');
+  const Fields fields = FieldsOf(line);
   day = {};
-  day.code = FileCode(fields.at(0));
+  day.code = KeptCode(UCase(Trim(Trim(fields[0]).substr(0, 6))));
   if (day.code.empty()) return {};
   if (!IsFileCode(day.code)) return " The code cannot be the name of a file";
-  day.date = Trim(fields.at(1));
+  day.date = Trim(fields[1]);
   const auto date = ParseFileDate(day.date);
   if (!date) return " The date is not a date yyyymmdd";
   try {
-    day.Open = CSng(Val(fields.at(2)));
-    day.High = CSng(Val(fields.at(3)));
-    day.Low = CSng(Val(fields.at(4)));
-    day.Close = CSng(Val(fields.at(5)));
-    day.Volume = CLng(Val(fields.at(6)));
+    day.Open = CSng(Val(fields[2]));
+    day.High = CSng(Val(fields[3]));
+    day.Low = CSng(Val(fields[4]));
+    day.Close = CSng(Val(fields[5]));
+    day.Volume = CLng(Val(fields[6]));
     if (options) {
-      day.days = CLng(Val(fields.at(7)));
-      day.OptType = Trim(fields.at(8));
+      day.days = CLng(Val(fields[7]));
+      day.OptType = Trim(fields[8]);
       if (!IsExpiry(*date, day.days)) return " The days to expiry are too many";
     } else {
-      const double spare = Val(fields.at(7));
+      const double spare = Val(fields[7]);
       day.hasSpare = spare != 0;
       day.spare = CLng(spare);
     }

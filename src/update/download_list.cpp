@@ -27,7 +27,10 @@ std::vector<std::string> FilesEndingIn(const Files& files, const std::string& fo
                                        std::string_view ending) {
   std::vector<std::string> out;
   for (const std::string& name : files.List(folder))
-    if (EndsWith(name, ending) && !files.IsFolder(folder + name)) out.push_back(name);
+    // A host's name may hold what parts the folders of a path: it would name another file.
+    if (EndsWith(name, ending) && name.find('\\') == std::string::npos &&
+        !files.IsFolder(folder + name))
+      out.push_back(name);
   return out;
 }
 

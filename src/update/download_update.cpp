@@ -75,11 +75,10 @@ class DayUpdate {
     if (run_.current.Rec.Code.raw()[0] == '\0') run_.current.Rec = NewNameRec("");
   }
 
-  // False when all or part of it was abandoned.
-  bool UpdateFromDownload();
+  UpdateEnd UpdateFromDownload();
 
  private:
-  bool WholeMarket();
+  bool WholeMarket(const WmPaths& lines);
   bool UpdateFile();
   void CheckData();
   void RemoveBlankLines();
@@ -94,7 +93,7 @@ class DayUpdate {
   void AddName(const DayLine& day);
   void NoTradePass();
   bool OptionLives(std::int32_t number, NameRec& rec);
-  void Step(int done, int total);
+  bool StopAsked(int done, int total);
 
   bool IsService(int service) const { return download_.DataService == service; }
   std::string_view ShownName() const { return NameOf(SelectedDownloadFile_); }
@@ -125,14 +124,13 @@ class DayUpdate {
   std::unordered_set<std::string> priceFiles_;  // "BHP.WDT" of TargetPath, upper case
 };
 
-void DayUpdate::Step(int done, int total) {
-  if (run_.display.Step(done, total)) return;
-  if (run_.dialogs.Ask("The update is not finished. Stop it ?", "Update", Buttons::kYesNo) ==
-      Answer::kYes)
-    throw Stopped();
+bool DayUpdate::StopAsked(int done, int total) {
+  return !run_.display.Step(done, total) &&
+         run_.dialogs.Ask("The update is not finished. Stop it ?", "Update", Buttons::kYesNo) ==
+             Answer::kYes;
 }
 
-bool DayUpdate::UpdateFromDownload() {
+UpdateEnd DayUpdate::UpdateFromDownload() {
   TargetPath_ = run_.settings.paths.CurrentDataPath;
   if (!IsService(1) && !download_.UpdateAll)
     for (const UpdateRow& row : ReadUpdateList(run_.files, run_.settings.paths.SystemPath))
@@ -140,39 +138,36 @@ bool DayUpdate::UpdateFromDownload() {
   run_.display.ShowSecond("");
 
   bool good = false;
+  std::string bulletins = run_.settings.paths.CurrentDataPath;
   if (IsService(3)) {
-    if (!WmPathsComplete(ReadWmPaths(run_.files, run_.settings.paths.SystemPath))) {
+    const WmPaths lines = ReadWmPaths(run_.files, run_.settings.paths.SystemPath);
+    if (!WmPathsComplete(lines)) {
       run_.dialogs.Message(
           "Separate destination directories for Whole Market data have not been defined. Select "
           "Paths option and define ALL data directories.",
           "W/M Paths");
-      return false;
+      return UpdateEnd::kNotBegun;
     }
-    good = WholeMarket();
+    bulletins = WithBackslash(Trim(lines[kWmAsx]));
+    good = WholeMarket(lines);
   } else {
     run_.display.ShowState("Updating ");
     if (!run_.files.CheckFile(SelectedDownloadFile_)) {
       run_.dialogs.Message("File does not exist", "Update");
-      return false;
+      return UpdateEnd::kNotBegun;
     }
     good = UpdateFile();
   }
 
   if (!MoreToCome_) run_.display.ShowSecond(" Data files updated with " + SelectedDownloadFile_);
   if (IsService(1) || IsService(3)) {
-    if (run_.CheckBulletins) {
-      const WmPaths lines = ReadWmPaths(run_.files, run_.settings.paths.SystemPath);
-      run_.CheckBulletins(IsService(3) ? WithBackslash(lines[kWmAsx])
-                                       : run_.settings.paths.CurrentDataPath,
-                          std::string(LastOf(baseName_, 7)));
-    }
+    if (run_.CheckBulletins) run_.CheckBulletins(bulletins, std::string(LastOf(baseName_, 7)));
     UpdateSecurityDetails(run_.files, download_);
   }
-  return good;
+  return good ? UpdateEnd::kUpdated : UpdateEnd::kAbandoned;
 }
 
-bool DayUpdate::WholeMarket() {
-  const WmPaths lines = ReadWmPaths(run_.files, run_.settings.paths.SystemPath);
+bool DayUpdate::WholeMarket(const WmPaths& lines) {
   // The first point of the whole path ends the base, even one in a folder's name.
   baseName_ = SelectedDownloadFile_.substr(0, SelectedDownloadFile_.find('.'));
   bool good = true;
@@ -212,14 +207,17 @@ bool DayUpdate::UpdateFile() {
   places_.clear();
   priceFiles_.clear();
   names_ = ReadNames(run_.files, TargetPath_);
+  places_.reserve(names_.size());
   for (size_t i = 0; i < names_.size(); ++i)
     places_.try_emplace(std::string(Trim(names_[i].Code.trimmed())), i);
   // Not the sorted listing: thousands of names are wanted in no order.
-  for (const std::string& name : run_.files.io().List(run_.files.HostPath(TargetPath_)))
+  const auto listed = run_.files.io().List(run_.files.HostPath(TargetPath_));
+  priceFiles_.reserve(listed.size());
+  for (const std::string& name : listed)
     if (std::string upper = UCase(name); upper.ends_with(".WDT"))
       priceFiles_.insert(std::move(upper));
   run_.current.NameCount = CInt(double(names_.size()));
-  run_.display.ShowFirst(" Updating  " + std::string(LastOf(SelectedDownloadFile_, 11)));
+  run_.display.ShowFirst(" Updating  " + std::string(LastOf(ShownName(), 11)));
 
   CheckData();
   if (UpdateMode_ == kModeAbandon) {
@@ -234,12 +232,12 @@ bool DayUpdate::UpdateFile() {
     if (append && (SourceId_ == 'S' || SourceId_ == 'F' || SourceId_ == 'P')) NoTradePass();
     return true;
   }
-  if (EqualNoCase(LastOf(SelectedDownloadFile_, 1), "D")) {
-    try {
-      run_.files.Rename(SelectedDownloadFile_, SelectedDownloadFile_ + "X");
-    } catch (const RunTimeError&) {
-      // It stays listed.
-    }
+  // A file of the internet that keeps the ending ".ASX" gets neither.
+  if (!EqualNoCase(LastOf(SelectedDownloadFile_, 1), "D")) return true;
+  try {
+    run_.files.Rename(SelectedDownloadFile_, SelectedDownloadFile_ + "X");
+  } catch (const RunTimeError&) {
+    // It stays listed.
   }
   if (!IsService(1) && append) NoTradePass();
   return true;
@@ -395,7 +393,7 @@ void DayUpdate::TakeLines() {
   DayLine day;
   while (lines.Next(line)) {
     if (lines.number() <= skipLines_) continue;
-    Step(lines.number(), total);
+    if (StopAsked(lines.number(), total)) throw Stopped();
     ReadDayLine(line, OptionsRun_, day);
     if (IsService(4) && download_.VolumeDivisor != 1) day.Volume /= download_.VolumeDivisor;
     if (day.code.empty()) continue;
@@ -450,7 +448,7 @@ void DayUpdate::AddName(const DayLine& day) {
   }
   {
     NameFile file(run_.files, NameFilePath(TargetPath_), OpenMode::kCreate);
-    file.Write(std::int32_t(names_.size()) + 1, rec);
+    file.Append(rec);
   }
   names_.push_back(rec);
   places_.try_emplace(day.code, names_.size() - 1);
@@ -476,15 +474,17 @@ bool DayUpdate::OptionLives(std::int32_t number, NameRec& rec) {
   return false;
 }
 
-// Every share that did not trade gets a flat record.
+// Every share that did not trade gets a flat record. The day is off the list by now and has no
+// second pass: a run that is to stop does so behind it.
 void DayUpdate::NoTradePass() {
   run_.display.ShowFirst("");
   run_.display.ShowSecond(" Checking stocks not traded");
   run_.display.ShowState("Checking no-trades");
   const double date = Val(lastDate_);
   const auto total = std::int32_t(names_.size());
+  bool stop = false;
   for (std::int32_t n = 1; n <= total; ++n) {
-    Step(n, total);
+    if (!stop) stop = StopAsked(n, total);
     NameRec& rec = names_[size_t(n - 1)];
     run_.current.Rec = rec;
     run_.current.NameRecNo = CInt(n);
@@ -505,18 +505,25 @@ void DayUpdate::NoTradePass() {
     flat.Open = flat.High = flat.Low = flat.Close = last.Close;
     file.Append(flat);
   }
+  if (stop) throw Stopped();
 }
 
+// Shown from the first record of a run to the last.
+class Running {
+ public:
+  explicit Running(UpdateDisplay& display) : display_(display) { display_.SetRunning(true); }
+  ~Running() { display_.SetRunning(false); }
+  Running(const Running&) = delete;
+  Running& operator=(const Running&) = delete;
+
+ private:
+  UpdateDisplay& display_;
+};
+
 UpdateEnd UpdateDay(const UpdateRun& run, const std::string& entry, bool MoreToCome) {
-  struct Running {
-    UpdateDisplay& display;
-    explicit Running(UpdateDisplay& d) : display(d) { display.SetRunning(true); }
-    ~Running() { display.SetRunning(false); }
-  } running(run.display);
   try {
     run.display.ShowDate(entry);
-    return DayUpdate(run, entry, MoreToCome).UpdateFromDownload() ? UpdateEnd::kUpdated
-                                                                  : UpdateEnd::kAbandoned;
+    return DayUpdate(run, entry, MoreToCome).UpdateFromDownload();
   } catch (const Stopped&) {
   } catch (const RunTimeError& e) {
     run.dialogs.Message(DownloadErrorText(e), "Error");
@@ -535,22 +542,33 @@ void ClearTexts(UpdateDisplay& display) {
 }  // namespace
 
 UpdateEnd UpdateOneDay(const UpdateRun& run, DownloadEntries& entries, size_t selected) {
-  const UpdateEnd end = UpdateDay(run, entries.at(selected), false);
+  UpdateEnd end;
+  {
+    const Running running(run.display);
+    end = UpdateDay(run, entries.at(selected), false);
+  }
   if (end == UpdateEnd::kUpdated)
     entries.erase(entries.begin() + std::ptrdiff_t(selected));
   ClearTexts(run.display);
-  if (end != UpdateEnd::kStopped) run.display.ShowState("FINISHED");
+  const bool finished = end == UpdateEnd::kUpdated || end == UpdateEnd::kAbandoned;
+  run.display.ShowState(finished ? "FINISHED" : "");
   return end;
 }
 
 UpdateEnd UpdateAllDays(const UpdateRun& run, const DownloadEntries& entries,
                         const std::function<void(size_t)>& select) {
   UpdateEnd all = UpdateEnd::kUpdated;
+  // Events are handled between the days too, and must not find the form at rest there.
+  const Running running(run.display);
   for (size_t i = 0; i < entries.size(); ++i) {
     if (select) select(i);
     const UpdateEnd end = UpdateDay(run, entries[i], i + 1 < entries.size());
-    if (end == UpdateEnd::kStopped) return end;
-    if (end == UpdateEnd::kAbandoned) all = end;
+    if (end == UpdateEnd::kStopped) {
+      all = end;
+      run.display.ShowState("");
+      break;
+    }
+    if (end != UpdateEnd::kUpdated) all = UpdateEnd::kAbandoned;
     run.dialogs.Yield();
   }
   ClearTexts(run.display);

@@ -61,6 +61,7 @@ struct UpdateRun {
 enum class UpdateEnd {
   kUpdated,
   kAbandoned,  // told; some or all of the day's files were not taken
+  kNotBegun,   // told; the file is not there, or service 3 lacks a folder: the form stays
   kStopped,    // by the user, or by a failure that was told; what was written stays
 };
 

@@ -280,15 +280,15 @@ class Reader {
 
   Group& GroupFor(std::string_view written) {
     if (group_ && written == written_) return *group_;
-    std::string code = UCase(written);
+    std::string code = KeptCode(UCase(written));
     if (layout_.place[kCode] >= 0) {
       if (!IsFileCode(code)) throw BadRow(Shown(written) + " is no code");
       parsed_.columnCodes.insert(code);
     }
     if (!options_.Code.empty()) {
-      code = UCase(Trim(options_.Code));
+      code = KeptCode(UCase(Trim(options_.Code)));
     } else if (layout_.place[kCode] < 0) {
-      code = UCase(std::filesystem::path(hostFile_).stem().string());
+      code = KeptCode(UCase(std::filesystem::path(hostFile_).stem().string()));
     }
     // No row of the file could be taken then.
     if (!IsFileCode(code))

@@ -73,7 +73,7 @@ MasterRec RecordOf(std::string_view line) {
   if (fields.size() > 6) throw BadLine("more than 6 fields");
   for (const char c : line)
     if (static_cast<unsigned char>(c) < 0x20) throw BadLine("a control character");
-  const std::string code = UCase(field(0));
+  const std::string code = KeptCode(UCase(field(0)));
   if (!IsFileCode(code)) throw BadLine("no code of 1 to 6 letters and digits");
   CheckNumber(field(1), 1, "the type is no digit");
   CheckNumber(field(2), 2, "the category is no number from 0 to 99");

@@ -54,6 +54,17 @@ void SetFields(PriceRec& rec, const DayLine& day, std::int16_t RecType, float to
   rec.RecSpare.set("");
 }
 
+// After a write that failed half-way, as on a full disk: what was written over needs no new room.
+void PutBack(PriceFile& file, std::int32_t position, std::span<const PriceRec> old,
+             std::int32_t count) {
+  try {
+    if (!old.empty()) file.WriteRun(position, old);
+    file.Truncate(count);
+  } catch (const RunTimeError&) {
+    // The first failure is the one to tell.
+  }
+}
+
 }  // namespace
 
 RecordPlace FindPlace(const PriceFile& file, std::string_view date, std::int16_t UpdateMode) {
@@ -87,11 +98,12 @@ void WriteDay(PriceFile& file, const DayLine& day, std::int16_t RecType, std::in
   const std::int32_t position = place.position;
   if (!place.overwrite && count >= kMostDays) throw RunTimeError(kOverflow);
 
-  // The records from the place on, as they are to be.
+  // The records from the place on, as they are and as they are to be.
+  std::vector<PriceRec> old;
   std::vector<PriceRec> tail(1, NewPriceRec(""));
   if (position <= count) {
     const bool rest = !place.overwrite || totals;
-    std::vector<PriceRec> old(rest ? size_t(count - position + 1) : 1);
+    old.resize(rest ? size_t(count - position + 1) : 1);
     file.ReadRun(position, old);
     if (place.overwrite) tail[0] = old[0];  // keeps what its kind does not take from the line
     tail.insert(tail.end(), old.begin() + (place.overwrite ? 1 : 0), old.end());
@@ -105,7 +117,12 @@ void WriteDay(PriceFile& file, const DayLine& day, std::int16_t RecType, std::in
       total = rec.Close;
     }
   }
-  file.WriteRun(position, tail);
+  try {
+    file.WriteRun(position, tail);
+  } catch (const RunTimeError&) {
+    PutBack(file, position, old, count);
+    throw;
+  }
 
   // The final volume of a day comes a day late.
   if (options || !day.hasSpare || position <= 1) return;

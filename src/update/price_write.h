@@ -27,9 +27,9 @@ struct RecordPlace {
 RecordPlace FindPlace(const PriceFile& file, std::string_view date, std::int16_t UpdateMode);
 
 // Writes the line into the price file by kind of data. Kind 3 keeps a running total. All
-// that changes from the record's place on is written in one go, so that a file is old or new;
-// the late volume of the day before follows. Error 6 for a file of 32,767 records that would
-// grow.
+// that changes from the record's place on is written in one go, so that a file is old or new,
+// and is put back when that fails half-way; the late volume of the day before follows. Error 6
+// for a file of 32,767 records that would grow.
 void WriteDay(PriceFile& file, const DayLine& day, std::int16_t RecType, std::int16_t UpdateMode,
               bool options);
 

@@ -32,12 +32,16 @@ Power PowerOf(std::string_view text) {
   return CInt(value);
 }
 
-// Of the first record with this code.
-Power SearchFile(const Files& files, const std::string& path, std::string_view code) {
-  if (!files.CheckFile(path)) return std::nullopt;
-  for (const MainfileRec& rec : RecordFile<MainfileRec>(files, path).ReadAll())
-    if (UCase(Trim(rec.Code.trimmed())) == code) return PowerOf(rec.VolumePower.raw());
-  return std::nullopt;
+// Of the first record with this code. True when there is one, whatever its power.
+bool SearchFile(const Files& files, const std::string& path, std::string_view code,
+                Power& power) {
+  if (!files.CheckFile(path)) return false;
+  for (const MainfileRec& rec : RecordFile<MainfileRec>(files, path).ReadAll()) {
+    if (UCase(Trim(rec.Code.trimmed())) != code) continue;
+    power = PowerOf(rec.VolumePower.raw());
+    return true;
+  }
+  return false;
 }
 
 // The third field of a line of WMDef.Lst, from 0.
@@ -55,10 +59,16 @@ Power DefinedPower(const Files& files, const std::string& folder, int number) {
 
 Power PowerFor(const Files& files, const Settings& settings, std::string_view code) {
   const std::string folder = WithBackslash(Trim(settings.download.ServiceSystem));
+  const auto find = [&](const char* name, std::string_view wanted) {
+    Power power;
+    SearchFile(files, folder + name, wanted, power);
+    return power;
+  };
   if (settings.download.DataService == 1) {
+    Power power;
     for (const char* name : {"Mainfile.ASX", "Mainfile.OVS", "Mainfile.SFE"})
-      if (const Power power = SearchFile(files, folder + name, code)) return power;
-    return std::nullopt;
+      if (SearchFile(files, folder + name, code, power)) break;
+    return power;
   }
   if (settings.download.DataService != 3) return std::nullopt;
   const WmPaths lines = ReadWmPaths(files, settings.paths.SystemPath);
@@ -68,10 +78,10 @@ Power PowerFor(const Files& files, const Settings& settings, std::string_view co
     switch (i) {
       case kWmAsx: return DefinedPower(files, folder, 0);
       case kWmIndices: return DefinedPower(files, folder, 1);
-      case kWmFutures: return SearchFile(files, folder + "WMMain.SFE", code.substr(0, 2));
-      case kWmOverseas: return SearchFile(files, folder + "WMMain.OVS", code);
-      case kWmOptions: return SearchFile(files, folder + "WMMain.OPT", code.substr(0, 3));
-      default: return SearchFile(files, folder + "Mainfile.ASX", code);
+      case kWmFutures: return find("WMMain.SFE", code.substr(0, 2));
+      case kWmOverseas: return find("WMMain.OVS", code);
+      case kWmOptions: return find("WMMain.OPT", code.substr(0, 3));
+      default: return find("Mainfile.ASX", code);
     }
   }
   return std::nullopt;

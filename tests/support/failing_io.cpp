@@ -1,5 +1,7 @@
 #include "tests/support/failing_io.h"
 
+#include <csignal>
+
 namespace kora::test {
 
 class FailingIo::File : public HostFile {
@@ -34,6 +36,7 @@ class FailingIo::File : public HostFile {
 
 bool FailingIo::Fails() {
   ++calls;
+  if (kills && calls == failAt) std::raise(SIGKILL);
   return failAt > 0 && (calls == failAt || (lasting && calls > failAt));
 }
 

@@ -22,6 +22,7 @@ class FailingIo : public Io {
   int error = kDiskFull;   // raised at the failing call
   bool lasting = false;    // every later change fails too, as after a kill
   bool torn = false;       // a failing WriteAt leaves the first half of its bytes
+  bool kills = false;      // the process dies in place of the failing call
   int failReadAt = 0;      // the same for ReadAt and opening for reading; 0: never
   int readError = kDeviceError;
 
@@ -42,7 +43,7 @@ class FailingIo : public Io {
 
  private:
   class File;
-  bool Fails();
+  bool Fails();  // counts the call
   void Change() {
     if (Fails()) throw RunTimeError(error);
   }

@@ -41,6 +41,13 @@ TEST_F(DownloadListTest, PassesOverOtherFilesAndFolders) {
   EXPECT_EQ(entries, DownloadEntries{"16SEP98.d"});
 }
 
+TEST_F(DownloadListTest, PassesOverNamesThatLeadOutOfTheFolder) {
+  home.Put(kHostSystem + "KEEP.d", "");
+  Wait({"..\\KEEP.d", "16SEP98.d"});
+  List();
+  EXPECT_EQ(entries, DownloadEntries{"16SEP98.d"});
+}
+
 TEST_F(DownloadListTest, NothingWaits) {
   EXPECT_EQ(List(), ListResult::kNothingWaits);
   EXPECT_EQ(LastSaid(), " There are no downloaded files to update. ");

@@ -35,6 +35,8 @@ TEST_F(DownloadUpdate, AppendsARecordAndTakesTheFileOffTheList) {
   EXPECT_TRUE(entries.empty());
   EXPECT_TRUE(dialogs.said.empty());
   EXPECT_FALSE(display.running);
+  // No folder before the name, though the last 11 characters of the path have one.
+  EXPECT_EQ(display.firsts.front(), " Updating  15SEP98.d");
 }
 
 TEST_F(DownloadUpdate, GivesANewSecurityANameRecord) {
@@ -304,7 +306,44 @@ TEST_F(DownloadUpdate, ReplacingHasNoNoTradePass) {
   EXPECT_EQ(PricesOf("OLD").size(), 1u);
 }
 
+// The pass goes with the renaming: an internet file that keeps the ending ".ASX" has neither.
+TEST_F(DownloadUpdate, AFileOfTheAsxFormIsNotRenamedAndHasNoNoTradePass) {
+  settings.download.DataService = 4;
+  Names({Security("ORE"), Security("ZAP")});
+  for (const char* code : {"ORE", "ZAP"}) Prices(code, {Flat("19980914", 1)});
+  Download("980915.ASX", "ORE,19980915,2,2,2,2,1,0\r\nORE,19980916,3,3,3,3,1,0\r\n");
+  entries = {"980915.ASX"};
+  EXPECT_EQ(UpdateOneDay(Run(), entries, 0), UpdateEnd::kUpdated);
+  EXPECT_EQ(Shown("ORE"), "19980914 1 0; 19980915 2 1; 19980916 3 1");
+  EXPECT_EQ(Shown("ZAP"), "19980914 1 0");
+  EXPECT_TRUE(Waits("980915.ASX"));
+  EXPECT_FALSE(Waits("980915.ASXX"));
+}
+
+TEST_F(DownloadUpdate, AFileOfTheAsxFormIsListedOnlyOnceItIsRenamed) {
+  settings.download.DataService = 4;
+  settings.download.InternetDLfmt = "DDMMMYY.D";
+  Download("980915.ASX", kBothDays);
+  EXPECT_EQ(BuildDownloadList(home.files(), settings.download, dialogs, entries),
+            ListResult::kNothingWaits);
+  settings.download.InternetDLfmt = "YYMMDD.ASX";
+  ASSERT_EQ(BuildDownloadList(home.files(), settings.download, dialogs, entries),
+            ListResult::kFilled);
+  EXPECT_EQ(entries, DownloadEntries{"15SEP98.d"});
+  EXPECT_EQ(UpdateOneDay(Run(), entries, 0), UpdateEnd::kUpdated);
+  EXPECT_TRUE(Waits("15SEP98.dX"));
+}
+
 // ---- Files that are refused
+
+TEST_F(DownloadUpdate, AFileThatIsGoneIsToldAndNothingIsFinished) {
+  entries = {"15SEP98.d"};
+  EXPECT_EQ(UpdateOneDay(Run(), entries, 0), UpdateEnd::kNotBegun);
+  EXPECT_EQ(LastTitle(), "Update");
+  EXPECT_EQ(LastSaid(), "File does not exist");
+  EXPECT_EQ(entries, DownloadEntries{"15SEP98.d"});
+  EXPECT_EQ(display.states, (std::vector<std::string>{"Updating ", ""}));
+}
 
 TEST_F(DownloadUpdate, ATextBelowEightBytesIsNoData) {
   Download("15SEP98.d", "A,,,,,,");
@@ -440,6 +479,22 @@ TEST_F(DownloadUpdate, UpdateAllGoesThroughTheDatesInOrder) {
   EXPECT_FALSE(Waits("02OCT98.d"));
 }
 
+// Events are handled between the days as well.
+TEST_F(DownloadUpdate, UpdateAllRunsWithoutARestBetweenTheDays) {
+  struct Watched : ScriptedDialogs {
+    const KeptDisplay* display = nullptr;
+    std::vector<bool> running;
+    void Yield() override { running.push_back(display->running); }
+  } watched;
+  watched.display = &display;
+  Download("30SEP98.d", "ORE,19980930,1,1,1,1,1,0\n");
+  Download("01OCT98.d", "ORE,19981001,2,2,2,2,2,0\n");
+  const UpdateRun run{home.files(), settings, current, watched, clock, display, {}};
+  EXPECT_EQ(UpdateAllDays(run, {"30SEP98.d", "01OCT98.d"}), UpdateEnd::kUpdated);
+  EXPECT_EQ(watched.running, (std::vector<bool>{true, true}));
+  EXPECT_FALSE(display.running);
+}
+
 TEST_F(DownloadUpdate, ARefusedDateDoesNotEndUpdateAll) {
   Download("30SEP98.d", "no data at all");
   Download("01OCT98.d", "ORE,19981001,2,2,2,2,2,0\n");
@@ -456,6 +511,21 @@ TEST_F(DownloadUpdate, AskingToStopInTheMiddleStops) {
   EXPECT_EQ(Shown("ORE"), "19980915 1 100");
   EXPECT_FALSE(home.Exists(kHostData + "ZAP.WDT"));
   EXPECT_TRUE(Waits("15SEP98.d"));
+}
+
+TEST_F(DownloadUpdate, StoppingAmongTheFlatRecordsIsDoneBehindThem) {
+  Names({Security("ORE"), Security("ZAP"), Security("OLD")});
+  for (const char* code : {"ORE", "ZAP", "OLD"}) Prices(code, {Flat("19980914", 1)});
+  Download("16SEP98.d", "ORE,19980916,1,1,1,1,1,0\n");
+  Download("15SEP98.d", "ORE,19980915,1,1,1,1,1,0\n");
+  display.stopAt = 2;  // the first share of the pass
+  dialogs.answers = {Answer::kYes};
+  EXPECT_EQ(Update(), UpdateEnd::kStopped);
+  EXPECT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(Shown("ZAP"), "19980914 1 0; 19980915 1 0");
+  EXPECT_EQ(Shown("OLD"), "19980914 1 0; 19980915 1 0");
+  EXPECT_TRUE(Waits("15SEP98.dX"));
+  EXPECT_TRUE(Waits("16SEP98.d"));
 }
 
 TEST_F(DownloadUpdate, NoToStoppingGoesOn) {
@@ -550,8 +620,11 @@ TEST_F(WholeMarket, ARefusedFileStaysListedAndTheOthersAreTaken) {
 
 TEST_F(WholeMarket, WantsAllFolders) {
   home.Put(kHostSystem + "WMPaths.lst", "c:\\a\\\r\n\r\nc:\\a\\\r\nc:\\a\\\r\nc:\\a\\\r\n0\r\nc:\\a\\\r\n");
-  EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kAbandoned);
+  EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kNotBegun);
   EXPECT_EQ(LastTitle(), "W/M Paths");
+  EXPECT_EQ(LastSaid(),
+            "Separate destination directories for Whole Market data have not been defined. Select "
+            "Paths option and define ALL data directories.");
   EXPECT_TRUE(Waits("15SEP98.d"));
 }
 
@@ -577,6 +650,39 @@ TEST_F(WholeMarket, OptionsThatExpireAreMarked) {
   EXPECT_EQ(Shown("LIVE", dosOf("opt")), "19980914 1 0; 19980915 1 0");
 }
 
+// Two digits read back stand for 2000 to 2029 and 1930 to 1999.
+TEST_F(WholeMarket, ExpiriesOfTheNextCenturyLive) {
+  std::vector<NameRec> names{Security("LIVE"), Security("DEAD")};
+  names[0].OtherDetails.set("0P1/6/29");
+  names[1].OtherDetails.set("0P1/6/30");
+  Names(names, hostOf("opt"));
+  Download("15SEP98.dop", "NEW,19980915,6,6,6,6,6,10,C\n");
+  ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
+  EXPECT_EQ(NamesOf(dosOf("opt"))[0].Name.trimmed(), "");
+  EXPECT_EQ(NamesOf(dosOf("opt"))[1].Name.trimmed(), "**EXPIRED**");
+}
+
+TEST_F(WholeMarket, TellsWhatItIsDoing) {
+  Names({Security("OLD")}, hostOf("sfe"));
+  Prices("OLD", {Flat("19980914", 1)}, hostOf("sfe"));
+  Download("15SEP98.das", "SUM,19980915,1,1,1,1,1,0\n");
+  Download("15SEP98.dsf", "SPI,19980915,5,5,5,5,5,0\n");
+  ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
+  EXPECT_EQ(display.states, (std::vector<std::string>{"Updating ASX ", "Updating FUTURES ",
+                                                      "Checking no-trades", "Updated", "FINISHED"}));
+  EXPECT_EQ(display.targets, (std::vector<std::string>{dosOf("sum"), dosOf("sfe")}));
+  EXPECT_EQ(display.firsts,
+            (std::vector<std::string>{" Updating  15SEP98.das", " Updating  SUM",
+                                      " Updating  15SEP98.dsf", " Updating  SPI", "",
+                                      " Checking OLD", ""}));
+  EXPECT_EQ(display.seconds,
+            (std::vector<std::string>{
+                "", " Checking file format - wait", " Data OK - updating", " Created record for SUM",
+                " Checking file format - wait", " Data OK - updating", " Created record for SPI",
+                " Checking stocks not traded",
+                " Data files updated with c:\\korawin\\download\\15SEP98.dsf", ""}));
+}
+
 TEST_F(WholeMarket, ExtraStocksIndicesAndOverseasHaveNoNoTradePass) {
   for (const char* n : {"sum", "idx", "ovs", "sfe"}) {
     Names({Security("OLD")}, hostOf(n));
@@ -598,155 +704,6 @@ TEST_F(WholeMarket, CallsTheBulletinsWithTheBaseName) {
   UpdateOneDay(run, entries, 0);
   EXPECT_EQ(path, dosOf("asx"));
   EXPECT_EQ(base, "15SEP98");
-}
-
-// ---- Runs that die
-
-namespace {
-
-// Six securities on which an undisturbed run appends, makes and corrects.
-class CutRun : public UpdateFixture {
- protected:
-  CutRun() { settings.download.DataService = 1; }
-
-  void LayDown() {
-    std::filesystem::remove_all(home.path() + "/drive_c/korawin");
-    home.files().MakeFolder(kDown);
-    Names({Security("ORE"), Security("XAD", 1, kAdvanceDecline), Security("ZAP")});
-    Prices("ORE", {Flat("19980911", 1, 10), Flat("19980914", 1, 10)});
-    Prices("ZAP", {Flat("19980911", 2, 20), Flat("19980914", 2, 20)});
-    Prices("XAD", {Day("19980911", 0, 5, 3, 2), Day("19980914", 0, 4, 5, 1)});
-    Download("15SEP98.d",
-             "ORE,19980915,1,2,1,1,11,12\nXAD,19980915,0,10,4,0,0,0\nNEW1,19980915,7,7,7,7,7,0\n"
-             "ZAP,19980915,3,3,3,3,21,22\nNEW2,19980915,8,8,8,8,8,0\n");
-  }
-};
-
-}  // namespace
-
-TEST_F(CutRun, TakesUpAgainWhereverItWasKilled) {
-  LayDown();
-  ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
-  const auto whole = Everything();
-  ASSERT_EQ(whole.count("korawin/download/15SEP98.dX"), 1u);
-  int cuts = 0;
-  for (int at = 1;; ++at) {
-    LayDown();
-    const auto before = Everything();
-    current = {};
-    Files cutFiles(home.path(), io);
-    io.Reset(at);
-    io.lasting = true;
-    DownloadEntries waiting{"15SEP98.d"};
-    const UpdateRun run{cutFiles, settings, current, dialogs, clock, display, {}};
-    UpdateOneDay(run, waiting, 0);
-    const bool cut = io.calls >= at;
-    io.Reset();
-    if (!cut) break;
-    ++cuts;
-    const auto after = Everything();
-    for (const auto& [name, bytes] : before) {
-      ASSERT_EQ(after.count(name), 1u) << name << " at " << at;
-      EXPECT_GE(after.at(name).size(), bytes.size()) << name << " at " << at;
-    }
-    for (const auto& [name, bytes] : after) {
-      const size_t record = name.ends_with(".WDT") ? 50 : name.ends_with("Names.dat") ? 96 : 1;
-      EXPECT_EQ(bytes.size() % record, 0u) << name << " at " << at;
-    }
-    EXPECT_TRUE(Waits("15SEP98.d"));
-    current = {};
-    dialogs.said.clear();
-    ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated) << at;
-    EXPECT_EQ(Everything(), whole) << at;
-  }
-  // ORE 2 writes, XAD 1, ZAP 2, each new one 4 (name file opened and written, price file made
-  // and written), the rename 1.
-  EXPECT_EQ(cuts, 14);
-}
-
-TEST_F(CutRun, AWriteThatIsTornAtTheEndOfAFileIsNoRecord) {
-  LayDown();
-  ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
-  const auto whole = Everything();
-  LayDown();
-  current = {};
-  io.Reset(1);
-  io.lasting = io.torn = true;
-  DownloadEntries waiting{"15SEP98.d"};
-  UpdateOneDay(Run(), waiting, 0);
-  io.Reset();
-  EXPECT_EQ(home.Get(kHostData + "ORE.WDT").size(), 125u);
-  EXPECT_EQ(PricesOf("ORE").size(), 2u);
-  current = {};
-  ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
-  EXPECT_EQ(Everything(), whole);
-}
-
-TEST_F(CutRun, AnInsertedDayIsWholeOrNotThere) {
-  const std::string text = "ORE,19980912,1,2,1,1,11,0\nXAD,19980912,0,10,4,0,0,0\nX,19980912,1,1,1,1,1,0";
-  LayDown();
-  Download("15SEP98.d", text);
-  ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
-  const std::string ore = home.Get(kHostData + "ORE.WDT"), xad = home.Get(kHostData + "XAD.WDT");
-  ASSERT_EQ(Shown("XAD"), "19980912 6 0; 19980911 8 0; 19980914 7 0");  // in front: one earlier
-  for (int at = 1;; ++at) {
-    LayDown();
-    Download("15SEP98.d", text);
-    const std::string oldOre = home.Get(kHostData + "ORE.WDT");
-    const std::string oldXad = home.Get(kHostData + "XAD.WDT");
-    io.Reset(at);
-    io.lasting = true;
-    DownloadEntries waiting{"15SEP98.d"};
-    UpdateOneDay(Run(), waiting, 0);
-    const bool cut = io.calls >= at;
-    io.Reset();
-    if (!cut) break;
-    const std::string nowOre = home.Get(kHostData + "ORE.WDT");
-    const std::string nowXad = home.Get(kHostData + "XAD.WDT");
-    EXPECT_TRUE(nowOre == oldOre || nowOre == ore) << at;
-    EXPECT_TRUE(nowXad == oldXad || nowXad == xad) << at;
-  }
-}
-
-TEST_F(CutRun, AFullDiskIsToldAndTheFileStaysListed) {
-  LayDown();
-  io.failAt = io.calls + 3;
-  EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kStopped);
-  EXPECT_EQ(LastTitle(), "Error");
-  EXPECT_EQ(LastSaid(), "There is an unexpected error - Disk full");
-  EXPECT_TRUE(Waits("15SEP98.d"));
-}
-
-// The file is off the list once its lines are written; flat records that were not reached stay
-// away.
-TEST_F(CutRun, ARunThatDiesAmongTheFlatRecordsLeavesWholeFiles) {
-  settings.download.DataService = 5;
-  const std::string text = "ORE,19980915,1,2,1,1,11,0\nORE,19980915,1,2,1,1,11,0\n";
-  int renamed = 0;
-  for (int at = 1;; ++at) {
-    LayDown();
-    Download("15SEP98.d", text);
-    const auto before = Everything();
-    current = {};
-    io.Reset(at);
-    io.lasting = true;
-    DownloadEntries waiting{"15SEP98.d"};
-    UpdateOneDay(Run(), waiting, 0);
-    const bool cut = io.calls >= at;
-    io.Reset();
-    if (!cut) break;
-    EXPECT_NE(Waits("15SEP98.d"), Waits("15SEP98.dX")) << at;
-    if (Waits("15SEP98.dX")) {
-      ++renamed;
-      EXPECT_EQ(PricesOf("ORE").size(), 4u);
-    }
-    for (const auto& [name, bytes] : Everything()) {
-      if (!name.ends_with(".WDT")) continue;
-      EXPECT_EQ(bytes.size() % 50, 0u) << name << " at " << at;
-      EXPECT_EQ(bytes.substr(0, before.at(name).size()), before.at(name)) << name << " at " << at;
-    }
-  }
-  EXPECT_EQ(renamed, 1);  // ZAP alone did not trade
 }
 
 // ---- Damaged files

@@ -132,6 +132,13 @@ TEST_F(ImportTest, TakesTheCodeFromItsColumnUnderAnyOfItsNames) {
   EXPECT_EQ(float(Prices("BBB")[0].Close), 2.0f);
 }
 
+TEST_F(ImportTest, CodesThatCannotBeFileNamesAreKeptAsTheDailyUpdateKeepsThem) {
+  ASSERT_TRUE(Import("x.csv", "prn,20240102,1,1,1,1,7,0\nAUX,20240102,2,2,2,2,8,0\n"));
+  ASSERT_TRUE(Import("prn.csv", "Date,Close\n20240103,3\n"));
+  EXPECT_EQ(Prices("PRNX").size(), 2u);
+  EXPECT_EQ(Prices("1AUX").size(), 1u);
+}
+
 TEST_F(ImportTest, TheCodeOptionStandsForTheFilesOneSecurity) {
   ImportOptions options;
   options.Code = "new";

@@ -23,7 +23,7 @@ class MasterTest : public UpdateFixture {
       "ZAP,5,50,,Zap Index,\n"
       "ore,4,1,121,Ore Mining Ltd,Ord\n"
       "BHP,4,22,7,Big Hole,\n"
-      "1AUX,4,,,Auxiliary,\n"
+      "aux,4,,,Auxiliary,\n"  // kept as 1AUX, as its prices are
       "OAK,4,3,341,Oak,\n";
 };
 

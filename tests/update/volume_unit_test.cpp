@@ -35,12 +35,12 @@ TEST_F(VolumeUnitTest, HasATextForEachPower) {
 TEST_F(VolumeUnitTest, ServiceOneSearchesThreeFilesInOrder) {
   Main("Mainfile.ASX", Record("BHP", "-1") + Record("ORE", "+3"));
   Main("Mainfile.OVS", Record("BHP", "4") + Record("DJI", "1") + Record("ODD", "99"));
-  Main("Mainfile.SFE", Record("SPI", "0") + "torn");
+  Main("Mainfile.SFE", Record("SPI", "0") + Record("ODD", "1") + "torn");
   EXPECT_EQ(Unit("bhp "), "'000");
   EXPECT_EQ(Unit("ORE"), "x000");
   EXPECT_EQ(Unit("DJI"), "'0");
   EXPECT_EQ(Unit("SPI"), "'00");
-  EXPECT_EQ(Unit("ODD"), "");
+  EXPECT_EQ(Unit("ODD"), "");  // the first hit ends the search, and 99 has no text
   EXPECT_EQ(Unit("NONE"), "");
 }
 

@@ -179,5 +179,35 @@ TEST_F(DLListTest, ClosingInTheMiddleAsks) {
   EXPECT_TRUE(Find<QPushButton>(form.get(), "Command1")->isEnabled());
 }
 
+TEST_F(DLListTest, ARunThatFailsLeavesTheRestListed) {
+  Download("02MAR26.d", DayText("20260302"));
+  Download("03MAR26.d", DayText("20260303") + "DDD,20260303,1,1,1,1,1,0\r\n");
+  session->files.MakeFolder("c:\\korawin\\data\\DDD.WDT");  // where a file is wanted
+  ASSERT_TRUE(Open());
+  Click(form.get(), "Command3");
+  EXPECT_EQ(dialogs.said.back().title, "Error");
+  EXPECT_EQ(dialogs.said.back().text,
+            "There is a file access problem. Check directory paths option.");
+  EXPECT_EQ(Count("CCC"), 30);
+  EXPECT_TRUE(form->isVisible());
+  EXPECT_EQ(Listed(), QStringList{"03MAR26.d"});
+  EXPECT_EQ(LabelText("Label2"), "");
+  EXPECT_EQ(LabelText("Label8(0)"), "");
+  EXPECT_TRUE(Find<QPushButton>(form.get(), "Command3")->isEnabled());
+  EXPECT_FALSE(Find<QProgressBar>(form.get(), "ProgressBar1")->isVisible());
+  EXPECT_FALSE(dialogs.busy);
+}
+
+TEST_F(DLListTest, AFileThatIsGoneLeavesTheForm) {
+  Download("02MAR26.d", DayText("20260302"));
+  ASSERT_TRUE(Open());
+  session->files.Remove("c:\\korawin\\download\\02MAR26.d");
+  Click(form.get(), "Command1");
+  EXPECT_EQ(dialogs.said.back().text, "File does not exist");
+  EXPECT_TRUE(form->isVisible());
+  EXPECT_EQ(Listed(), QStringList{"02MAR26.d"});
+  EXPECT_NE(LabelText("Label2"), "FINISHED");
+}
+
 }  // namespace
 }  // namespace kora

@@ -88,7 +88,7 @@ void Page::Show() {
   sheet_->SetBox(QRectF(-double(frame.PrintLeft), -double(frame.PrintTop), frame.width,
                         frame.height));
   sheet_->SetContent([this](QPainter& painter) { PaintChart(painter); });
-  label1_->setText("Size " + FormText(Format(double(setup_.PrintEnlarge), "0.0")));
+  label1_->setText("Size " + ToQt(Format(double(setup_.PrintEnlarge), "0.0")));
 }
 
 void Page::PaintChart(QPainter& painter) const {

@@ -23,14 +23,14 @@ constexpr std::string_view kTitle = "Print Chart";
 PrintKora::PrintKora(const PrintServices& services, PrintChoice& choice, QWidget* parent)
     : QDialog(parent), services_(services), choice_(choice) {
   setObjectName("PrintKora");
-  setWindowTitle(FormText(kTitle));
+  setWindowTitle(ToQt(kTitle));
   choice_.PrintCancelled = true;
   combo1_ = NewPrinterList(this, services_.printer);
   text1_ = new QSpinBox(this);
   text1_->setObjectName("Text1");
   text1_->setRange(1, kMostCopies);
   text2_ = NewField(this, "Text2", 36, 250);
-  text2_->setText(FormText(choice_.pdfFile));
+  text2_->setText(ToQt(choice_.pdfFile));
 
   auto* grid = new QGridLayout(this);
   grid->addWidget(NewLabel(this, "P&rinter", combo1_), 0, 0);
@@ -53,7 +53,7 @@ PrintKora::PrintKora(const PrintServices& services, PrintChoice& choice, QWidget
 }
 
 bool PrintKora::IsPdf() const {
-  return combo1_->currentText() == FormText(QtPrinter::kPdfPrinter);
+  return combo1_->currentText() == ToQt(QtPrinter::kPdfPrinter);
 }
 
 // A file has no copies, and a queue no file.

@@ -20,8 +20,8 @@ PrinterSetup::PrinterSetup(const PrintServices& services, QWidget* parent)
   combo1_ = NewPrinterList(this, printer);
   combo2_ = new QComboBox(this);
   combo2_->setObjectName("Combo2");
-  for (const std::string& name : printer.PaperNames()) combo2_->addItem(FormText(name));
-  combo2_->setCurrentIndex(combo2_->findText(FormText(printer.PaperName())));
+  for (const std::string& name : printer.PaperNames()) combo2_->addItem(ToQt(name));
+  combo2_->setCurrentIndex(combo2_->findText(ToQt(printer.PaperName())));
   auto* portrait = new QRadioButton("Por&trait", this);
   portrait->setObjectName("Option1(0)");
   landscape_ = new QRadioButton("&Landscape", this);
@@ -50,7 +50,7 @@ void PrinterSetup::Save() {
   Printer& printer = services_.printer;
   try {
     printer.SetDevice(combo1_->currentText().toStdString());
-    if (combo2_->currentText() != FormText(printer.PaperName()))
+    if (combo2_->currentText() != ToQt(printer.PaperName()))
       printer.SetPaper(combo2_->currentText().toStdString());
     printer.SetOrientation(landscape_->isChecked() ? kLandscape : kPortrait);
   } catch (const RunTimeError& e) {

@@ -10,9 +10,9 @@ namespace kora {
 QComboBox* NewPrinterList(QWidget* form, const Printer& printer) {
   auto* list = new QComboBox(form);
   list->setObjectName("Combo1");
-  for (const std::string& name : printer.DeviceNames()) list->addItem(FormText(name));
-  int chosen = list->findText(FormText(printer.DeviceName()));
-  if (chosen < 0) chosen = list->findText(FormText(QtPrinter::kPdfPrinter));
+  for (const std::string& name : printer.DeviceNames()) list->addItem(ToQt(name));
+  int chosen = list->findText(ToQt(printer.DeviceName()));
+  if (chosen < 0) chosen = list->findText(ToQt(QtPrinter::kPdfPrinter));
   list->setCurrentIndex(chosen);
   return list;
 }

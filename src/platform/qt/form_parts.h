@@ -20,8 +20,6 @@ namespace kora {
 // What the small forms are put together from. Widgets belong to `form`; `name` becomes the
 // objectName, by which tests and screen readers find a control.
 
-inline QString FormText(std::string_view text) { return ToQt(text); }
-
 // A box of about `columns` digits or letters that takes `limit` characters.
 QLineEdit* NewField(QWidget* form, const QString& name, int columns, int limit);
 // A box of whole numbers from `least` to `most`.

@@ -14,6 +14,7 @@
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
+#include "platform/qt/to_qt.h"
 #include "shell/forms/AbtKora.h"
 #include "shell/forms/HelpWindow.h"
 #include "shell/main_menu.h"
@@ -24,10 +25,6 @@ namespace {
 
 constexpr std::string_view kTitle = "KORA Charting 7F";
 constexpr int kTwipsPerPixel = 15;
-
-QString ToQt(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 }  // namespace
 

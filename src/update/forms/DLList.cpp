@@ -7,14 +7,12 @@
 #include <QProgressBar>
 #include <QPushButton>
 
+#include "platform/qt/to_qt.h"
+
 namespace kora {
 namespace {
 
 constexpr int kRefreshMs = 40;
-
-QString Text(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 }  // namespace
 
@@ -35,8 +33,8 @@ DLList::DLList(DLListServices services, QWidget* parent)
   label5_ = AddLabel("Label5");
   label8_[0] = AddLabel("Label8(0)");
   label8_[1] = AddLabel("Label8(1)");
-  label4_->setText(Text(download.DLPath));
-  label5_->setText(Text(services_.settings.paths.CurrentDataPath));
+  label4_->setText(ToQt(download.DLPath));
+  label5_->setText(ToQt(services_.settings.paths.CurrentDataPath));
   label8_[0]->setMinimumWidth(fontMetrics().averageCharWidth() * 50);
   bar_ = new QProgressBar(this);
   bar_->setObjectName("ProgressBar1");
@@ -103,7 +101,7 @@ bool DLList::Fill() {
 
 void DLList::FillList(int selected) {
   list1_->clear();
-  for (const std::string& entry : entries_) list1_->addItem(Text(entry));
+  for (const std::string& entry : entries_) list1_->addItem(ToQt(entry));
   list1_->setCurrentRow(std::min(selected, list1_->count() - 1));
 }
 
@@ -116,9 +114,13 @@ void DLList::UpdateDay() {
   const int selected = list1_->currentRow();
   if (running_ || selected < 0) return;
   const UpdateEnd end = UpdateOneDay(Run(), entries_, size_t(selected));
+  if (end == UpdateEnd::kStopped) {
+    ListAgain();
+    return;
+  }
   const bool last = end == UpdateEnd::kAbandoned && selected == list1_->count() - 1;
   FillList(end == UpdateEnd::kUpdated ? 0 : selected);
-  if (end != UpdateEnd::kStopped && (entries_.empty() || last)) Leave();
+  if (entries_.empty() || last) Leave();
 }
 
 void DLList::UpdateAll() {
@@ -129,9 +131,15 @@ void DLList::UpdateAll() {
     Leave();
     return;
   }
-  // Some dates may be done.
-  BuildDownloadList(services_.files, services_.settings.download, services_.dialogs, entries_);
+  ListAgain();
+}
+
+// Behind a run that stopped: what was done before is off the list.
+void DLList::ListAgain() {
+  const ListResult result = BuildDownloadList(services_.files, services_.settings.download,
+                                              services_.dialogs, entries_);
   FillList(0);
+  if (result == ListResult::kNothingWaits) Leave();
 }
 
 void DLList::RemoveDate() {
@@ -156,11 +164,11 @@ void DLList::reject() {
   Leave();
 }
 
-void DLList::ShowState(std::string_view text) { label2_->setText(Text(text)); }
-void DLList::ShowTarget(std::string_view text) { label5_->setText(Text(text)); }
+void DLList::ShowState(std::string_view text) { label2_->setText(ToQt(text)); }
+void DLList::ShowTarget(std::string_view text) { label5_->setText(ToQt(text)); }
 
 void DLList::ShowDate(std::string_view text) {
-  label3_->setText(Text(text));
+  label3_->setText(ToQt(text));
   ShowTexts();
 }
 
@@ -170,8 +178,8 @@ void DLList::ShowSecond(std::string_view text) {
 }
 
 void DLList::ShowTexts() {
-  label8_[0]->setText(Text(first_));
-  label8_[1]->setText(Text(second_));
+  label8_[0]->setText(ToQt(first_));
+  label8_[1]->setText(ToQt(second_));
 }
 
 void DLList::SetRunning(bool running) {
@@ -190,7 +198,7 @@ void DLList::SetRunning(bool running) {
 }
 
 bool DLList::Step(int done, int total) {
-  if (shown_.elapsed() >= kRefreshMs || done == 1) {
+  if (shown_.elapsed() >= kRefreshMs) {
     bar_->setRange(0, total);
     bar_->setValue(done);
     ShowTexts();

@@ -47,6 +47,7 @@ class DLList : public QDialog, private UpdateDisplay {
   QLabel* AddLabel(const char* name);
   QPushButton* AddButton(const char* name, const char* caption);
   void FillList(int selected);
+  void ListAgain();
   void UpdateDay();
   void UpdateAll();
   void RemoveDate();

@@ -43,7 +43,7 @@ DLWizard::DLWizard(UpdateFormServices services, QWidget* parent)
     const int i = kOrder[row];
     auto*& text = texts_[size_t(i)];
     auto* label = new QLabel(kFolders[i], this);
-    text = new QLineEdit(Shown(folders[size_t(i)]), this);
+    text = new QLineEdit(ToQt(folders[size_t(i)]), this);
     text->setObjectName(QString("Text1(%1)").arg(i));
     text->setMinimumWidth(fontMetrics().averageCharWidth() * 40);
     label->setBuddy(text);

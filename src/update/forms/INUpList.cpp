@@ -42,7 +42,7 @@ class CodeDelegate : public QStyledItemDelegate {
   void setModelData(QWidget* editor, QAbstractItemModel* model,
                     const QModelIndex& index) const override {
     const std::string code = static_cast<QLineEdit*>(editor)->text().toStdString();
-    model->setData(index, Shown(UCase(code)));
+    model->setData(index, ToQt(UCase(code)));
   }
 };
 
@@ -157,12 +157,12 @@ void INUpList::LoadMaster() {
     master_.Records.clear();  // shows as missing
   }
   if (master_.Records.empty()) {
-    for (const std::string_view line : MasterMissingLines()) list1_->addItem(Shown(line));
+    for (const std::string_view line : MasterMissingLines()) list1_->addItem(ToQt(line));
     return;
   }
   for (size_t i = 1; i <= master_.Records.size(); ++i) {
     const MasterEntry entry = master_.Entry(std::int32_t(i));
-    auto* item = new QListWidgetItem(Shown(PadRight(entry.code, 6) + "  " + entry.name), list1_);
+    auto* item = new QListWidgetItem(ToQt(PadRight(entry.code, 6) + "  " + entry.name), list1_);
     item->setFlags(item->flags() | Qt::ItemIsUserCheckable);
     item->setCheckState(Qt::Unchecked);
   }
@@ -174,10 +174,10 @@ void INUpList::AddRow(const UpdateRow& row) {
 }
 
 void INUpList::SetRow(int at, const UpdateRow& row) {
-  ss1_->setItem(at, 0, new QTableWidgetItem(Shown(row.code)));
+  ss1_->setItem(at, 0, new QTableWidgetItem(ToQt(row.code)));
   ss1_->setItem(at, 1, new QTableWidgetItem(
-                           row.code.empty() ? QString() : Shown(Format(double(row.category), "##0"))));
-  ss1_->setItem(at, 2, new QTableWidgetItem(Shown(row.name)));
+                           row.code.empty() ? QString() : ToQt(Format(double(row.category), "##0"))));
+  ss1_->setItem(at, 2, new QTableWidgetItem(ToQt(row.name)));
 }
 
 std::vector<UpdateRow> INUpList::Rows() const {

@@ -33,18 +33,18 @@ ModDetails::ModDetails(UpdateFormServices services, QWidget* parent)
 
   combo1_ = new QComboBox(this);
   combo1_->setObjectName("Combo1");
-  for (const ServiceEntry& entry : ServiceEntries()) combo1_->addItem(Shown(entry.text));
+  for (const ServiceEntry& entry : ServiceEntries()) combo1_->addItem(ToQt(entry.text));
   combo1_->setCurrentIndex(ServiceIndex(download.DataService));
-  text1_ = new QLineEdit(Shown(download.DLPath), this);
+  text1_ = new QLineEdit(ToQt(download.DLPath), this);
   text1_->setObjectName("Text1");
   text1_->setMinimumWidth(fontMetrics().averageCharWidth() * 45);
   text1_->setMaxLength(kLongestPath);
   combo2_ = new QComboBox(this);
   combo2_->setObjectName("Combo2");
-  for (const FormatEntry& entry : FormatEntries()) combo2_->addItem(Shown(entry.text));
+  for (const FormatEntry& entry : FormatEntries()) combo2_->addItem(ToQt(entry.text));
   combo2_->setCurrentIndex(FormatIndex(download.InternetDLfmt));
   format_ = FormatToStore(download.InternetDLfmt);
-  text2_ = new QLineEdit(Shown(Str(download.VolumeDivisor)), this);
+  text2_ = new QLineEdit(ToQt(Str(download.VolumeDivisor)), this);
   text2_->setObjectName("Text2");
   text2_->installEventFilter(this);
 
@@ -114,7 +114,7 @@ void ModDetails::ShowService() {
 
 void ModDetails::ProposeFolder() {
   if (!Trim(text1_->text().toStdString()).empty()) return;
-  text1_->setText(Shown(ProposedDownloadFolder(services_.files,
+  text1_->setText(ToQt(ProposedDownloadFolder(services_.files,
                                                ServiceOfIndex(combo1_->currentIndex()),
                                                services_.settings.paths.SystemPath)));
 }

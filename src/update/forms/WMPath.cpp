@@ -27,7 +27,7 @@ WMPath::WMPath(UpdateFormServices services, QWidget* parent)
   for (int i = 0; i < 6; ++i) {
     const auto at = size_t(i);
     auto* label = new QLabel(kCaptions[i], this);
-    texts_[at] = new QLineEdit(Shown(lines[order[i]]), this);
+    texts_[at] = new QLineEdit(ToQt(lines[order[i]]), this);
     texts_[at]->setObjectName(QString("Text%1").arg(i + 1));
     texts_[at]->setMinimumWidth(fontMetrics().averageCharWidth() * 45);
     label->setBuddy(texts_[at]);

@@ -17,7 +17,7 @@ QToolButton* NewLocateButton(const UpdateFormServices& services, const QString& 
       [&files = services.files, &dialogs = services.dialogs, box, what = std::move(what), form] {
         auto* locate = new Locate(
             files, dialogs, what(),
-            [box](const std::string& folder) { box->setText(Shown(folder)); }, form);
+            [box](const std::string& folder) { box->setText(ToQt(folder)); }, form);
         locate->setAttribute(Qt::WA_DeleteOnClose);
         locate->open();
       });

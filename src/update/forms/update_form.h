@@ -1,10 +1,10 @@
 #pragma once
 
-#include <QString>
 #include <functional>
 #include <string>
 
 #include "platform/dialogs.h"
+#include "platform/qt/to_qt.h"
 #include "settings/locate.h"
 #include "settings/settings.h"
 #include "settings/text_print_out.h"
@@ -26,10 +26,6 @@ struct UpdateFormServices {
   // Asks how to print a list and prints it; what fails is told. Without it the entry is greyed.
   std::function<void(const TextTable&, QWidget* over)> print = {};
 };
-
-inline QString Shown(std::string_view text) {
-  return QString::fromUtf8(text.data(), qsizetype(text.size()));
-}
 
 // The button beside `box` that opens `Locate` on what `what` says at that time; the folder goes
 // into the box.
