@@ -16,14 +16,13 @@ namespace kora {
 namespace {
 
 constexpr int kMostCopies = 99;
-constexpr std::string_view kTitle = "Print Chart";
 
 }  // namespace
 
 PrintKora::PrintKora(const PrintServices& services, PrintChoice& choice, QWidget* parent)
     : QDialog(parent), services_(services), choice_(choice) {
   setObjectName("PrintKora");
-  setWindowTitle(ToQt(kTitle));
+  setWindowTitle("Print Chart");
   choice_.PrintCancelled = true;
   combo1_ = NewPrinterList(this, services_.printer);
   text1_ = new QSpinBox(this);
@@ -69,9 +68,9 @@ void PrintKora::Proceed() {
   if (IsPdf()) {
     file = std::string(Trim(text2_->text().toStdString()));
     if (file.size() < 5 || !LCase(file).ends_with(".pdf"))
-      return dialogs.Message("File name invalid", kTitle);
+      return dialogs.Message("File name invalid", windowTitle().toStdString());
     if (services_.files.CheckFile(file) &&
-        dialogs.Ask(file + " already exists - Overwrite", kTitle, Buttons::kOkCancel) !=
+        dialogs.Ask(file + " already exists - Overwrite", windowTitle().toStdString(), Buttons::kOkCancel) !=
             Answer::kOk)
       return;
   }

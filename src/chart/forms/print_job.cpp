@@ -20,13 +20,14 @@ void PrintCopies(const PrintServices& s, const PrintChoice& choice, const PrintJ
 
 // Asks, and goes on with `print` unless it was cancelled, then with `done`.
 void Ask(const PrintServices& services, PrintChoice& choice, QWidget* parent,
-         std::function<void()> print, std::function<void()> done = {}) {
+         const QString& title, std::function<void()> print, std::function<void()> done = {}) {
   std::int16_t& orient = services.settings.page.Orient;
   if (orient != kPortrait && orient != kLandscape) {
     orient = kPortrait;
     services.printer.SetOrientation(orient);
   }
   auto* form = new PrintKora(services, choice, parent);
+  form->setWindowTitle(title);
   form->setAttribute(Qt::WA_DeleteOnClose);
   QObject::connect(form, &QDialog::finished, form, [&choice, print = std::move(print),
                                                       done = std::move(done),
@@ -48,13 +49,13 @@ void Ask(const PrintServices& services, PrintChoice& choice, QWidget* parent,
 void AskAndPrint(const PrintServices& services, PrintChoice& choice, PrintJob job,
                  QWidget* parent) {
   const auto done = job.done;
-  Ask(services, choice, parent,
+  Ask(services, choice, parent, "Print Chart",
       [services, &choice, job = std::move(job)] { PrintCopies(services, choice, job); }, done);
 }
 
 void AskAndPrintTable(const PrintServices& services, PrintChoice& choice, TextTable table,
                       QWidget* parent) {
-  Ask(services, choice, parent, [services, &choice, table = std::move(table)] {
+  Ask(services, choice, parent, "Print List", [services, &choice, table = std::move(table)] {
     try {
       for (int copy = 0; copy < choice.PrintCopies; ++copy)
         PrintTable(services.printer, services.settings.fonts, services.settings.page, table);
