@@ -32,7 +32,8 @@ install_missing() {
   fi
   echo "Installing ${missing[*]}"
   as_root+=(env DEBIAN_FRONTEND=noninteractive apt-get -qq)
-  quietly "${as_root[@]}" update
+  # A source that is out of reach need not be the one that is wanted: the installation decides.
+  quietly "${as_root[@]}" update || echo "Going on with the lists of packages that are here" >&2
   quietly "${as_root[@]}" install -y --no-install-recommends "${missing[@]}"
 }
 
