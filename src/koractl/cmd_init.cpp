@@ -4,20 +4,30 @@
 namespace kora {
 namespace {
 
-int Init(const CommandLine& line) {
-  Run run(line);
-  Session& session = run.session;
-  if (session.ini.Exists())
-    run.Abandon("There is an installation in " + session.files.home() + " already.", "KORA");
-  Paths paths;
-  SetDefaultPaths(paths, "C:");
+// What a broken-off or hand-made installation left is never emptied.
+void MakeFolders(const Files& files, const Paths& paths) {
   for (const std::string& folder :
        {paths.SystemPath, paths.CurrentDataPath, paths.ChartBackupPath, paths.PfmDataPath,
         paths.PfmBackupPath, paths.SystemPath + "download\\"})
-    session.files.MakeFolder(folder);
-  // What a broken-off or hand-made installation left is never emptied.
-  session.files.Open(NameFilePath(paths.CurrentDataPath), OpenMode::kCreate);
-  session.files.Open(paths.SystemPath + "IndClass.dat", OpenMode::kCreate);
+    files.MakeFolder(folder);
+  files.Open(NameFilePath(paths.CurrentDataPath), OpenMode::kCreate);
+  files.Open(paths.SystemPath + "IndClass.dat", OpenMode::kCreate);
+}
+
+int Init(const CommandLine& line) {
+  Run run(line);
+  Session& session = run.session;
+  if (session.ini.Exists()) {
+    // The program with windows, started on an empty home, leaves settings alone.
+    run.Open();
+    if (session.files.CheckFile(NameFilePath(run.dataPath())))
+      run.Abandon("There is an installation in " + session.files.home() + " already.", "KORA");
+    MakeFolders(session.files, session.settings.paths);
+    return kDone;
+  }
+  Paths paths;
+  SetDefaultPaths(paths, "C:");
+  MakeFolders(session.files, paths);
   // The settings file last: it is what makes a folder an installation.
   WriteDefaultSettings(session.ini);
   if (!session.ini.Exists())

@@ -116,6 +116,15 @@ TEST_F(KoractlTest, InitMakesAnEmptyInstallationAndNeverOverwritesOne) {
   ExpectAbandoned({"demo"}, "already");
 }
 
+TEST_F(KoractlTest, InitCompletesAHomeThatHasSettingsAlone) {
+  const std::string ini = "[KoraPaths]\r\nSystem=c:\\korawin\\\r\nChtData=c:\\mine\\\r\n";
+  home.Put("kora/Kora.ini", ini);
+  EXPECT_EQ(Out({"init"}), "");
+  EXPECT_TRUE(home.Exists("kora/drive_c/mine/Names.dat"));
+  EXPECT_EQ(home.Get("kora/Kora.ini"), ini);
+  ExpectAbandoned({"init"}, "already");
+}
+
 TEST_F(KoractlTest, InitKeepsTheNameFileOfAHomeWithoutSettings) {
   const std::string name(96, 'x');
   PutData("Names.dat", name);
