@@ -1,0 +1,105 @@
+#include <gtest/gtest.h>
+
+#include "chart/chart_state.h"
+#include "tests/chart/composer_fixture.h"
+
+// Rules of composition that show in single lines of the script. The surface is 638 x 452: top
+// 45, bottom 429, right 631; with volume the plot ends at 386 (0.9 * 429 = 386.1) and the panel
+// lies from there to 429.
+
+using namespace kora;
+using kora::test::ComposerFixture;
+using Lines = std::vector<std::string>;
+
+namespace {
+
+// Days from Monday 1 January 2024, each flat at 10 with a range of 9 to 11, with these volumes.
+void SetVolumes(ComposerFixture& f, std::initializer_list<std::int32_t> volumes) {
+  f.days.clear();
+  f.Days("20240101", int(volumes.size()));
+  size_t i = 0;
+  for (const std::int32_t volume : volumes) f.days[i++].Volume = volume;
+}
+
+// The values of the volume panel, from the bottom up.
+Lines PanelValues(const ComposerFixture& f) {
+  Lines out;
+  for (const std::string& line : f.Lines('S')) {
+    const auto fields = Split(line, ',');
+    for (const char* y : {"425", "414", "403", "392"})  // 4 above 429, 418, 407 and 396
+      if (fields[3] == y && fields[4].find_first_not_of("0123456789") == std::string_view::npos)
+        out.emplace_back(fields[4]);
+  }
+  return out;
+}
+
+}  // namespace
+
+// ---- logarithmic volumes
+
+// ln 1 is 0; 43 units for ln 10000. 100 lies half-way: 429 - 21.5 = 407.5, down to 407.
+TEST(LogVolumeTest, VolumesStandByTheirLogarithmsFromTheLeastToTheLargest) {
+  ComposerFixture f;
+  f.request.LogBars = f.request.LogVolume = true;
+  SetVolumes(f, {1, 100, 1000, 10000});
+  ASSERT_TRUE(f.Compose());
+  EXPECT_FLOAT_EQ(f.chart.Volume.VolLogBase, 0);
+  EXPECT_TRUE(f.Wrote("H,42,429,42,429,22"));
+  EXPECT_TRUE(f.Wrote("H,44,429,44,407,22"));
+  EXPECT_TRUE(f.Wrote("H,46,429,46,396,22"));  // 429 - 32.25
+  // Each 11 units up, e ^ (11 / 43 * 9.21034) = 10.55 times as much: 1, 10.55, 111.3, 1174.3.
+  EXPECT_EQ(PanelValues(f), (Lines{"1", "11", "110", "1200"}));
+}
+
+// VolHeight and the factor of 3 of a line belong to the arithmetic panel.
+TEST(LogVolumeTest, MultipleOfTheMeanHasNoPartInIt) {
+  for (const char style : {'B', 'C', 'L'}) {
+    ComposerFixture f;
+    f.request.ChartStyle = style;
+    f.request.LogBars = f.request.LogLines = f.request.LogVolume = true;
+    f.request.VolHeight = 3;
+    SetVolumes(f, {1, 100, 1000, 10000});
+    ASSERT_TRUE(f.Compose());
+    EXPECT_TRUE(f.Wrote("H,44,429,44,407,22")) << style;
+    EXPECT_TRUE(f.Wrote("H,46,429,46,396,22")) << style;
+  }
+}
+
+// The base stays ln 100 = 4.605170 from the first chart. 43 units are then ln 1000, and
+// 1000 is 429 - 14.33, 10000 is 429 - 28.67. With ln 1000 it would stand at 429, with 0 at 403.
+TEST(LogVolumeTest, ArithmeticPricesKeepTheBaseOfTheChartBefore) {
+  ComposerFixture f;
+  f.request.LogBars = f.request.LogVolume = true;
+  SetVolumes(f, {100, 1000, 10000});
+  ASSERT_TRUE(f.Compose());
+  EXPECT_FLOAT_EQ(f.chart.Volume.VolLogBase, 4.6051702f);
+  f.request.LogBars = false;
+  SetVolumes(f, {1000, 10000, 100000});
+  ASSERT_TRUE(f.Compose());
+  EXPECT_FLOAT_EQ(f.chart.Volume.VolLogBase, 4.6051702f);
+  EXPECT_TRUE(f.Wrote("H,42,429,42,414,22"));
+  EXPECT_TRUE(f.Wrote("H,44,429,44,400,22"));
+  // The values are turned back from the least volume itself: 1000 * e ^ (11 / 43 * 6.907755) =
+  // 5854, 34268 and 200597.
+  EXPECT_EQ(PanelValues(f), (Lines{"1000", "5900", "34300", "200600"}));
+  f.request.LogBars = true;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_FLOAT_EQ(f.chart.Volume.VolLogBase, 6.9077553f);  // ln 1000
+}
+
+// Lines have their own switch: LogBars makes no logarithmic line chart.
+TEST(LogVolumeTest, LineTakesTheBaseWhereLinesAreLogarithmic) {
+  ComposerFixture f;
+  f.request.ChartStyle = 'L';
+  f.request.LogBars = f.request.LogVolume = true;
+  SetVolumes(f, {100, 1000, 10000});
+  ASSERT_TRUE(f.Compose());
+  // Base 0: 100 is half-way to 10000.
+  EXPECT_EQ(f.chart.Volume.VolLogBase, 0);
+  EXPECT_TRUE(f.Wrote("H,42,429,42,407,22"));
+  f.request.LogLines = true;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_FLOAT_EQ(f.chart.Volume.VolLogBase, 4.6051702f);
+  // 43 units are ln 100: 1000 is half-way.
+  EXPECT_TRUE(f.Wrote("H,44,429,44,407,22"));
+}
