@@ -103,3 +103,61 @@ TEST(LogVolumeTest, LineTakesTheBaseWhereLinesAreLogarithmic) {
   // 43 units are ln 100: 1000 is half-way.
   EXPECT_TRUE(f.Wrote("H,44,429,44,407,22"));
 }
+
+// ---- the wide surface of the multi-oscillator view
+
+// 2100 / 2 = 1050 records back from 2000. 1050 * 2 + 120.
+TEST(MultiOscTest, PlotIs2100WideAndTheSurfaceHoldsItsRecordsAnd120More) {
+  ComposerFixture f;
+  f.request.MultiOscOn = -1;
+  f.Days("20180101", 2000);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.PlotWidth, 2100);
+  EXPECT_EQ(f.chart.Bars.FirstDataRec, 950);
+  EXPECT_EQ(f.chart.Bars.BarCount, 1050);
+  EXPECT_EQ(f.price.Width(), 2220);
+  EXPECT_EQ(f.chart.LastBarX, 42 + 1051 * 2);
+  // The frame was laid out before the surface grew.
+  EXPECT_EQ(f.chart.ChartRight, 631);
+}
+
+TEST(MultiOscTest, BlankSpaceTakesNothingFromIt) {
+  ComposerFixture f;
+  f.request.MultiOscOn = -1;
+  f.request.BlankSpace = 300;
+  f.Days("20180101", 2000);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.PlotWidth, 2100);
+  EXPECT_EQ(f.chart.Bars.FirstDataRec, 950);
+  EXPECT_EQ(f.price.Width(), 2220);
+}
+
+TEST(MultiOscTest, FewRecordsMakeANarrowSurface) {
+  ComposerFixture f;
+  f.request.MultiOscOn = -1;
+  f.request.BarSpacing = 4;
+  f.Days("20240101", 30);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.Bars.FirstDataRec, 1);
+  EXPECT_EQ(f.price.Width(), 29 * 4 + 120);
+}
+
+// The surface counts records, not bars: 2100 / 10 * 4.75 = 997.5, half to even 998.
+TEST(MultiOscTest, WeeklyChartStillCountsRecords) {
+  ComposerFixture f;
+  f.request.MultiOscOn = -1;
+  f.request.ChartPeriod = "W";
+  f.request.BarSpacing = 10;
+  f.Days("20180101", 2000);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.Bars.FirstDataRec, 1002);
+  EXPECT_EQ(f.price.Width(), 998 * 10 + 120);
+}
+
+TEST(MultiOscTest, SurfaceOfANormalChartKeepsItsWidth) {
+  ComposerFixture f;
+  f.Days("20180101", 2000);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.PlotWidth, 589);
+  EXPECT_EQ(f.price.Width(), 638);
+}
