@@ -161,3 +161,38 @@ TEST(MultiOscTest, SurfaceOfANormalChartKeepsItsWidth) {
   EXPECT_EQ(f.chart.PlotWidth, 589);
   EXPECT_EQ(f.price.Width(), 638);
 }
+
+// ---- the script in print mode
+
+// 8.8 to 11.4 in steps of 0.2. In bold 8.25, 11 units, "8.80" is 1.946 * 11 = 21.4 wide and
+// "10.00" 2.502 * 11 = 27.5: 21 and 28. 10 stands at 252.
+TEST(ScriptPrintModeTest, TickLabelsStandWiderApartInTheScriptAlone) {
+  ComposerFixture f;
+  f.Day("20240315", 10, 11, 9, 10);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("S,8.25,16,423,8.80,27"));  // 42 - 5 - 21, 429 - 6
+  EXPECT_TRUE(f.Wrote("S,8.25,9,246,10.00,27"));
+  f.request.ScriptPrintMode = true;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("S,8.25,1,417,8.80,27"));   // 42 - 20 - 21, 429 - 12
+  EXPECT_TRUE(f.Wrote("S,8.25,-6,240,10.00,27"));
+  EXPECT_FALSE(f.Wrote("S,8.25,16,423,8.80,27"));
+  EXPECT_TRUE(f.price.Has("text 8.25 b 16,423 8.80 27"));
+  EXPECT_TRUE(f.price.Has("text 8.25 b 9,246 10.00 27"));
+  EXPECT_TRUE(f.Wrote("L,42,429,35,429,16"));  // the tick stays
+}
+
+// x = 42 + 5 * days since 15 November: December 16, January 47.
+TEST(ScriptPrintModeTest, LettersOfTheMonthsTakeTheSizeOfFont2AndYearsDoNot) {
+  ComposerFixture f;
+  f.fonts.Font2Size = 9.75;
+  f.request.BarSpacing = 5;
+  f.Days("20231115", 60);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("T,8.25,122,431,D,27"));
+  f.request.ScriptPrintMode = true;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("T,9.75,122,431,D,27"));
+  EXPECT_TRUE(f.Wrote("T,8.25,277,431,2024,27"));
+  EXPECT_TRUE(f.price.Has("text 8.25 122,431 D 27"));
+}
