@@ -196,3 +196,34 @@ TEST(ScriptPrintModeTest, LettersOfTheMonthsTakeTheSizeOfFont2AndYearsDoNot) {
   EXPECT_TRUE(f.Wrote("T,8.25,277,431,2024,27"));
   EXPECT_TRUE(f.price.Has("text 8.25 122,431 D 27"));
 }
+
+// ---- a scale from nothing
+
+// High 0.08, Low 0.002, closer than 0.15: 0.084 * 1.2 = 0.1008, 0.101; 0.0019 * 0.9 = 0.00171,
+// 0.002, no step of 0.005, so 0.001. Steps of 0.005 over 0.1 on 384 units, 0.000260417 a unit.
+// Ticks stand at 0.005 and 0.01: 429 - 15.36 and 429 - 34.56 (0.006 would be 429 - 19.2). The
+// half steps are counted from 0.001: 0.0035 and 0.0085, 429 - 9.6 and 429 - 28.8.
+TEST(ScaleFromNothingTest, TicksAreMultiplesOfTheStepAndHalfStepsCountFromTheBottom) {
+  ComposerFixture f;
+  f.request.GridLines = f.request.HalfGrid = true;
+  f.request.MovingGrid = false;
+  f.Day("20240315", 0.05f, 0.08f, 0.002f, 0.05f);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_FLOAT_EQ(f.chart.Scale.ScaleLow, 0.001f);
+  EXPECT_FLOAT_EQ(f.chart.Scale.GridStep, 0.005f);
+  EXPECT_TRUE(f.Wrote("L,42,429,35,429,16"));
+  EXPECT_TRUE(f.Wrote("L,42,414,35,414,16"));
+  EXPECT_TRUE(f.Wrote("L,42,394,35,394,16"));
+  const Lines grid = f.Lines('V');
+  ASSERT_GE(grid.size(), 4u);
+  EXPECT_EQ(grid[0], "V,42,414,631,414,35");
+  EXPECT_EQ(grid[1], "V,42,419,631,419,35");
+  EXPECT_EQ(grid[2], "V,42,394,631,394,35");
+  EXPECT_EQ(grid[3], "V,42,400,631,400,35");
+  // The bottom keeps its own value; 20 steps thin from the seventh on.
+  std::string labels;
+  for (const std::string& line : f.Lines('S'))
+    if (const auto fields = Split(line, ','); fields[4].starts_with('.'))
+      labels += std::string(fields[4]) + " ";
+  EXPECT_EQ(labels.substr(0, 25), ".001 .005 .01 .015 .02 .0");
+}
