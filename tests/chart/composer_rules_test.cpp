@@ -227,3 +227,66 @@ TEST(ScaleFromNothingTest, TicksAreMultiplesOfTheStepAndHalfStepsCountFromTheBot
       labels += std::string(fields[4]) + " ";
   EXPECT_EQ(labels.substr(0, 25), ".001 .005 .01 .015 .02 .0");
 }
+
+// ---- the lower of two charts
+
+// Upper: top 2, bottom 207; with volume 186 (186.3). P = round(207 - 186 * 1.03) = 15, 3000 / 15
+// = 200 a unit, so 3000 stands at 207 - 10. 2.6 on 184 units: y(11) = 186 - 155.69, y(9) =
+// 186 - 14.15.
+// Lower: top 230, bottom 429; with volume 386. P = 31, 96.774 a unit, so 6000 stands at
+// 429 - 51.67, above the panel. 2.6 on 156 units: y(11) = 386 - 132, y(9) = 386 - 12.
+TEST(TwoChartsVolumeTest, EachHalfHasItsVolumePanelAndALongerLowerChartStartsAtTheLeft) {
+  ComposerFixture f;
+  f.request.VolHeight = 2;
+  SetVolumes(f, {1000, 3000});
+  f.chart.TwoCharts = true;
+  f.chart.ChartSlot = 1;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.UpperBarCount, 1);
+  EXPECT_TRUE(f.Wrote("B,42,186,631,207,16"));
+  EXPECT_TRUE(f.Wrote("B,42,2,631,186,16"));
+  EXPECT_TRUE(f.Wrote("H,44,207,44,197,22"));
+  EXPECT_TRUE(f.Wrote("H,42,30,42,172,18"));
+  EXPECT_TRUE(f.Wrote("L,42,207,42,212,27"));  // the date tick hangs from the panel
+
+  SetVolumes(f, {1000, 1000, 1000, 1000, 6000});
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.chart.FirstBarX, 42);
+  EXPECT_EQ(f.chart.LastBarX, 42 + 5 * 2);
+  EXPECT_EQ(f.chart.UpperBarCount, 1);
+  EXPECT_EQ(f.chart.VolTop, 386);
+  EXPECT_EQ(f.chart.VolBottom, 429);
+  EXPECT_TRUE(f.Wrote("B,42,386,631,429,16"));
+  EXPECT_TRUE(f.Wrote("B,42,230,631,386,16"));
+  EXPECT_TRUE(f.Wrote("H,50,429,50,377,22"));
+  EXPECT_TRUE(f.Wrote("H,42,254,42,374,18"));
+  EXPECT_TRUE(f.Wrote("L,42,429,42,434,27"));
+  EXPECT_TRUE(f.Wrote("T,8.25,380,250,Closing Price : 10.00  (10.00),27"));
+  EXPECT_TRUE(f.Wrote("Z,7,601,220,KORA,27"));
+  EXPECT_EQ(f.script.text().find("ARITHMETIC"), std::string::npos);  // single charts alone
+}
+
+// The first starts at the left whatever came before; the second moves by the bars it lacks and
+// stays where it has more.
+TEST(SuperimposedTest, SecondIsAlignedAndNeitherHasAVolumePanel) {
+  ComposerFixture f;
+  const auto compose = [&f](std::int16_t panel, int days) {
+    f.days.clear();
+    f.Days("20240101", days, 500);
+    f.chart.OscPanel = panel;
+    return f.Compose();
+  };
+  ASSERT_TRUE(compose(1, 5));
+  EXPECT_EQ(f.chart.UpperBarCount, 4);
+  EXPECT_EQ(f.chart.ChartBottom, 429);
+  EXPECT_FALSE(f.chart.Bars.VolumeShown);
+  ASSERT_TRUE(compose(2, 2));
+  EXPECT_EQ(f.chart.FirstBarX, 42 + 3 * 2);
+  EXPECT_EQ(f.chart.UpperBarCount, 4);
+  ASSERT_TRUE(compose(2, 9));
+  EXPECT_EQ(f.chart.FirstBarX, 42);
+  ASSERT_TRUE(compose(1, 2));
+  EXPECT_EQ(f.chart.FirstBarX, 42);
+  EXPECT_EQ(f.chart.UpperBarCount, 1);
+  for (const std::string& line : f.Lines('H')) EXPECT_FALSE(line.ends_with(",22")) << line;
+}
