@@ -290,3 +290,46 @@ TEST(SuperimposedTest, SecondIsAlignedAndNeitherHasAVolumePanel) {
   EXPECT_EQ(f.chart.UpperBarCount, 1);
   for (const std::string& line : f.Lines('H')) EXPECT_FALSE(line.ends_with(",22")) << line;
 }
+
+// ---- the oscillator on show
+
+// Twelve closes at 252, 3 apart: smoothing points at the eleventh and twelfth, an average of
+// eleven from the one to the other.
+TEST(OscNameTest, DecidesOverSmoothingAndAverages) {
+  struct Row {
+    char style;
+    const char* name;
+    bool smoothing, averages;
+  };
+  for (const Row& row : {Row{'B', "", true, true}, Row{'C', "", true, true},
+                         Row{'L', "", true, true}, Row{'B', "RSI", true, true},
+                         Row{'B', "PARA", false, false}, Row{'C', "PARA", false, false},
+                         Row{'L', "PARA", true, false}, Row{'B', "PARAV", false, true},
+                         Row{'C', "PARAV", false, true}, Row{'L', "PARAV", true, true},
+                         Row{'B', "MACD", false, false}, Row{'C', "MACD", false, false},
+                         Row{'L', "MACD", false, false}}) {
+    ComposerFixture f;
+    f.request.ChartStyle = row.style;
+    f.request.OscName = row.name;
+    f.request.BarSpacing = 3;  // so that opens and closes are no points
+    f.request.Ma1On = f.request.Ma2On = true;
+    f.request.Ma1Days = f.request.Ma2Days = 11;
+    f.Days("20240101", 12);
+    ASSERT_TRUE(f.Compose());
+    EXPECT_EQ(f.Lines('P'), row.smoothing ? (Lines{"P,72,252,19", "P,75,252,19"}) : Lines{})
+        << row.style << row.name;
+    EXPECT_EQ(f.Wrote("L,72,252,75,252,20"), row.averages) << row.style << row.name;
+    EXPECT_EQ(f.Wrote("H,72,252,75,252,21"), row.averages) << row.style << row.name;
+  }
+}
+
+TEST(OscNameTest, SmoothingNeedsOneOfTheAveragesOn) {
+  ComposerFixture f;
+  f.request.BarSpacing = 3;
+  f.Days("20240101", 12);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Lines('P').empty());
+  f.request.Ma2On = true;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(f.Lines('P').size(), 2u);
+}
