@@ -333,3 +333,104 @@ TEST(OscNameTest, SmoothingNeedsOneOfTheAveragesOn) {
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.Lines('P').size(), 2u);
 }
+
+// ---- places that 16 bits don't hold
+
+// 384 units for 0.05: 90 would stand 614,400 units above 10.
+TEST(PixelOverflowTest, EndsTheScriptWithTheBarBeforeInEveryStyle) {
+  for (const char style : {'B', 'C', 'L'}) {
+    ComposerFixture f;
+    f.request.ChartStyle = style;
+    f.request.AutoScale = false;
+    f.request.Name.Base = 10;
+    f.request.Name.Top = 10.05f;
+    f.Day("20240314", 10, 10, 10, 10);
+    f.Day("20240315", 10, 10, 10, 10);
+    f.Day("20240318", 90, 90, 90, 90);
+    f.Day("20240319", 10, 10, 10, 10);
+    EXPECT_FALSE(f.Compose());
+    ASSERT_EQ(f.dialogs.said.size(), 1u) << style;
+    EXPECT_EQ(f.dialogs.said[0].title, "Chart Display");
+    EXPECT_EQ(f.dialogs.said[0].text,
+              "There is a problem with the data for TEST.WDT\n at date (20240318) "
+              "\nUse View/Modify Data procedure to correct.")
+        << style;
+    EXPECT_FALSE(f.chart.ChartDrawn);
+    EXPECT_FALSE(f.script.IsOpen());
+    const Lines bars = f.Lines('H');
+    ASSERT_FALSE(bars.empty()) << style;
+    EXPECT_EQ(bars.back(), style == 'L' ? "H,42,429,44,429,18" : "H,44,429,44,429,18");
+    EXPECT_EQ(f.script.text().find(",46,"), std::string::npos) << style;
+    EXPECT_TRUE(f.Lines('Z').empty()) << style;                  // nothing that follows the bars
+    EXPECT_FALSE(f.Wrote("B,42,45,631,429,16")) << style;
+
+    // The next chart is none the worse.
+    f.request.AutoScale = true;
+    f.days.resize(2);
+    ASSERT_TRUE(f.Compose());
+    ComposerFixture fresh;
+    fresh.request.ChartStyle = style;
+    fresh.days = f.days;
+    ASSERT_TRUE(fresh.Compose());
+    EXPECT_EQ(f.script.text(), fresh.script.text()) << style;
+  }
+}
+
+// 2000 bars: mean (1999 + 2000000) / 2000 = 1001, 1000 / 31 a unit; the last volume would stand
+// 62,000 units up.
+TEST(PixelOverflowTest, VolumeFarAboveTheMeanIsToldUnlessVolumesAreCut) {
+  for (const char style : {'B', 'C'}) {
+    ComposerFixture f;
+    f.request.ChartStyle = style;
+    f.request.MultiOscOn = -1;  // the one surface that holds so many bars
+    f.request.BarSpacing = 1;
+    f.Days("20180101", 2000, 1);
+    f.days.back().Volume = 2000000;
+    EXPECT_FALSE(f.Compose());
+    ASSERT_EQ(f.dialogs.said.size(), 1u);
+    // 1999 days after 1 January 2018: 2018 to 2022 are 1826, and 173 days on from 1 January
+    // 2023 is 23 June.
+    EXPECT_NE(f.dialogs.said[0].text.find(" at date (20230623) "), std::string::npos);
+    f.request.CutVols = true;
+    ASSERT_TRUE(f.Compose());
+    EXPECT_TRUE(f.Wrote("H,2041,429,2041,386,22"));
+  }
+}
+
+// A picture one unit high has its top where its bottom is; one of 5 has 4 units for a plot and
+// none for the panel: round(4 - 4 * 1.03).
+TEST(PixelOverflowTest, PictureTooLowForAScaleIsToldInEveryStyle) {
+  for (const char style : {'B', 'C', 'L'}) {
+    for (const int height : {1, 5}) {
+      ComposerFixture f;
+      test::RecordingSurface low(638, height);
+      f.request.ChartStyle = style;
+      SetVolumes(f, {1000, 3000});
+      f.Save();
+      ChartServices services{f.home.files(), f.dialogs, f.paths, f.fonts, f.colours,
+                             low,            nullptr,   &f.script, {}};
+      EXPECT_FALSE(ComposeChart(services, f.request, f.chart));
+      ASSERT_EQ(f.dialogs.said.size(), 1u) << style << height;
+      EXPECT_EQ(f.dialogs.said[0].text, "There is an unexpected error No. 11\nDivision by zero");
+      EXPECT_FALSE(f.script.IsOpen());
+      EXPECT_TRUE(f.Lines('H').empty()) << style << height;
+    }
+  }
+}
+
+// 99 percent of 40 lies left of the plot: no bar is asked for, and the last one is there.
+TEST(PixelOverflowTest, PictureNarrowerThanItsScaleShowsTheLastBar) {
+  for (const char style : {'B', 'C', 'L'}) {
+    ComposerFixture f;
+    test::RecordingSurface narrow(40, 452);
+    f.request.ChartStyle = style;
+    f.Days("20240101", 30);
+    f.Save();
+    ChartServices services{f.home.files(), f.dialogs, f.paths, f.fonts, f.colours,
+                           narrow,         nullptr,   &f.script, {}};
+    ASSERT_TRUE(ComposeChart(services, f.request, f.chart));
+    EXPECT_EQ(f.chart.Bars.FirstDataRec, 30);
+    EXPECT_EQ(f.chart.Bars.BarCount, 0);
+    EXPECT_EQ(f.chart.CloseY, std::vector<std::int16_t>{252});
+  }
+}
