@@ -434,3 +434,77 @@ TEST(PixelOverflowTest, PictureNarrowerThanItsScaleShowsTheLastBar) {
     EXPECT_EQ(f.chart.CloseY, std::vector<std::int16_t>{252});
   }
 }
+
+// ---- the stop loss
+
+namespace {
+
+// The settings' StopLoss, and the middle one of three days an outside bar: stop 9 * 0.95 = 8.55.
+struct StopFixture : ComposerFixture {
+  Settings settings;
+  ChartState state;
+  StopFixture() {
+    settings.charts.StopLoss = true;
+    settings.charts.StopLossPct = 5;
+    Day("20240313", 10, 10.5f, 9.5f, 10);
+    Day("20240314", 10, 11, 9, 10);
+    Day("20240315", 10, 10.5f, 9.5f, 10);
+  }
+  bool ComposeAsSet() {
+    request = MakeRequest(state, settings, request.Name);
+    return Compose();
+  }
+  bool ToldOfStop() const { return script.text().find("Stop Loss") != std::string::npos; }
+};
+
+}  // namespace
+
+TEST(StopLossChartTest, WithoutTheOutsideMarksThereIsNeitherMarkNorStop) {
+  StopFixture f;
+  ASSERT_TRUE(f.ComposeAsSet());
+  EXPECT_TRUE(f.Wrote("H,44,104,44,399,18"));
+  EXPECT_FALSE(f.ToldOfStop());
+  for (const std::string& line : f.Lines('L')) EXPECT_FALSE(line.ends_with(",10")) << line;
+}
+
+// 429 + (8.8 - 8.55) / 0.0067708 = 465.92.
+TEST(StopLossChartTest, WithTheOutsideMarksItRunsFromItsBarToTheRight) {
+  StopFixture f;
+  f.state.OutsideDaysOn = true;
+  ASSERT_TRUE(f.ComposeAsSet());
+  EXPECT_TRUE(f.Wrote("H,44,104,44,399,28"));
+  EXPECT_TRUE(f.Wrote("H,42,178,42,326,18"));  // y(10.5), y(9.5) = 429 - 103.38
+  EXPECT_TRUE(f.Wrote("L,44,466,631,466,10"));
+  EXPECT_TRUE(f.ToldOfStop());
+}
+
+TEST(StopLossChartTest, OutsideMarksAloneMarkTheBarAndSetNoStop) {
+  StopFixture f;
+  f.state.OutsideDaysOn = true;
+  f.settings.charts.StopLoss = false;
+  ASSERT_TRUE(f.ComposeAsSet());
+  EXPECT_TRUE(f.Wrote("H,44,104,44,399,28"));
+  EXPECT_FALSE(f.ToldOfStop());
+}
+
+TEST(StopLossChartTest, PercentOutside1To100SetsNone) {
+  for (const double percent : {0.0, 0.9, 100.5}) {
+    StopFixture f;
+    f.state.OutsideDaysOn = true;
+    f.settings.charts.StopLossPct = float(percent);
+    ASSERT_TRUE(f.ComposeAsSet());
+    EXPECT_TRUE(f.Wrote("H,44,104,44,399,28")) << percent;
+    EXPECT_FALSE(f.ToldOfStop()) << percent;
+  }
+}
+
+TEST(StopLossChartTest, BarsAloneHaveIt) {
+  for (const char style : {'C', 'L'}) {
+    StopFixture f;
+    f.state.OutsideDaysOn = true;
+    f.state.ChartStyle = style;
+    ASSERT_TRUE(f.ComposeAsSet());
+    EXPECT_FALSE(f.ToldOfStop()) << style;
+    for (const std::string& line : f.Lines('H')) EXPECT_TRUE(line.ends_with(",18")) << line;
+  }
+}
