@@ -508,3 +508,41 @@ TEST(StopLossChartTest, BarsAloneHaveIt) {
     for (const std::string& line : f.Lines('H')) EXPECT_TRUE(line.ends_with(",18")) << line;
   }
 }
+
+// ---- the letters of the two averages
+
+// Closes at 252, 178, 252, 178. Of two: 215 throughout. Of three: 227 (227.33) and 203 (202.67).
+TEST(AverageLettersTest, FirstIsWrittenAsAThinLineAndTheSecondAtThePrintWeight) {
+  ComposerFixture f;
+  for (const char* date : {"20240102", "20240104"}) {
+    f.Day(date, 10, 11, 9, 10);
+    f.Day(std::string(date, 7) + char(date[7] + 1), 10, 11, 9, 10.5f);
+  }
+  f.request.Ma1On = f.request.Ma2On = true;
+  f.request.Ma1Days = 2;
+  f.request.Ma2Days = 3;
+  const auto averages = [&f] {
+    Lines out;
+    for (const std::string& line : f.Script())
+      if (line.ends_with(",20") || line.ends_with(",21")) out.push_back(line);
+    return out;
+  };
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(averages(),
+            (Lines{"L,44,215,46,215,20", "L,46,215,48,215,20", "H,46,227,48,203,21"}));
+  // Of two, k = 2/3: 215, 239.67 -> 240, 198.67 -> 199. Of three, k = 1/2: 227, 202.5 -> 202.
+  f.request.MaExp = true;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_EQ(averages(),
+            (Lines{"L,44,215,46,240,20", "L,46,240,48,199,20", "H,46,227,48,202,21"}));
+}
+
+TEST(AverageLettersTest, SecondAloneKeepsItsLetter) {
+  ComposerFixture f;
+  f.Days("20240101", 4);
+  f.request.Ma2On = true;
+  f.request.Ma2Days = 3;
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("H,46,252,48,252,21"));
+  for (const std::string& line : f.Lines('L')) EXPECT_FALSE(line.ends_with(",20")) << line;
+}
