@@ -106,6 +106,11 @@ class Loader {
   void EndPeriods(const FixedText<8>& lastRead) {
     if (period_.HasData) Flush(lastRead);
   }
+  // The volume of the period, as far as it is read, is no 32-bit number.
+  bool VolumeLeft() const {
+    return period_.Volume < std::numeric_limits<std::int32_t>::min() ||
+           period_.Volume > std::numeric_limits<std::int32_t>::max();
+  }
 
   void Finish(ChartBars& out) const {
     out.BarCount = CInt(double(next_ - bars_) - 1);
@@ -191,9 +196,7 @@ class Loader {
       bar.Low = period_.Low;  // never 0: it starts at kNoLow
       bar.Close = period_.LastGoodClose;
     }
-    if (period_.Volume < std::numeric_limits<std::int32_t>::min() ||
-        period_.Volume > std::numeric_limits<std::int32_t>::max())
-      throw RunTimeError(kOverflow);
+    if (VolumeLeft()) throw RunTimeError(kOverflow);
     bar.Volume = static_cast<std::int32_t>(period_.Volume);
     bar.SourceRec = period_.Source;
 
@@ -253,6 +256,25 @@ Loader TakePeriods(Loader loader, std::span<const PriceRec> run, std::int32_t fi
   return loader;
 }
 
+// The record at which the volume of a period left 32 bits. A load sees that at the period's end
+// alone; so the records are taken once more, one by one, with a new `loader`.
+std::int16_t OverflowRecord(const PriceFile& file, Loader loader, decltype(&TakeDays) takeRun,
+                            std::int16_t first, std::int16_t last) {
+  std::int16_t left = last, current = 0;
+  bool out = false;
+  try {
+    for (std::int32_t number = first; number <= last; ++number) {
+      const PriceRec rec = file.Read(number);
+      loader = takeRun(loader, {&rec, 1}, number, current);
+      if (loader.VolumeLeft() && !out) left = current;
+      out = loader.VolumeLeft();
+    }
+  } catch (const RunTimeError&) {
+    // The end of the same period.
+  }
+  return left;
+}
+
 }  // namespace
 
 void LoadChartBars(const PriceFile& file, std::string_view chartPeriod, bool volumeOption,
@@ -272,12 +294,20 @@ void LoadChartBars(const PriceFile& file, std::string_view chartPeriod, bool vol
   std::array<PriceRec, kRecordsPerRead> buffer;
   std::span<PriceRec> run;
   const std::int32_t last = out.LastDataRec;
-  for (std::int32_t first = out.FirstDataRec; first <= last; first += kRecordsPerRead) {
-    run = {buffer.data(), size_t(std::min(kRecordsPerRead, last - first + 1))};
-    file.ReadRun(first, run);
-    loader = takeRun(loader, run, first, out.CurrentDataRec);
+  try {
+    for (std::int32_t first = out.FirstDataRec; first <= last; first += kRecordsPerRead) {
+      run = {buffer.data(), size_t(std::min(kRecordsPerRead, last - first + 1))};
+      file.ReadRun(first, run);
+      loader = takeRun(loader, run, first, out.CurrentDataRec);
+    }
+    if (chartPeriod != "A") loader.EndPeriods(run.back().RecDate);
+  } catch (const RunTimeError& e) {
+    if (e.number() == kOverflow)
+      out.CurrentDataRec =
+          OverflowRecord(file, Loader(out, out.bars.data(), volumeOption, recType), takeRun,
+                         out.FirstDataRec, out.LastDataRec);
+    throw;
   }
-  if (chartPeriod != "A") loader.EndPeriods(run.back().RecDate);
   loader.Finish(out);
 }
 

@@ -40,7 +40,8 @@ struct ChartBars {
 // Weekly and monthly: a week ends where the weekday falls, a month where the month key grows.
 //
 // Errors: 63 for an empty slice or one outside the file, 5 for a weekly record whose date is no
-// calendar date (CurrentDataRec tells which) or another period, 6 where a volume leaves 32 bits.
+// calendar date (CurrentDataRec tells which) or another period, 6 where a volume leaves 32 bits
+// (CurrentDataRec tells at which record of the week or month).
 // After an error `out` holds bars 0 to BarCount of no use, CurrentDataRec the record in hand.
 void LoadChartBars(const PriceFile& file, std::string_view chartPeriod, bool volumeOption,
                    std::int16_t recType, ChartBars& out);

@@ -672,6 +672,20 @@ TEST(ComposerFailureTest, BadWeeklyDateNamesTheRecord) {
             "\nUse View/Modify Data procedure to correct.");
 }
 
+TEST(ComposerFailureTest, WeekWhoseVolumeLeaves32BitsNamesTheRecordAtWhichItLeft) {
+  ComposerFixture f;
+  f.request.ChartPeriod = "W";
+  f.Day("20240101", 10, 11, 9, 10, 2000000000);
+  f.Day("20240102", 10, 11, 9, 10, 2000000000);
+  f.Day("20240103", 10, 11, 9, 10, 1);
+  f.Day("20240108", 10, 11, 9, 10, 1);
+  EXPECT_FALSE(f.Compose());
+  ASSERT_EQ(f.dialogs.said.size(), 1u);
+  EXPECT_EQ(f.dialogs.said[0].text,
+            "There is a problem with the data for TEST.WDT\n at Rec Number (2) 20240102"
+            "\nUse View/Modify Data procedure to correct.");
+}
+
 TEST(ComposerFailureTest, NotANumberAndInfinityInTheFileAreToldAndNoCrash) {
   for (const float bad : {std::nanf(""), std::numeric_limits<float>::infinity(),
                           -std::numeric_limits<float>::infinity()}) {

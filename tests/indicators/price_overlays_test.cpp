@@ -87,6 +87,27 @@ TEST(PercentBandsTest, WidthsOutsideOneToAHundredAreFive) {
   }
 }
 
+// ln 11 is 2.3979, ln 12.1 2.4932, ln 8 2.0794 and ln 8.8 2.1748; 100 units for each 1, downward.
+TEST(PercentBandsTest, LogarithmicChartPlacesThemByTheirLogarithms) {
+  std::vector<float> closes = Repeat(10, 10);
+  closes.push_back(20);
+  OverlayFixture f(closes);
+  f.chart.Price.Logarithmic = true;
+  f.chart.Price.LogBase = 0;
+  f.chart.Price.LogFactor = -100;
+  f.request.Name.BandUp = 10;
+  f.request.Name.BandDown = 20;
+  ShowPercentBands(f.canvas);
+  EXPECT_EQ(f.Script(), (Lines{"L,78,160,82,150,41", "L,78,192,82,182,41"}));
+}
+
+TEST(PercentBandsTest, ChartThatStartsFurtherRightTakesThemAlong) {
+  OverlayFixture f(Repeat(10, 11));
+  f.chart.FirstBarX = 72;
+  ShowPercentBands(f.canvas);
+  EXPECT_EQ(f.Script(), (Lines{"L,108,379,112,379,41", "L,108,381,112,381,41"}));
+}
+
 TEST(PercentBandsTest, FewerClosesThanTenDrawNothing) {
   OverlayFixture none, nine(Repeat(10, 9)), ten(Repeat(10, 10));
   for (OverlayFixture* f : {&none, &nine, &ten}) {
@@ -215,6 +236,73 @@ TEST(PriceOverlaysTest, ComposerDrawsBandsThenAverages) {
     EXPECT_EQ(colourOf(i), i < first + 40 ? "41" : i < first + 68 ? "43" : "44");
   }
   EXPECT_NE(colourOf(first - 1), "41");
+}
+
+// 8.8 to 11.4 on 384 units: 1483.4 for each 1 of ln. 9 stands at 429 - 33.34, down to 395, and 11
+// at 429 - 331.02, down to 97; half-way is 246, where the mean of the prices, 10, stands at 239.
+TEST(PriceOverlaysTest, AveragesOfALogarithmicChartAreThoseOfItsPlaces) {
+  ComposerFixture f;
+  f.Day("20240102", 10, 11, 9, 9);
+  f.Day("20240103", 10, 11, 9, 11);
+  f.Day("20240104", 10, 11, 9, 9);
+  f.request.LogBars = true;
+  f.request.Ma1On = true;
+  f.request.Ma1Days = 2;
+  f.services.overlays = PriceOverlays(true, {2});
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("L,44,246,46,246,20"));
+  EXPECT_TRUE(f.Wrote("L,44,246,46,246,43"));
+}
+
+// The lower chart lacks 4 bars: it starts at 42 + 8. 230 to 429 has 199 units: 10 stands at
+// 429 - 91.85.
+TEST(PriceOverlaysTest, LowerOfTwoChartsDrawsThemWhereItsBarsStand) {
+  ComposerFixture f;
+  f.services.overlays = PriceOverlays(true, {3});
+  f.request.Ma1On = true;
+  f.request.Ma1Days = 2;
+  f.chart.TwoCharts = true;
+  f.chart.ChartSlot = 1;
+  f.Days("20240101", 8);
+  ASSERT_TRUE(f.Compose());
+  f.days.resize(4);
+  ASSERT_TRUE(f.Compose());
+  EXPECT_TRUE(f.Wrote("L,52,337,54,337,20"));
+  EXPECT_TRUE(f.Wrote("L,54,337,56,337,20"));
+  EXPECT_TRUE(f.Wrote("L,54,337,56,337,43"));
+}
+
+// Twelve closes at 10: 10.5 stands at 178, 9.5 at 326; the window fills with the tenth bar, at 60.
+TEST(PriceOverlaysTest, BandsAndMultipleAveragesStayWhereTheTwoAveragesGoForAnOscillator) {
+  for (const char* name : {"PARA", "MACD"}) {
+    ComposerFixture f;
+    f.request.OscName = name;
+    f.request.BandKind = 1;
+    f.request.Ma1On = f.request.Ma2On = true;
+    f.request.Ma1Days = f.request.Ma2Days = 2;
+    f.services.overlays = PriceOverlays(true, {11});
+    f.Days("20240101", 12);
+    ASSERT_TRUE(f.Compose());
+    EXPECT_TRUE(f.Wrote("L,60,178,62,178,41")) << name;
+    EXPECT_TRUE(f.Wrote("L,62,326,64,326,41")) << name;
+    EXPECT_TRUE(f.Wrote("L,62,252,64,252,43")) << name;
+    for (const std::string& line : f.Script())
+      EXPECT_FALSE(line.ends_with(",20") || line.ends_with(",21")) << name << " " << line;
+  }
+}
+
+TEST(PriceOverlaysTest, SuperimposedChartHasNone) {
+  ComposerFixture f;
+  f.request.BandKind = 1;
+  f.request.Ma1On = f.request.Ma2On = true;
+  f.request.Ma1Days = f.request.Ma2Days = 2;
+  f.services.overlays = PriceOverlays(true, {2});
+  f.chart.OscPanel = 1;
+  f.Days("20240101", 30);
+  ASSERT_TRUE(f.Compose());
+  for (const std::string& line : f.Script())
+    for (const char* entry : {",19", ",20", ",41", ",43"})
+      EXPECT_FALSE(line.ends_with(entry)) << line;
 }
 
 TEST(PriceOverlaysTest, NoBandsUnlessAskedFor) {

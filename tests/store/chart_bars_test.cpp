@@ -367,6 +367,68 @@ TEST_F(LoadBars, AWeekAbove32BitsIsError6WhereAMonthHolds) {
   EXPECT_EQ(Load(records, "M")[0].Volume, 40000000);
 }
 
+// A week from Monday 1 January 2024: three days of 10^9 leave 2147483647 with the third.
+TEST_F(LoadBars, OverflowOfAWeekNamesTheRecordAtWhichTheSumLeft) {
+  constexpr std::int32_t kBillion = 1000000000;
+  const std::vector<PriceRec> records{
+      Day("20231229", 1, 1, 1, 1, kBillion),      Day("20240101", 1, 1, 1, 1, kBillion),
+      Day("20240102", 1, 1, 1, 1, kBillion),      Day("20240103", 1, 1, 1, 1, kBillion),
+      Day("20240104", 1, 1, 1, 1, 7),             Day("20240105", 1, 1, 1, 1, 7),
+      Day("20240108", 1, 1, 1, 1, 7)};
+  for (const int last : {7, 6, 4}) {  // ended by the next week, or by the slice
+    ChartBars out;
+    out.FirstDataRec = 1;
+    out.LastDataRec = std::int16_t(last);
+    EXPECT_EQ(LoadError(records, "W", out), kOverflow) << last;
+    EXPECT_EQ(out.CurrentDataRec, 4) << last;
+  }
+  // In a slice that starts within the week the sum leaves no more: 2 * 10^9 + 14.
+  EXPECT_EQ(Load(records, "W", kShare, true, 3)[0].Volume, 2000000014);
+}
+
+TEST_F(LoadBars, OverflowBelow32BitsNamesItsRecordToo) {
+  const std::vector<PriceRec> records{Day("20240101", 1, 1, 1, 1, -2000000000),
+                                      Day("20240102", 1, 1, 1, 1, -2000000000),
+                                      Day("20240103", 1, 1, 1, 1, 5)};
+  ChartBars out;
+  out.FirstDataRec = 1;
+  out.LastDataRec = 3;
+  EXPECT_EQ(LoadError(records, "W", out), kOverflow);
+  EXPECT_EQ(out.CurrentDataRec, 2);
+}
+
+TEST_F(LoadBars, VolumeThatCameBackInto32BitsIsNoneAndOneThatLeftAgainNamesTheSecondTime) {
+  constexpr std::int32_t kTwoBillion = 2000000000;
+  std::vector<PriceRec> records{Day("20240101", 1, 1, 1, 1, kTwoBillion),
+                                Day("20240102", 1, 1, 1, 1, kTwoBillion),
+                                Day("20240103", 1, 1, 1, 1, -kTwoBillion)};
+  EXPECT_EQ(Load(records, "W")[0].Volume, kTwoBillion);
+  records.push_back(Day("20240104", 1, 1, 1, 1, kTwoBillion));
+  records.push_back(Day("20240105", 1, 1, 1, 1, 1));
+  ChartBars out;
+  out.FirstDataRec = 1;
+  out.LastDataRec = 5;
+  EXPECT_EQ(LoadError(records, "W", out), kOverflow);
+  EXPECT_EQ(out.CurrentDataRec, 4);
+}
+
+// 2147483600 is 21474836 hundreds: a hundred records make 2147483600, and 48 hundreds more are
+// one too many for 2147483647.
+TEST_F(LoadBars, OverflowOfAMonthCountsInHundreds) {
+  std::vector<PriceRec> records{Day("20231229", 1, 1, 1, 1, 100)};
+  for (int i = 0; i < 100; ++i) records.push_back(Day("20240102", 1, 1, 1, 1, 2147483600));
+  records.push_back(Day("20240103", 1, 1, 1, 1, 4799));
+  EXPECT_EQ(Load(records, "M")[1].Volume, 2147483647);
+  records.back().Volume = 4800;
+  records.push_back(Day("20240104", 1, 1, 1, 1, 100));
+  records.push_back(Day("20240201", 1, 1, 1, 1, 100));
+  ChartBars out;
+  out.FirstDataRec = 1;
+  out.LastDataRec = std::int16_t(records.size());
+  EXPECT_EQ(LoadError(records, "M", out), kOverflow);
+  EXPECT_EQ(out.CurrentDataRec, 102);
+}
+
 TEST_F(LoadBars, VolumesAboveTheStartOfVolMinDoNotLowerIt) {
   // So that one volume of 10^9 is no case of equal volumes.
   const ChartBars bars = Load({Day("20240102", 1, 1, 1, 1, 1000000000)}, "A");
@@ -381,7 +443,7 @@ TEST_F(LoadBars, ASliceOutsideTheFileIsError63) {
   const auto error = [&](std::int16_t first, std::int16_t last) {
     ChartBars out;
     out.FirstDataRec = first;
-    out.LastDataRec = last;
+    out.LastDataRec = std::int16_t(last);
     return LoadError(AWeekAndADay(), "A", out);
   };
   EXPECT_EQ(error(0, 2), kBadRecordNumber);
