@@ -237,6 +237,15 @@ TEST_F(ChtsFormTest, TheMenusOpenByTheirKeys) {
   }
 }
 
+TEST_F(ChtsFormTest, EnterTakesTheFirstEntryOfAMenuOpenedByItsKey) {
+  Open();
+  Key(Qt::Key_O, Qt::AltModifier);
+  auto* menu = Find<QMenu>(form, "cmOscillators");
+  ASSERT_TRUE(WaitFor([&] { return menu->isVisible(); }));
+  QTest::keyClick(menu, Qt::Key_Return);
+  EXPECT_EQ(session->charts.OscCode, "DM");
+}
+
 TEST_F(ChtsFormTest, AnOscillatorByTheKeysAlone) {
   Open();
   Key(Qt::Key_O, Qt::AltModifier);
