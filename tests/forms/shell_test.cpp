@@ -9,6 +9,7 @@
 #include <QMdiSubWindow>
 #include <QMenu>
 #include <QMenuBar>
+#include <QPointer>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QTemporaryDir>
@@ -662,13 +663,16 @@ TEST(Help, TheGuideIsFoundBesideTheProgramOrAboveIt) {
   EXPECT_EQ(FindGuide(bin),
             QFileInfo(root.filePath("build/release/bin/guide/index.html")).canonicalFilePath());
 
-  HelpWindow& help = *new HelpWindow(FindGuide(bin));  // deletes itself on closing
-  help.show();
-  EXPECT_EQ(help.windowTitle(), "KORA Charting Help");
-  auto* page = help.findChild<QTextBrowser*>("Text1");
+  const QPointer<HelpWindow> help = new HelpWindow(FindGuide(bin));
+  help->show();
+  EXPECT_EQ(help->windowTitle(), "KORA Charting Help");
+  auto* page = help->findChild<QTextBrowser*>("Text1");
   ASSERT_NE(page, nullptr);
   EXPECT_EQ(page->toPlainText(), "Guide");
-  help.close();
+  ASSERT_TRUE(QTest::qWaitForWindowActive(help));
+  QTest::keyClick(page, Qt::Key_Escape);
+  EXPECT_TRUE(QTest::qWaitFor([&] { return help.isNull(); })) << "it deletes itself on closing";
+  delete help;
 }
 
 }  // namespace
