@@ -355,6 +355,8 @@ std::function<void()> Chts::DeedOf(const std::string& entry) {
 }
 
 void Chts::EnableEntries() {
+  // It stands there only where it can be used: greyed it would take its letter from Superimpose.
+  entries_["cmStkDetails"]->setVisible(bool(DeedOf("cmStkDetails")));
   for (const auto& [name, action] : entries_) action->setEnabled(bool(DeedOf(name)));
 }
 
