@@ -573,6 +573,15 @@ TEST_F(LogoTest, TheInstanceBeforeMayHaveEndedOrHaveAnotherHome) {
   EXPECT_FALSE(SingleInstance(home.path() + "/not there", "KORA32").Previous());
 }
 
+TEST_F(LogoTest, TheLockOfADeadProgramIsTakenOverWithoutRoomForASecondFile) {
+  // No process has this number; a folder of the name keeps the second file from being made.
+  home.Put("KORA32.lock", "2147483647\nkora\n\n\n\n");
+  QDir(QString::fromStdString(home.path())).mkdir("KORA32.lock.rmlock");
+  const SingleInstance next(home.path(), "KORA32");
+  EXPECT_FALSE(next.Previous());
+  EXPECT_TRUE(SingleInstance(home.path(), "KORA32").Previous());
+}
+
 TEST_F(LogoTest, ReadsTheSettingsThenOpensTheMainWindow) {
   EXPECT_TRUE(Make().Start(false));
   EXPECT_TRUE(logo->isVisible());
