@@ -361,8 +361,10 @@ bool ChartWindow::Compose() {
 
 bool ChartWindow::Compose(const ChartRequest& request) {
   ChartState& s = state();
-  // Two charts of a pair are composed one after the other over a picture that stays.
+  // Two charts of a pair are composed one after the other over a picture that stays. What the
+  // cross hair read is of the chart before, and must not stand under this one.
   EraseCross();
+  if (cross_) ClearStatusBar();
   ChartFromFile = false;
   Chart.TwoCharts = s.SplitScreen;
   s.SplitShown = s.SplitScreen;

@@ -2,6 +2,7 @@
 #include <QDir>
 #include <cstdio>
 
+#include "platform/qt/keyboard_back.h"
 #include "platform/qt/qt_dialogs.h"
 #include "platform/qt/single_instance.h"
 #include "shell/forms/Logo.h"
@@ -25,6 +26,7 @@ int main(int argc, char** argv) {
   const std::string home = arguments->home.empty() ? DefaultHome() : arguments->home;
   QDir().mkpath(QString::fromStdString(home));
 
+  const KeyboardBack keyboardBack;
   QtDialogs dialogs;
   const SingleInstance instance(home, "KORA32");
   Session session(home, dialogs);

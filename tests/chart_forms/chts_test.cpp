@@ -237,6 +237,29 @@ TEST_F(ChtsFormTest, TheMenusOpenByTheirKeys) {
   }
 }
 
+TEST_F(ChtsFormTest, EnterTakesTheFirstEntryOfAMenuOpenedByItsKey) {
+  Open();
+  Key(Qt::Key_O, Qt::AltModifier);
+  auto* menu = Find<QMenu>(form, "cmOscillators");
+  ASSERT_TRUE(WaitFor([&] { return menu->isVisible(); }));
+  QTest::keyClick(menu, Qt::Key_Return);
+  EXPECT_EQ(session->charts.OscCode, "DM");
+}
+
+TEST_F(ChtsFormTest, SuperimposeByItsLetter) {
+  Open();
+  bool opened = false;
+  form->SetForm("cmSuperimpose", [&] { opened = true; });
+  EXPECT_FALSE(Entry("cmStkDetails")->isVisible());
+  Key(Qt::Key_T, Qt::AltModifier);
+  auto* menu = Find<QMenu>(form, "cmTools");
+  ASSERT_TRUE(WaitFor([&] { return menu->isVisible(); }));
+  QTest::keyClick(menu, Qt::Key_S);
+  EXPECT_TRUE(opened);
+  form->SetForm("cmStkDetails", [] {});
+  EXPECT_TRUE(Entry("cmStkDetails")->isVisible());
+}
+
 TEST_F(ChtsFormTest, AnOscillatorByTheKeysAlone) {
   Open();
   Key(Qt::Key_O, Qt::AltModifier);

@@ -1162,6 +1162,17 @@ TEST_F(GridTest, ItOutlivesAPageAndLeavesNoLineBehind) {
   EXPECT_EQ(surface.ops.size(), 2u) << "nothing to take away from the new picture";
 }
 
+TEST_F(GridTest, NothingOfTheChartBeforeIsReadUnderTheNext) {
+  window().MouseMove(window().Chart.ChartLeft, 200);
+  ASSERT_NE(panels()[2], "");
+  state.ChartDirection = 1;
+  window().StepChart();
+  EXPECT_EQ(panels()[1], "GRID");
+  for (size_t i = 2; i < panels().size(); ++i) EXPECT_EQ(panels()[i], "") << i;
+  window().MouseMove(window().Chart.ChartLeft, 200);
+  EXPECT_NE(panels()[2], "");
+}
+
 TEST_F(GridTest, TwoChartsKeepTheLastText) {
   window().MouseMove(window().Chart.ChartLeft, 200);
   const auto before = panels()[2];

@@ -9,6 +9,7 @@
 #include <QMdiSubWindow>
 #include <QMenu>
 #include <QMenuBar>
+#include <QPointer>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QTemporaryDir>
@@ -572,6 +573,15 @@ TEST_F(LogoTest, TheInstanceBeforeMayHaveEndedOrHaveAnotherHome) {
   EXPECT_FALSE(SingleInstance(home.path() + "/not there", "KORA32").Previous());
 }
 
+TEST_F(LogoTest, TheLockOfADeadProgramIsTakenOverWithoutRoomForASecondFile) {
+  // No process has this number; a folder of the name keeps the second file from being made.
+  home.Put("KORA32.lock", "2147483647\nkora\n\n\n\n");
+  QDir(QString::fromStdString(home.path())).mkdir("KORA32.lock.rmlock");
+  const SingleInstance next(home.path(), "KORA32");
+  EXPECT_FALSE(next.Previous());
+  EXPECT_TRUE(SingleInstance(home.path(), "KORA32").Previous());
+}
+
 TEST_F(LogoTest, ReadsTheSettingsThenOpensTheMainWindow) {
   EXPECT_TRUE(Make().Start(false));
   EXPECT_TRUE(logo->isVisible());
@@ -662,13 +672,16 @@ TEST(Help, TheGuideIsFoundBesideTheProgramOrAboveIt) {
   EXPECT_EQ(FindGuide(bin),
             QFileInfo(root.filePath("build/release/bin/guide/index.html")).canonicalFilePath());
 
-  HelpWindow& help = *new HelpWindow(FindGuide(bin));  // deletes itself on closing
-  help.show();
-  EXPECT_EQ(help.windowTitle(), "KORA Charting Help");
-  auto* page = help.findChild<QTextBrowser*>("Text1");
+  const QPointer<HelpWindow> help = new HelpWindow(FindGuide(bin));
+  help->show();
+  EXPECT_EQ(help->windowTitle(), "KORA Charting Help");
+  auto* page = help->findChild<QTextBrowser*>("Text1");
   ASSERT_NE(page, nullptr);
   EXPECT_EQ(page->toPlainText(), "Guide");
-  help.close();
+  ASSERT_TRUE(QTest::qWaitForWindowActive(help));
+  QTest::keyClick(page, Qt::Key_Escape);
+  EXPECT_TRUE(QTest::qWaitFor([&] { return help.isNull(); })) << "it deletes itself on closing";
+  delete help;
 }
 
 }  // namespace

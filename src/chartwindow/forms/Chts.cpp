@@ -355,6 +355,8 @@ std::function<void()> Chts::DeedOf(const std::string& entry) {
 }
 
 void Chts::EnableEntries() {
+  // It stands there only where it can be used: greyed it would take its letter from Superimpose.
+  entries_["cmStkDetails"]->setVisible(bool(DeedOf("cmStkDetails")));
   for (const auto& [name, action] : entries_) action->setEnabled(bool(DeedOf(name)));
 }
 
@@ -675,7 +677,15 @@ bool Chts::OpenMenuByKey(QKeyEvent* event, bool open) {
   const QString mnemonic = QString("&") + QChar(event->key());
   for (QAction* menu : menuBar()->actions())
     if (menu->text().contains(mnemonic, Qt::CaseInsensitive)) {
-      if (open) menuBar()->setActiveAction(menu);
+      if (open) {
+        menuBar()->setActiveAction(menu);
+        // As in any menu opened by its key: Enter takes the first entry that can be used.
+        for (QAction* entry : menu->menu()->actions())
+          if (entry->isEnabled() && entry->isVisible() && !entry->isSeparator()) {
+            menu->menu()->setActiveAction(entry);
+            break;
+          }
+      }
       return true;
     }
   return false;

@@ -4,6 +4,7 @@
 #include <QDir>
 #include <QFileInfo>
 #include <QScreen>
+#include <QShortcut>
 #include <QTextBrowser>
 #include <QToolBar>
 #include <QUrl>
@@ -47,6 +48,7 @@ HelpWindow::HelpWindow(const QString& page) {
   forward->setEnabled(false);
   connect(browser, &QTextBrowser::backwardAvailable, back, &QAction::setEnabled);
   connect(browser, &QTextBrowser::forwardAvailable, forward, &QAction::setEnabled);
+  new QShortcut(Qt::Key_Escape, this, [this] { close(); });
   const QSize wanted(fontMetrics().averageCharWidth() * 100, fontMetrics().height() * 36);
   resize(wanted.boundedTo(screen()->availableGeometry().size() * 0.9));
 }
