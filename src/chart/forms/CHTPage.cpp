@@ -45,8 +45,7 @@ CHTPage::CHTPage(const PrintServices& services, QWidget* parent)
   row->addWidget(sheet_, 1);
   row->addLayout(side);
   auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
+  buttons->AddOkCancel([this] { Save(); });
   auto* column = new QVBoxLayout(this);
   column->addLayout(row, 1);
   column->addLayout(buttons);

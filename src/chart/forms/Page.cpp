@@ -67,8 +67,7 @@ Page::Page(const PrintServices& services, ChartSize chart, std::string script, Q
   row->addWidget(sheet_, 1);
   row->addLayout(side);
   auto* buttons = new ButtonRow(this);
-  buttons->Add("Command1", "&OK", [this] { Save(); });
-  buttons->Add("Command2", "&Cancel", [this] { reject(); });
+  buttons->AddOkCancel([this] { Save(); });
   auto* column = new QVBoxLayout(this);
   column->addLayout(row, 1);
   column->addLayout(buttons);
