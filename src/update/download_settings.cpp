@@ -162,8 +162,9 @@ bool SaveWizardFolders(const Files& files, const std::string& systemPath,
 }
 
 LocateCase WizardLocate(const WmPaths& lines, int index, const Paths& paths) {
-  static constexpr const char* kPurposes[] = {"ASX stocks",    "Aust Indices",       "SFE Futures",
-                                              "Overseas Data", "Put / Call Options", "Extra stocks"};
+  static constexpr const char* kPurposes[] = {
+      "ASX stocks", "Aust Indices", "SFE Futures", "Overseas Data", "Put / Call Options",
+      "Extra stocks"};
   const auto at = size_t(index);
   const std::string folder = WizardFolders(lines).at(at);
   return {kPurposes[at], folder.size() > 2 ? folder : paths.CurrentDataPath};
@@ -269,7 +270,8 @@ std::vector<UpdateRow> ReadUpdateList(const Files& files, const std::string& sys
       row.category = category >= 0 && category <= 99 ? CInt(category) : std::int16_t(0);
     }
     // The name is the last field, and may have commas of its own.
-    if (fields.size() > 2) row.name = FromAnsi(Trim(line.substr(size_t(fields[2].data() - line.data()))));
+    if (fields.size() > 2)
+      row.name = FromAnsi(Trim(line.substr(size_t(fields[2].data() - line.data()))));
     rows.push_back(std::move(row));
   }
   return rows;

@@ -96,8 +96,8 @@ struct ServiceChoice {
   std::string InternetDLfmt;   // of service 4 alone
   std::int32_t VolumeDivisor = 1;
 };
-// Writes the choice to the settings file and `download`, whose service folders follow. False, with a message and nothing
-// written, for a path without its closing backslash.
+// Writes the choice to the settings file and `download`, whose service folders follow. False,
+// with a message and nothing written, for a path without its closing backslash.
 bool SaveServiceChoice(const ServiceChoice& choice, SettingsFile& ini, DownloadSettings& download,
                        Dialogs& dialogs);
 
@@ -116,8 +116,8 @@ enum class UpdateChoice { kAll = 0, kListed = 1, kNoWarrants = 2 };  // Option1 
 UpdateChoice UpdateChoiceOf(const DownloadSettings& download);
 
 // Saves the form `INUpList`: Update.Bak takes the old list, rows with a code are written, and
-// the choice goes to the settings. A failure leaves the old list. An empty list with kListed is told and `choice` becomes kAll.
-// Returns whether a list was written.
+// the choice goes to the settings. A failure leaves the old list. An empty list with kListed is
+// told and `choice` becomes kAll. Returns whether a list was written.
 bool SaveUpdateList(const Files& files, const std::string& systemPath,
                     std::span<const UpdateRow> rows, UpdateChoice& choice, SettingsFile& ini,
                     DownloadSettings& download, Dialogs& dialogs);

@@ -41,14 +41,7 @@ CHTPage::CHTPage(const PrintServices& services, QWidget* parent)
                                         [this] { Show(); }));
   side->addLayout(grid);
   side->addStretch();
-  auto* row = new QHBoxLayout;
-  row->addWidget(sheet_, 1);
-  row->addLayout(side);
-  auto* buttons = new ButtonRow(this);
-  buttons->AddOkCancel([this] { Save(); });
-  auto* column = new QVBoxLayout(this);
-  column->addLayout(row, 1);
-  column->addLayout(buttons);
+  LayOutPageForm(this, sheet_, side, [this] { Save(); });
   for (QDoubleSpinBox* margin : {top_, bottom_, left_, right_})
     connect(margin, &QDoubleSpinBox::valueChanged, this, [this] { Show(); });
   Show();

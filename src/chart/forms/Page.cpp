@@ -63,14 +63,7 @@ Page::Page(const PrintServices& services, ChartSize chart, std::string script, Q
   side->addWidget(decrease);
   side->addWidget(centre);
   side->addStretch();
-  auto* row = new QHBoxLayout;
-  row->addWidget(sheet_, 1);
-  row->addLayout(side);
-  auto* buttons = new ButtonRow(this);
-  buttons->AddOkCancel([this] { Save(); });
-  auto* column = new QVBoxLayout(this);
-  column->addLayout(row, 1);
-  column->addLayout(buttons);
+  LayOutPageForm(this, sheet_, side, [this] { Save(); });
   Show();
 }
 

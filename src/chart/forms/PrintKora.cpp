@@ -70,8 +70,8 @@ void PrintKora::Proceed() {
     if (file.size() < 5 || !LCase(file).ends_with(".pdf"))
       return dialogs.Message("File name invalid", windowTitle().toStdString());
     if (services_.files.CheckFile(file) &&
-        dialogs.Ask(file + " already exists - Overwrite", windowTitle().toStdString(), Buttons::kOkCancel) !=
-            Answer::kOk)
+        dialogs.Ask(file + " already exists - Overwrite", windowTitle().toStdString(),
+                    Buttons::kOkCancel) != Answer::kOk)
       return;
   }
   try {

@@ -1,9 +1,12 @@
 #include "chart/forms/sheet_view.h"
 
+#include <QDialog>
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPainter>
 #include <algorithm>
+
+#include "platform/qt/form_parts.h"
 
 namespace kora {
 namespace {
@@ -132,6 +135,17 @@ void SheetView::keyPressEvent(QKeyEvent* event) {
     default: return QWidget::keyPressEvent(event);
   }
   if (dropped_) dropped_(box_.topLeft() + step);
+}
+
+void LayOutPageForm(QDialog* form, SheetView* sheet, QLayout* side, std::function<void()> ok) {
+  auto* row = new QHBoxLayout;
+  row->addWidget(sheet, 1);
+  row->addLayout(side);
+  auto* buttons = new ButtonRow(form);
+  buttons->AddOkCancel(std::move(ok));
+  auto* column = new QVBoxLayout(form);
+  column->addLayout(row, 1);
+  column->addLayout(buttons);
 }
 
 }  // namespace kora

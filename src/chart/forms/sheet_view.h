@@ -6,6 +6,9 @@
 
 #include "platform/printer.h"
 
+class QDialog;
+class QLayout;
+
 namespace kora {
 
 // A sheet of paper in small, at one third of its size or what the form has room for, with a box
@@ -50,5 +53,8 @@ class SheetView : public QWidget {
   QPointF drag_;
   QPixmap picture_;  // of the content
 };
+
+// Lays a page form out: the sheet, `side` beside it, and OK and Cancel below.
+void LayOutPageForm(QDialog* form, SheetView* sheet, QLayout* side, std::function<void()> ok);
 
 }  // namespace kora

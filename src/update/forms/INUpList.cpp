@@ -174,9 +174,9 @@ void INUpList::AddRow(const UpdateRow& row) {
 }
 
 void INUpList::SetRow(int at, const UpdateRow& row) {
+  const std::string category = row.code.empty() ? "" : Format(double(row.category), "##0");
   ss1_->setItem(at, 0, new QTableWidgetItem(ToQt(row.code)));
-  ss1_->setItem(at, 1, new QTableWidgetItem(
-                           row.code.empty() ? QString() : ToQt(Format(double(row.category), "##0"))));
+  ss1_->setItem(at, 1, new QTableWidgetItem(ToQt(category)));
   ss1_->setItem(at, 2, new QTableWidgetItem(ToQt(row.name)));
 }
 
