@@ -36,8 +36,8 @@ struct Bench {
     request.VolHeight = 2;
   }
   void Compose(benchmark::State& state, Surface& surface) {
-    const ChartServices services{home.files(), dialogs,  paths,   fonts, colours,
-                                 surface,      nullptr,  &script, {}};
+    const ChartServices services{home.files(), dialogs, paths,   fonts, colours,
+                                 surface,      nullptr, &script, {}};
     for (auto _ : state) {
       if (!ComposeChart(services, request, chart)) {
         state.SkipWithError("not composed");
@@ -49,7 +49,7 @@ struct Bench {
   }
 };
 
-constexpr char kStyles[] = {'B', 'C', 'L'};
+constexpr Style kStyles[] = {Style::kBar, Style::kCandlestick, Style::kLine};
 
 // width, height, spacing, style
 void Script(benchmark::State& state) {
@@ -75,6 +75,41 @@ void Charts(benchmark::internal::Benchmark* b) {
       for (const int style : {0, 1, 2}) b->Args({w, h, spacing, style});
 }
 
+// Point and figure reads the whole file, and twice; its floor is the line chart of the same 5,000
+// records, on a plot that is as wide as they are.
+void WholeFile(benchmark::State& state) {
+  Bench bench;
+  const bool line = state.range(0) == 0;
+  bench.request.ChartStyle = line ? Style::kLine : Style::kPointFigure;
+  bench.request.BarSpacing = line ? 1 : 3;
+  if (line) bench.request.BlankSpace = -5000;
+  QtRasterSurface surface(638, 452);
+  bench.Compose(state, surface);
+}
+
+// A swing of a full chart; its floor is the chart of bars.
+void Swing(benchmark::State& state) {
+  Bench bench;
+  constexpr SwingKind kKinds[] = {SwingKind::kNone, SwingKind::kStandard, SwingKind::kDays,
+                                  SwingKind::kPoints, SwingKind::kPointsAuto};
+  bench.request.BarSpacing = 3;
+  bench.request.Swing = kKinds[state.range(0)];
+  bench.request.SwingSize = 3;
+  QtRasterSurface surface(638, 452);
+  bench.Compose(state, surface);
+}
+
+BENCHMARK(WholeFile)
+    ->Name("ComposeWholeFile")
+    ->ArgNames({"boxes"})
+    ->Unit(benchmark::kMicrosecond)
+    ->Arg(0)
+    ->Arg(1);
+BENCHMARK(Swing)
+    ->Name("ComposeSwing")
+    ->ArgNames({"kind"})
+    ->Unit(benchmark::kMicrosecond)
+    ->DenseRange(0, 4);
 BENCHMARK(Script)->Name("ComposeScript")->Apply(Charts);
 BENCHMARK(Picture)->Name("ComposeAndDraw")->Apply(Charts);
 

@@ -6,7 +6,15 @@
 #include <vector>
 
 #include "bench/bench_home.h"
+#include "indicators/directional_movement.h"
+#include "indicators/holy_grail.h"
 #include "indicators/oscillators.h"
+#include "indicators/rmx.h"
+#include "indicators/roc_momentum.h"
+#include "indicators/rsi.h"
+#include "indicators/stochastic_fx.h"
+#include "indicators/volatility.h"
+#include "indicators/williams.h"
 #include "platform/headless/console_dialogs.h"
 #include "platform/headless/headless_surface.h"
 
@@ -33,7 +41,7 @@ struct Panel {
     const PriceFile file(home.files(), std::string(kData) + "BENCH.WDT");
     chart.Bars.FirstDataRec = 1;
     chart.Bars.LastDataRec = static_cast<std::int16_t>(n);
-    LoadChartBars(file, "A", true, kShare, chart.Bars);
+    LoadChartBars(file, Period::kDaily, true, kShare, chart.Bars);
     chart.ChartLeft = chart.FirstBarX = 42;
     chart.ChartRight = 1270;
     chart.DataFile = "BENCH.WDT";
@@ -43,8 +51,7 @@ struct Panel {
     chart.Price.ChartBottom = 350;
     for (const ChartBar& bar : chart.Bars.bars) chart.CloseY.push_back(chart.Price.Y(bar.Close));
     request.Name = NewNameRec("BENCH");
-    for (const OscKey& key : OscKeys())
-      settings.osc.*key.value = {key.defaultDaily, key.defaultTwin};
+    for (const OscKey& key : OscKeys()) settings.osc[key] = {key.defaultDaily, key.defaultTwin};
     settings.osc.FillIn = true;
     settings.osc.RFAve = true;
     settings.paths.CurrentDataPath = kData;
@@ -71,9 +78,9 @@ struct Panel {
 };
 
 void Run(benchmark::State& state, const char* code, bool slow = false,
-         PeriodPair OscSettings::*period = nullptr) {
+         const OscKey* period = nullptr) {
   Panel panel(static_cast<int>(state.range(0)));
-  if (period) (panel.settings.osc.*period).daily = 200;
+  if (period) panel.settings.osc[*period].daily = 200;
   size_t bytes = 0;
   for (auto _ : state) benchmark::DoNotOptimize(bytes = panel.Draw(code, slow));
   if (bytes < size_t(state.range(0)) * 5) state.SkipWithError("the panel drew no data");
@@ -162,8 +169,10 @@ void FloorObv(benchmark::State& state) {
   Floor(state, [](const auto& bars, auto& out) {
     double total = 0;
     for (size_t i = 1; i < bars.size(); ++i) {
-      if (bars[i].Close > bars[i - 1].Close) total += bars[i].Volume;
-      else if (bars[i].Close < bars[i - 1].Close) total -= bars[i].Volume;
+      if (bars[i].Close > bars[i - 1].Close)
+        total += bars[i].Volume;
+      else if (bars[i].Close < bars[i - 1].Close)
+        total -= bars[i].Volume;
       out[i] = total;
     }
   });
@@ -194,40 +203,38 @@ void FloorParabolic(benchmark::State& state) {
 void Sizes(benchmark::internal::Benchmark* b) {
   b->Arg(300)->Arg(1000)->Arg(5000)->Unit(benchmark::kMicrosecond);
 }
-void Longest(benchmark::internal::Benchmark* b) {
-  b->Arg(5000)->Unit(benchmark::kMicrosecond);
-}
+void Longest(benchmark::internal::Benchmark* b) { b->Arg(5000)->Unit(benchmark::kMicrosecond); }
 
 BENCHMARK_CAPTURE(Run, StochasticFast, "STO")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, StochasticSlow, "STO", true)->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, StochasticK200, "STO", false, &OscSettings::StochK)->Apply(Longest);
-BENCHMARK_CAPTURE(Run, StochasticD200, "STO", true, &OscSettings::StochD)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, StochasticK200, "STO", false, &kStochK)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, StochasticD200, "STO", true, &kStochD)->Apply(Longest);
 BENCHMARK(FloorStochastic)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, FX, "FX")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, RocAndFx, "R/F")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, ROC, "ROC")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, RocAverage200, "ROC", false, &OscSettings::RocA)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, RocAverage200, "ROC", false, &kRocA)->Apply(Longest);
 BENCHMARK(FloorRoc)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, Momentum, "MOM")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, Williams, "WMS")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, WilliamsP200, "WMS", false, &OscSettings::WmsA)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, WilliamsP200, "WMS", false, &kWmsA)->Apply(Longest);
 BENCHMARK(FloorWilliams)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, RMO, "RMO")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, RMX, "RMX")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, RmxP200, "RMX", false, &OscSettings::RmxP)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, RmxP200, "RMX", false, &kRmxP)->Apply(Longest);
 BENCHMARK_CAPTURE(Run, RSI, "RSI")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, RsiP200, "RSI", false, &OscSettings::RsiP)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, RsiP200, "RSI", false, &kRsiP)->Apply(Longest);
 BENCHMARK(FloorRsi)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, Volatility, "VTY")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, VolatilityP200, "VTY", false, &OscSettings::VtyD)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, VolatilityP200, "VTY", false, &kVtyD)->Apply(Longest);
 BENCHMARK_CAPTURE(Run, MACD, "MACD")->Apply(Sizes);
 BENCHMARK(FloorMacd)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, DirectionalMovement, "DM")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, DirectionalMovementN200, "DM", false, &OscSettings::DMA)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, DirectionalMovementN200, "DM", false, &kDMA)->Apply(Longest);
 BENCHMARK_CAPTURE(Run, ElderRay, "ERY")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, Coppock, "COP")->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, HolyGrail, "JHG")->Apply(Sizes);
-BENCHMARK_CAPTURE(Run, HolyGrailP200, "JHG", false, &OscSettings::HolyD)->Apply(Longest);
+BENCHMARK_CAPTURE(Run, HolyGrailP200, "JHG", false, &kHolyD)->Apply(Longest);
 BENCHMARK_CAPTURE(Run, OBV, "OBV")->Apply(Sizes);
 BENCHMARK(FloorObv)->Apply(Sizes);
 BENCHMARK_CAPTURE(Run, Parabolic, "PARA")->Apply(Sizes);

@@ -35,8 +35,7 @@ struct Bench {
     settings.paths.CurrentDataPath = "c:\\korawin\\data\\";
     settings.fonts.TitleSize = 9.75;
     settings.fonts.Font2Size = 8.25;
-    for (const OscKey& key : OscKeys())
-      settings.osc.*key.value = {key.defaultDaily, key.defaultTwin};
+    for (const OscKey& key : OscKeys()) settings.osc[key] = {key.defaultDaily, key.defaultTwin};
     LoadColours(home.files(), "c:\\korawin\\", "Black", colours);
     HeadlessSurface price(size.width, size.height), panel(size.width, kPanel);
     ChartRequest request;
@@ -45,8 +44,8 @@ struct Bench {
     request.GridLines = true;
     request.OscName = "MACD";
     Composition chart;
-    const ChartServices services{home.files(), dialogs, settings.paths, settings.fonts, colours,
-                                 price,        &panel,  &script,        {}};
+    const ChartServices services{
+        home.files(), dialogs, settings.paths, settings.fonts, colours, price, &panel, &script, {}};
     ComposeChart(services, request, chart);
     OscHost host{home.files(), dialogs, settings, colours, request, chart, price, panel, &script};
     host.OscCode = "MACD";

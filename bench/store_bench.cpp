@@ -117,7 +117,7 @@ void FindLastCode(benchmark::State& state) {
   }
 }
 
-void LoadBars(benchmark::State& state, const char* period) {
+void LoadBars(benchmark::State& state, Period period) {
   Market& market = TheMarket();
   ChartBars bars;
   for (auto _ : state) {
@@ -137,8 +137,8 @@ BENCHMARK_CAPTURE(OpenFiles, name_in_other_case, "C:\\KORAWIN\\DATA\\", true);
 BENCHMARK(ReadNamesPlain);
 BENCHMARK(FindLastCode);
 BENCHMARK(ReadPricesPlain);
-BENCHMARK_CAPTURE(LoadBars, daily, "A");
-BENCHMARK_CAPTURE(LoadBars, weekly, "W");
-BENCHMARK_CAPTURE(LoadBars, monthly, "M");
+BENCHMARK_CAPTURE(LoadBars, daily, Period::kDaily);
+BENCHMARK_CAPTURE(LoadBars, weekly, Period::kWeekly);
+BENCHMARK_CAPTURE(LoadBars, monthly, Period::kMonthly);
 
 }  // namespace

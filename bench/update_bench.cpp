@@ -14,6 +14,7 @@
 #include "store/price_rec.h"
 #include "tests/support/temp_home.h"
 #include "update/download_update.h"
+#include "update/import_history.h"
 
 using namespace kora;
 
@@ -35,11 +36,12 @@ struct Quiet : Dialogs {
     throw std::runtime_error(std::string(text));
   }
   Answer Ask(std::string_view, std::string_view, Buttons) override { return Answer::kOk; }
-  std::optional<std::string> Prompt(std::string_view, std::string_view,
-                                    std::string_view) override {
+  std::optional<std::string> Prompt(std::string_view, std::string_view, std::string_view) override {
     return std::nullopt;
   }
-  std::unique_ptr<Progress> StartProgress(std::string_view) override { return nullptr; }
+  std::unique_ptr<Progress> StartProgress(std::string_view) override {
+    return std::make_unique<NoProgress>();
+  }
   void SetBusy(bool) override {}
   void Yield() override {}
 };
@@ -80,7 +82,7 @@ class Market {
   }
   void Update(std::int16_t service) {
     settings_.download.DataService = service;
-    UpdateDisplay display;
+    NoProgress display;
     CurrentName current;
     DownloadEntries entries{"15SEP98.d"};
     if (UpdateOneDay({files_, settings_, current, dialogs_, MachineClock(), display}, entries, 0) !=
@@ -102,9 +104,17 @@ Market& TheMarket() {
   return market;
 }
 
+// One wait until all that was written is on the disk.
+void FlushDisk(const std::string& folder) {
+  const int fd = ::open(folder.c_str(), O_RDONLY | O_CLOEXEC);
+  if (fd < 0 || ::syncfs(fd) != 0) throw std::runtime_error("not flushed");
+  ::close(fd);
+}
+
 // The bare calls: open, read the last `back` records (the last one at least), write so many and
-// `more`, close.
-void UpdateFloor(benchmark::State& state, int back, int more) {
+// `more`, close. `flushes` then waits for the disk as often as a day's update does: for its journal,
+// for the files.
+void UpdateFloor(benchmark::State& state, int back, int more, int flushes) {
   Market& market = TheMarket();
   std::vector<std::string> paths;
   for (int i = 0; i < kSecurities; ++i) paths.push_back(market.HostData() + "/" + Code(i) + ".WDT");
@@ -124,6 +134,7 @@ void UpdateFloor(benchmark::State& state, int back, int more) {
         state.SkipWithError("no record");
       ::close(fd);
     }
+    for (int i = 0; i < flushes; ++i) FlushDisk(market.HostData());
   }
   state.SetItemsProcessed(state.iterations() * kSecurities);
 }
@@ -148,7 +159,7 @@ void EmptyMarket(Market& market, int lines) {
   market.PutDay(Date(0), lines);
 }
 
-// Open the name file, append, close; make the price file, write, close.
+// Open the name file, append, close; make the price file, write, close. Then the same flushes.
 void NewFloor(benchmark::State& state) {
   for (auto _ : state) {
     state.PauseTiming();
@@ -159,8 +170,8 @@ void NewFloor(benchmark::State& state) {
       const NameRec name = NewNameRec("");
       const PriceRec rec = NewPriceRec("");
       for (int i = 0; i < state.range(0); ++i) {
-        int fd = ::open((market.HostData() + "/Names.dat").c_str(), O_RDWR | O_CREAT | O_CLOEXEC,
-                        0666);
+        int fd =
+            ::open((market.HostData() + "/Names.dat").c_str(), O_RDWR | O_CREAT | O_CLOEXEC, 0666);
         if (::pwrite(fd, &name, sizeof(name), ::lseek(fd, 0, SEEK_END)) != ssize_t(sizeof(name)))
           state.SkipWithError("no name");
         ::close(fd);
@@ -170,6 +181,7 @@ void NewFloor(benchmark::State& state) {
           state.SkipWithError("no record");
         ::close(fd);
       }
+      for (int i = 0; i < 2; ++i) FlushDisk(market.HostData());
       state.PauseTiming();
     }
     state.ResumeTiming();
@@ -193,23 +205,114 @@ void UpdateNew(benchmark::State& state) {
   state.SetItemsProcessed(state.iterations() * state.range(0));
 }
 
-BENCHMARK_CAPTURE(UpdateFloor, append, 0, 1)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateFloor, append, 0, 1, 0)->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateFloor, append_flushed, 0, 1, 2)
+    ->Iterations(kRuns)
+    ->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(UpdateDay, append, kDays, kSecurities, 1)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+    ->Iterations(kRuns)
+    ->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(UpdateDay, no_trades, kDays, 1, 5)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(UpdateFloor, replace, 1, 0)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+    ->Iterations(kRuns)
+    ->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateFloor, replace_flushed, 1, 0, 2)
+    ->Iterations(kRuns)
+    ->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(UpdateDay, replace, kDays - 1, kSecurities, 1)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(UpdateFloor, insert_10_back, 10, 1)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
+    ->Iterations(kRuns)
+    ->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(UpdateFloor, insert_10_back_flushed, 10, 1, 2)
+    ->Iterations(kRuns)
+    ->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(UpdateDay, insert_10_back, kDays - 10.5, kSecurities, 1)
-    ->Iterations(kRuns)->Unit(benchmark::kMillisecond);
-BENCHMARK(NewFloor)->Arg(1250)->Arg(2500)->Arg(5000)->Iterations(2)->Unit(
-    benchmark::kMillisecond);
-BENCHMARK(UpdateNew)->Arg(1250)->Arg(2500)->Arg(5000)->Iterations(2)->Unit(
-    benchmark::kMillisecond);
+    ->Iterations(kRuns)
+    ->Unit(benchmark::kMillisecond);
+// ---- Import
+
+constexpr int kRows = 250;
+
+// Text files of one new security each, and the bytes of the price files that they come to.
+struct Sources {
+  explicit Sources(int count) {
+    std::string text = "Date,Open,High,Low,Close,Volume\n";
+    for (int d = 0; d < kRows; ++d) {
+      text += Date(d) + ",1.25,1.5,1.125,1.375,12345\n";
+      PriceRec rec = NewPriceRec(Date(d));
+      rec.Open = 1.25f;
+      rec.High = 1.5f;
+      rec.Low = 1.125f;
+      rec.Close = 1.375f;
+      rec.Volume = 12345;
+      days.push_back(rec);
+    }
+    for (int i = 0; i < count; ++i) {
+      home.Put("in/" + Code(i) + ".csv", text);
+      names.push_back(home.path() + "/in/" + Code(i) + ".csv");
+    }
+    home.files().MakeFolder(kData);
+    folder = home.files().HostPath(kData);
+  }
+  test::TempHome home;
+  std::vector<std::string> names;
+  std::vector<PriceRec> days;
+  std::string folder;
+};
+
+// The same new files by bare calls: each written beside its place, all flushed at once, renamed; the
+// names of the folder flushed.
+void ImportFloor(benchmark::State& state) {
+  for (auto _ : state) {
+    state.PauseTiming();
+    {
+      Sources sources(int(state.range(0)));
+      const size_t size = sources.days.size() * sizeof(PriceRec);
+      state.ResumeTiming();
+      for (int i = 0; i < state.range(0); ++i) {
+        const std::string path = sources.folder + "/" + Code(i) + ".WDT.new";
+        const int fd = ::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+        if (::pwrite(fd, sources.days.data(), size, 0) != ssize_t(size))
+          state.SkipWithError("no prices");
+        ::close(fd);
+      }
+      FlushDisk(sources.folder);
+      for (int i = 0; i < state.range(0); ++i) {
+        const std::string path = sources.folder + "/" + Code(i) + ".WDT";
+        if (::rename((path + ".new").c_str(), path.c_str()) != 0) state.SkipWithError("no name");
+      }
+      FlushDisk(sources.folder);
+      state.PauseTiming();
+    }
+    state.ResumeTiming();
+  }
+  state.SetItemsProcessed(state.iterations() * state.range(0));
+}
+
+void ImportNew(benchmark::State& state) {
+  for (auto _ : state) {
+    state.PauseTiming();
+    {
+      Sources sources(int(state.range(0)));
+      Quiet dialogs;
+      ImportCounts counts;
+      state.ResumeTiming();
+      if (!ImportHistory(sources.home.files(), kData, sources.names, {}, dialogs, counts))
+        state.SkipWithError("not imported");
+      state.PauseTiming();
+    }
+    state.ResumeTiming();
+  }
+  state.SetItemsProcessed(state.iterations() * state.range(0));
+}
+
+BENCHMARK(ImportFloor)
+    ->Arg(500)
+    ->Arg(1000)
+    ->Arg(2000)
+    ->Iterations(2)
+    ->Unit(benchmark::kMillisecond);
+BENCHMARK(ImportNew)->Arg(500)->Arg(1000)->Arg(2000)->Iterations(2)->Unit(benchmark::kMillisecond);
+
+BENCHMARK(NewFloor)->Arg(1250)->Arg(2500)->Arg(5000)->Iterations(2)->Unit(benchmark::kMillisecond);
+BENCHMARK(UpdateNew)->Arg(1250)->Arg(2500)->Arg(5000)->Iterations(2)->Unit(benchmark::kMillisecond);
 
 }  // namespace

@@ -7,7 +7,9 @@
 
 #include "chart/script_player.h"
 #include "chartwindow/forms/Chts.h"
+#include "chartwindow/tools/zoom_chart.h"
 #include "demo/demo_market.h"
+#include "indicators/osc_settings.h"
 #include "platform/headless/console_dialogs.h"
 #include "tests/support/temp_home.h"
 
@@ -30,14 +32,22 @@ struct Market {
   Market() {
     MakeDemo(files, ini, user, dialogs, {});
     settings.paths.WindowsPath = "C:\\WINDOWS\\";
-    ReadPaths(ini, files, dialogs, settings);
+    ReadSettings(ini, files, dialogs, settings);
+    ReadOscPeriods(ini, settings.osc);
     LoadUserColours(files, settings.paths.SystemPath, colours);
   }
   ChartWindow Window(QtRasterSurface& price, QtRasterSurface& panel) {
     panel.SetVisible(false);
-    return ChartWindow({.files = files, .dialogs = dialogs, .settings = settings, .ini = ini,
-                        .user = user, .colours = colours, .current = current, .state = state,
-                        .price = price, .panel = panel});
+    return ChartWindow({.files = files,
+                        .dialogs = dialogs,
+                        .settings = settings,
+                        .ini = ini,
+                        .user = user,
+                        .colours = colours,
+                        .current = current,
+                        .state = state,
+                        .price = price,
+                        .panel = panel});
   }
 };
 
@@ -68,7 +78,7 @@ void CrossMove(benchmark::State& bench) {
   window.ToggleGrid();
   double x = 50;
   for (auto _ : bench) {
-    window.MouseMove(x, 200);
+    window.MouseMove({x, 200});
     x = x > 600 ? 50 : x + 1;
   }
 }
@@ -76,9 +86,13 @@ void CrossMove(benchmark::State& bench) {
 // The same through the form: the event, the status bar, and the painting of what changed.
 void CrossMoveForm(benchmark::State& bench) {
   Market market;
-  auto* form = new Chts({.files = market.files, .dialogs = market.dialogs,
-                         .settings = market.settings, .ini = market.ini, .user = market.user,
-                         .colours = market.colours, .current = market.current,
+  auto* form = new Chts({.files = market.files,
+                         .dialogs = market.dialogs,
+                         .settings = market.settings,
+                         .ini = market.ini,
+                         .user = market.user,
+                         .colours = market.colours,
+                         .current = market.current,
                          .state = market.state});
   form->resize(int(bench.range(0)), int(bench.range(1)));
   form->show();
@@ -97,6 +111,95 @@ void CrossMoveForm(benchmark::State& bench) {
   }
   delete form;
 }
+
+// The same with the band of a line from a first click.
+void BandMove(benchmark::State& bench) {
+  Market market;
+  QtRasterSurface price(double(bench.range(0)), double(bench.range(1)));
+  QtRasterSurface panel(double(bench.range(0)), 144);
+  ChartWindow window = market.Window(price, panel);
+  window.Load();
+  window.NextChart();
+  window.ToggleTrendline();
+  window.MouseRelease({60, 300}, MouseButton::kLeft);
+  double x = 50;
+  for (auto _ : bench) {
+    window.MouseMove({x, 200});
+    x = x > 600 ? 50 : x + 1;
+  }
+}
+
+void BandMoveForm(benchmark::State& bench) {
+  Market market;
+  auto* form = new Chts({.files = market.files,
+                         .dialogs = market.dialogs,
+                         .settings = market.settings,
+                         .ini = market.ini,
+                         .user = market.user,
+                         .colours = market.colours,
+                         .current = market.current,
+                         .state = market.state});
+  form->resize(int(bench.range(0)), int(bench.range(1)));
+  form->show();
+  QCoreApplication::processEvents();
+  form->Start();
+  form->window().ToggleTrendline();
+  form->window().MouseRelease({60, 300}, MouseButton::kLeft);
+  auto* picture = form->findChild<QWidget*>("Picture1");
+  QCoreApplication::processEvents();
+  double x = 50;
+  for (auto _ : bench) {
+    QMouseEvent move(QEvent::MouseMove, {x, 200}, picture->mapToGlobal(QPointF(x, 200)),
+                     Qt::NoButton, Qt::NoButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(picture, &move);
+    QCoreApplication::processEvents();
+    x = x > 600 ? 50 : x + 1;
+  }
+  delete form;
+}
+
+// A composition with 200 saved lines on the chart, and without: the floor.
+void ComposeLines(benchmark::State& bench) {
+  Market market;
+  QtRasterSurface price(1280, 800), panel(1280, 144);
+  ChartWindow window = market.Window(price, panel);
+  window.Load();
+  window.NextChart();
+  const Composition& chart = window.Chart;
+  const std::string path =
+      TrendlinePath(market.settings.paths.ChartMiscPath, window.Request.Name.Code.trimmed());
+  market.files.MakeFolder(market.settings.paths.ChartMiscPath);
+  RemoveTrendlines(market.files, path);
+  for (int i = 0; i < bench.range(0); ++i) {
+    const double x = chart.ChartLeft + (i % 100 + 1) * double(chart.BarSpacing);
+    const auto line = TrendlineOf(chart, window.Request, {x, 150.0 + i, x + 40, 160.0 + i});
+    if (line) SaveTrendline(market.files, path, *line);
+  }
+  for (auto _ : bench) benchmark::DoNotOptimize(window.Recompose());
+  bench.counters["lines"] = double(ReadTrendlines(market.files, path).size());
+}
+
+// Forty bars of a candle chart over 1280 x 800, beside the composition of that chart.
+void ZoomOf40(benchmark::State& bench, bool zoom) {
+  Market market;
+  QtRasterSurface price(1280, 800), panel(1280, 144);
+  ChartWindow window = market.Window(price, panel);
+  window.Load();
+  market.state.ChartStyle = Style::kCandlestick;
+  window.NextChart();
+  const Composition& chart = window.Chart;
+  const double left = chart.ChartLeft + 100.0 * chart.BarSpacing;
+  const ZoomBox box{left, 100, left + 40.0 * chart.BarSpacing, 600};
+  QtRasterSurface picture(1280, 800);
+  for (auto _ : bench) {
+    if (zoom)
+      ZoomChart(picture, chart, window.Request, market.colours, market.settings.fonts, box);
+    else
+      benchmark::DoNotOptimize(window.Recompose());
+  }
+}
+void Zoom40(benchmark::State& bench) { ZoomOf40(bench, true); }
+void ComposeCandles(benchmark::State& bench) { ZoomOf40(bench, false); }
 
 void SavedChart(benchmark::State& bench, bool play) {
   Market market;
@@ -127,6 +230,16 @@ void Sizes(benchmark::internal::Benchmark* b) {
 BENCHMARK(PageForward)->Name("WindowPageForward")->Apply(Sizes);
 BENCHMARK(CrossMove)->Name("WindowCrossMove")->Apply(Sizes);
 BENCHMARK(CrossMoveForm)->Name("WindowCrossMoveInTheForm")->Apply(Sizes);
+BENCHMARK(BandMove)->Name("WindowBandMove")->Apply(Sizes);
+BENCHMARK(BandMoveForm)->Name("WindowBandMoveInTheForm")->Apply(Sizes);
+BENCHMARK(ComposeLines)
+    ->Name("WindowComposeWithSavedLines")
+    ->ArgName("lines")
+    ->Arg(0)
+    ->Arg(200)
+    ->Unit(benchmark::kMicrosecond);
+BENCHMARK(ComposeCandles)->Name("WindowComposeCandles1280x800")->Unit(benchmark::kMicrosecond);
+BENCHMARK(Zoom40)->Name("WindowZoomOf40Bars")->Unit(benchmark::kMicrosecond);
 BENCHMARK(ComposeSaved)->Name("WindowComposeChart")->Unit(benchmark::kMicrosecond);
 BENCHMARK(PlaySaved)->Name("WindowPlaySavedChart")->Unit(benchmark::kMicrosecond);
 

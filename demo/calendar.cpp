@@ -24,22 +24,19 @@ bool IsMovedHoliday(const CalendarDate& date, int weekday, int day) {
 
 bool IsHoliday(const CalendarDate& date, int weekday) {
   switch (date.month) {
-    case 1:
-      return IsMovedHoliday(date, weekday, 1) || IsMovedHoliday(date, weekday, 26);
+    case 1: return IsMovedHoliday(date, weekday, 1) || IsMovedHoliday(date, weekday, 26);
     case 3:
     case 4: {
       if (date.month == 4 && date.day == 25) return true;
       const std::int32_t fromEaster = DayNumber(date) - Easter(date.year);
       return fromEaster == -2 || fromEaster == 1;
     }
-    case 6:
-      return weekday == kMonday && date.day >= 8 && date.day <= 14;
+    case 6: return weekday == kMonday && date.day >= 8 && date.day <= 14;
     case 12:
       // 25 and 26, and the Monday or Tuesday that makes up for a weekend among them.
       if (date.day == 25 || date.day == 26) return true;
       return (date.day == 27 || date.day == 28) && (weekday == kMonday || weekday == kTuesday);
-    default:
-      return false;
+    default: return false;
   }
 }
 

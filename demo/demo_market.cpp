@@ -2,16 +2,19 @@
 
 #include <algorithm>
 #include <cmath>
+#include <filesystem>
 #include <string>
 #include <vector>
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "demo/company_details.h"
 #include "demo/market.h"
 #include "demo/names.h"
+#include "indicators/osc_settings.h"
+#include "looks/colours.h"
 #include "settings/settings.h"
-#include "store/colours.h"
 #include "store/name_file.h"
 
 namespace kora {
@@ -55,10 +58,10 @@ struct Counts {
 // A warrant or an option, before its share has prices.
 struct RightPlan {
   bool warrant;
-  char letter;      // fourth character of a warrant
+  char letter;  // fourth character of a warrant
   bool call;
   bool lapsed;
-  int first;        // day
+  int first;  // day
   CalendarDate expiry;
   std::uint64_t stream;
 };
@@ -110,9 +113,13 @@ class DemoWriter {
   struct Entry {
     NameRec rec;
     std::vector<PriceRec> waiting;
+    float close = 0;  // the last one of the history
   };
 
   std::string DownloadPath() const { return paths_.SystemPath + "download\\"; }
+  std::string SystemPath() const { return paths_.SystemPath + "dlsys\\"; }  // of the service
+  std::string InPath() const { return DownloadPath() + "in\\"; }
+  std::string OutPath() const { return DownloadPath() + "out\\"; }
   void MakeFolders();
   void WriteFile(const std::string& path, std::string_view bytes);
   // False when the user stopped.
@@ -127,6 +134,8 @@ class DemoWriter {
   NameRec ShareRecord(int index, const ShareProfile& share, const Namer::Company& company,
                       const Series& series, Random& random) const;
   void WriteDownloads();
+  void WriteCompanies();
+  void WriteBulletins(const std::string& base, int day);
   void WriteLists();
   void WriteSettings(SettingsFile& ini);
 
@@ -138,10 +147,10 @@ class DemoWriter {
   std::unique_ptr<Progress> progress_;
 
   std::vector<ShareProfile> profiles_;
-  std::vector<Random> randoms_;                  // of the shares
-  std::vector<std::vector<RightPlan>> rights_;   // by share
+  std::vector<Random> randoms_;                 // of the shares
+  std::vector<std::vector<RightPlan>> rights_;  // by share
   std::vector<Entry> entries_;
-  std::vector<std::string> leaders_;             // the words of their names
+  std::vector<std::string> leaders_;  // the words of their names
   std::vector<std::string> leaderCodes_;
   MarketSums sums_{days_.count()};
   std::vector<std::string> written_;
@@ -150,7 +159,8 @@ class DemoWriter {
 void DemoWriter::MakeFolders() {
   for (const std::string& folder :
        {paths_.SystemPath, paths_.CurrentDataPath, paths_.ChartBackupPath,
-        paths_.SystemPath + "chtmisc\\", paths_.SystemPath + "chtsave\\", DownloadPath()})
+        paths_.SystemPath + "chtmisc\\", paths_.SystemPath + "chtsave\\", DownloadPath(), InPath(),
+        OutPath(), SystemPath()})
     files_.MakeFolder(folder);
 }
 
@@ -174,7 +184,9 @@ bool DemoWriter::Put(NameRec rec, const Series& series) {
   const auto* bytes = reinterpret_cast<const char*>(series.records.data());
   WriteFile(paths_.CurrentDataPath + CodeFileName(rec.Code.trimmed(), ".WDT"),
             {bytes, size_t(kept) * sizeof(PriceRec)});
-  entries_.push_back({rec, {series.records.begin() + kept, series.records.end()}});
+  entries_.push_back({rec,
+                      {series.records.begin() + kept, series.records.end()},
+                      kept > 0 ? series.records[size_t(kept - 1)].Close : 0.0f});
   return progress_->Step(int(entries_.size()), options_.securities);
 }
 
@@ -196,7 +208,7 @@ void DemoWriter::PlanRights() {
     plan.letter = n % 5 == 3 ? 'I' : n % 11 == 9 ? 'E' : 'W';
     plan.call = plan.letter != 'W' || n % 3 != 1;
     plan.lapsed = !plan.warrant && n % 3 == 1;
-    const int months = plan.warrant ? 2 + random.Below(12)
+    const int months = plan.warrant  ? 2 + random.Below(12)
                        : plan.lapsed ? -2 - random.Below(5)
                                      : 1 + random.Below(4);
     const CalendarDate month = AddMonths({last.year, last.month, 1}, months);
@@ -209,18 +221,17 @@ void DemoWriter::PlanRights() {
   }
 }
 
-NameRec DemoWriter::ShareRecord(int index, const ShareProfile& share,
-                                const Namer::Company& company, const Series& series,
-                                Random& random) const {
+NameRec DemoWriter::ShareRecord(int index, const ShareProfile& share, const Namer::Company& company,
+                                const Series& series, Random& random) const {
   NameRec rec = NewNameRec(company.code);
   rec.Name.set(company.name);
   rec.Id.set("A");
   rec.IndClass.set(Format(double(company.classId), "000"));
   const std::string sector = SectorOf(share.sector).name;
-  rec.Category = share.tier == Tier::kLeader                    ? kLeaders
-                 : share.tier == Tier::kPenny                   ? kSpeculative
-                 : sector == "Mining" || sector == "Energy"     ? kResources
-                                                                : kIndustrials;
+  rec.Category = share.tier == Tier::kLeader                ? kLeaders
+                 : share.tier == Tier::kPenny               ? kSpeculative
+                 : sector == "Mining" || sector == "Energy" ? kResources
+                                                            : kIndustrials;
   if (share.last < days_.history - 1) {
     rec.Category = kNotQuoted;
     rec.OtherDetails.set("To " + FormatUserDate(days_.dates[size_t(share.last)]));
@@ -284,8 +295,8 @@ bool DemoWriter::PutRights(const Namer::Company& company, const Series& share,
     const double spot = double(share.records[size_t(plan.first)].Close);
     Right right;
     right.call = plan.call;
-    right.strike = RoundStrike(spot * (plan.call ? random.Between(0.8, 1.05)
-                                                 : random.Between(0.95, 1.2)));
+    right.strike =
+        RoundStrike(spot * (plan.call ? random.Between(0.8, 1.05) : random.Between(0.95, 1.2)));
     right.expiry = DayNumber(plan.expiry);
     if (plan.warrant && right.strike > 8) right.ratio = 4;
     const Series series = SimulateRight(right, share, plan.first, days_, random);
@@ -296,18 +307,20 @@ bool DemoWriter::PutRights(const Namer::Company& company, const Series& share,
     const std::string side = plan.call ? "Call" : "Put";
     const std::string strike = Format(right.strike, "0.00");
     if (plan.warrant) {
-      const char* kind = plan.letter == 'I' ? "Instalment" : plan.letter == 'E' ? "Endowment"
-                                                                                : "Wts";
+      const char* kind = plan.letter == 'I'   ? "Instalment"
+                         : plan.letter == 'E' ? "Endowment"
+                                              : "Wts";
       rec.Name.set(company.word + " " + kind + " " + MonthAndYear(plan.expiry));
       rec.OtherDetails.set(side + " " + strike);
-      rec.Category = plan.letter == 'I' ? kInstalments : plan.letter == 'E' ? kEndowments
-                                                                            : kWarrants;
+      rec.Category = plan.letter == 'I'   ? kInstalments
+                     : plan.letter == 'E' ? kEndowments
+                                          : kWarrants;
       rec.Id.set("S");
     } else {
       // The texts that the update writes and looks for in a list of options.
       rec.Name.set(plan.lapsed ? "**EXPIRED**"
-                               : company.word + " " + side + " " + MonthAndYear(plan.expiry) +
-                                     " " + strike);
+                               : company.word + " " + side + " " + MonthAndYear(plan.expiry) + " " +
+                                     strike);
       rec.OtherDetails.set((plan.call ? "0C" : "0P") + FormatUserDate(plan.expiry));
       rec.Category = kOptions;
       rec.Id.set("P");
@@ -329,8 +342,7 @@ bool DemoWriter::PutMarket() {
     return rec;
   };
   const Series broad = sums_.Index(-1, days_);
-  if (!Put(record("XBRD", "Broad Market Index", kIndex, kIndices, "X", "911"), broad))
-    return false;
+  if (!Put(record("XBRD", "Broad Market Index", kIndex, kIndices, "X", "911"), broad)) return false;
   for (int s = 0; s < counts_.sectorIndices; ++s) {
     const Sector& sector = SectorOf(s);
     if (!Put(record(sector.indexCode, sector.name + std::string(" Index"), kIndex, kIndices, "X",
@@ -360,8 +372,7 @@ bool DemoWriter::PutMarket() {
   return true;
 }
 
-// A line of eight fields for each security that traded. Those that the update gives a flat
-// record by itself are left out when they did not.
+// A line of eight fields for each security, traded or not: the service's files have all of them.
 void DemoWriter::WriteDownloads() {
   static const char* const months[] = {"JAN", "FEB", "MAR", "APR", "MAY", "JUN",
                                        "JUL", "AUG", "SEP", "OCT", "NOV", "DEC"};
@@ -371,18 +382,90 @@ void DemoWriter::WriteDownloads() {
     for (const Entry& entry : entries_) {
       for (const PriceRec& rec : entry.waiting) {
         if (rec.RecDate.raw() != date) continue;
-        const bool filled = entry.rec.RecType == kShare && entry.rec.Category < 90;
-        if (filled && rec.Volume == 0) continue;
         text += std::string(entry.rec.Code.trimmed()) + "," + date;
-        for (const float price : {rec.Open, rec.High, rec.Low, rec.Close})
-          text += "," + Str(price);
+        for (const float price : {rec.Open, rec.High, rec.Low, rec.Close}) text += "," + Str(price);
         text += "," + Str(rec.Volume) + ",0\r\n";
       }
     }
-    WriteFile(DownloadPath() + date.substr(6, 2) + months[days_.dates[size_t(day)].month - 1] +
-                  date.substr(2, 2) + ".d",
-              text);
+    const std::string base =
+        date.substr(6, 2) + months[days_.dates[size_t(day)].month - 1] + date.substr(2, 2);
+    WriteFile(DownloadPath() + base + ".d", text);
+    WriteBulletins(base, day - days_.history);
   }
+}
+
+// Facts of the companies that are quoted, a list for the snapshot, and a program that answers it.
+void DemoWriter::WriteCompanies() {
+  std::vector<Company> companies;
+  std::string snapshot;
+  int listed = 0;
+  for (const Entry& entry : entries_) {
+    const NameRec& rec = entry.rec;
+    if (rec.RecType == kShare && rec.Category <= kSpeculative && entry.close > 0)
+      companies.push_back({rec, entry.close});
+    if (rec.Category == kLeaders && listed < 8) {
+      const std::string code(rec.Code.trimmed());
+      snapshot += code + ",S,";
+      if (++listed <= 3)
+        snapshot +=
+            Str(std::int32_t(500 * listed)) + "," + Format(entry.close * 0.9, "0.00") + ",0.25";
+      else
+        snapshot += ",,";
+      snapshot += "\r\n";
+    }
+  }
+  snapshot += "XBRD,I,,,\r\n";
+  const CompanyFiles details =
+      MakeCompanyDetails(companies, days_.dates[size_t(days_.history - 1)], options_.seed);
+  WriteFile(SystemPath() + "STKHeader.txt", details.header);
+  WriteFile(SystemPath() + "SecurityDetails.Stx", details.store);
+  WriteFile(SystemPath() + "Sdix1.inx", details.index);
+  WriteFile(paths_.SystemPath + "Snapshot.Dat", snapshot);
+  const std::string program = paths_.SystemPath + "Quickcomm.exe";
+  WriteFile(program, CommsProgram());
+  std::error_code ignored;  // where it can't be run the snapshot says so
+  std::filesystem::permissions(files_.HostPath(program), std::filesystem::perms::owner_exec,
+                               std::filesystem::perm_options::add, ignored);
+}
+
+// What the exchange told about the days that wait: every kind of event, about securities of the
+// market. The new codes and figures are invented.
+void DemoWriter::WriteBulletins(const std::string& base, int day) {
+  std::vector<std::string> shares;
+  for (const Entry& entry : entries_)
+    if (entry.rec.RecType == kShare && entry.rec.Code.trimmed().size() == 3)
+      shares.emplace_back(entry.rec.Code.trimmed());
+  const auto share = [&](int number) {
+    return shares.empty() ? std::string("AAA") : shares[size_t(number) % shares.size()];
+  };
+  const auto name = [&](const std::string& code) {
+    for (const Entry& entry : entries_)
+      if (entry.rec.Code.trimmed() == code) return std::string(Trim(entry.rec.Name.trimmed()));
+    return code;
+  };
+  const auto line = [](const char* act, const std::string& code, const char* mark,
+                       const std::string& rest, const char* market = "ASX.STK") {
+    return std::string(act) + "," + code + "," + market + ",," + mark + "," + rest + "\r\n";
+  };
+  std::string text;
+  switch (day) {
+    case 0:
+      text = line("BI", share(2), "Y", base + ",1,4") +
+             line("DI", share(0), "N", base + ",,,12.5") +
+             line("NI", share(5), "Y", UCase(name(share(5))) + " GROUP,011");
+      break;
+    case 1:
+      text = line("SP", share(3), "Y", base + ",1,1") +
+             line("PC", share(1), "Y", base + ",V:250000") +
+             line("NL", share(6), "N", UCase(name(share(6))) + " HOLDINGS,012") +
+             line("EN", share(4), "N", base);
+      break;
+    default:
+      text = line("NC", share(7), "Y", base + ",ZNEW") + line("DC", share(8), "N", base) +
+             line("DI", share(2), "N", base + ",,,4");
+      break;
+  }
+  WriteFile(InPath() + base + ".Asx.Btn", text);
 }
 
 void DemoWriter::WriteLists() {
@@ -407,8 +490,12 @@ void DemoWriter::WriteLists() {
 void DemoWriter::WriteSettings(SettingsFile& ini) {
   SettingsFile::Batch batch(ini);
   WriteDefaultSettings(ini);
-  ini.PutSetting("Download", "DataService", "4");
+  WriteDefaultOscPeriods(ini);
+  ini.PutSetting("Download", "DataService", "1");
+  ini.PutSetting("Download", "System", SystemPath());
   ini.PutSetting("Download", "DLPath", DownloadPath());
+  ini.PutSetting("Download", "In", InPath());
+  ini.PutSetting("Download", "Out", OutPath());
   ini.PutSetting("Download", "InternetDLfmt", "DDMMMYY.D");
   ini.PutSetting("Download", "Volume divisor", "1");
   ini.PutSetting("Download", "UpdateAll", "True");
@@ -427,12 +514,16 @@ bool DemoWriter::Run(SettingsFile& ini, SettingsFile& user) {
   for (const IndustryClass& c : IndustryClasses())
     classes += Format(double(c.id), "000") + "," + c.text + "\r\n";
   WriteFile(paths_.SystemPath + "IndClass.dat", classes);
+  for (const char* table : {"BLK", "WHT", "BLU"})
+    written_.push_back(paths_.SystemPath + "Koraclr." + table);
+  WriteColourVariants(files_, paths_.SystemPath);
   written_.push_back(paths_.SystemPath + "koraprn.dat");
   PrinterColours printer;
   printer.ColourPrinter = 1;
   printer.WhiteAsBlack = 1;
   WritePrinterColours(files_, paths_.SystemPath, printer);
   WriteDownloads();
+  WriteCompanies();
   WriteLists();
 
   // Last, what makes the home an installation.
@@ -468,6 +559,8 @@ bool MakeDemo(Files& files, SettingsFile& ini, SettingsFile& user, Dialogs& dial
       options.years > 40)
     throw RunTimeError(kBadCall, "5 to 5000 securities, 1 to 40 years");
   RefuseUsedHome(files, ini);
+  files.MakeFolder("c:\\");  // a home that is not there yet can't be locked
+  const auto held = files.lock().Hold();
   DemoWriter writer(files, dialogs, options);
   try {
     if (writer.Run(ini, user)) return true;

@@ -21,23 +21,18 @@ struct Regime {
 };
 enum Mood { kBull, kSideways, kBear, kCrash, kRecovery };
 constexpr Regime kRegimes[] = {
-    {0.0007, 0.0065, 90, 320},  {0.0001, 0.0060, 40, 160}, {-0.0009, 0.0110, 40, 170},
-    {-0.0150, 0.0240, 6, 18},   {0.0023, 0.0150, 25, 70},
+    {0.0007, 0.0065, 90, 320}, {0.0001, 0.0060, 40, 160}, {-0.0009, 0.0110, 40, 170},
+    {-0.0150, 0.0240, 6, 18},  {0.0023, 0.0150, 25, 70},
 };
 
 Mood NextMood(Mood mood, Random& random) {
   const int n = random.Below(100);
   switch (mood) {
-    case kBull:
-      return n < 45 ? kSideways : n < 80 ? kBear : kCrash;
-    case kSideways:
-      return n < 70 ? kBull : kBear;
-    case kBear:
-      return n < 35 ? kCrash : n < 70 ? kSideways : kBull;
-    case kCrash:
-      return kRecovery;
-    case kRecovery:
-      return n < 70 ? kBull : kSideways;
+    case kBull: return n < 45 ? kSideways : n < 80 ? kBear : kCrash;
+    case kSideways: return n < 70 ? kBull : kBear;
+    case kBear: return n < 35 ? kCrash : n < 70 ? kSideways : kBull;
+    case kCrash: return kRecovery;
+    case kRecovery: return n < 70 ? kBull : kSideways;
   }
   return kBull;
 }
@@ -60,9 +55,7 @@ double Hold(double value, double low, double high) { return std::clamp(value, lo
 // Volumes of shares are in hundreds, as data services deliver them.
 constexpr double kSharesPerUnit = 100;
 
-std::int32_t ToVolume(double volume) {
-  return std::int32_t(std::floor(Hold(volume, 1.0, 2.0e9)));
-}
+std::int32_t ToVolume(double volume) { return std::int32_t(std::floor(Hold(volume, 1.0, 2.0e9))); }
 
 PriceRec Flat(const std::string& date, float close) {
   PriceRec rec = NewPriceRec(date);
@@ -166,8 +159,8 @@ Factors MakeFactors(const Days& days, std::uint64_t seed) {
   for (int day = 0; day < days.count(); ++day) {
     if (left-- <= 0) {
       if (day > 0) mood = NextMood(mood, random);
-      left = kRegimes[mood].shortest +
-             random.Below(kRegimes[mood].longest - kRegimes[mood].shortest);
+      left =
+          kRegimes[mood].shortest + random.Below(kRegimes[mood].longest - kRegimes[mood].shortest);
     }
     // Long histories neither vanish nor reach the sky.
     trend *= 1.00025;
@@ -215,8 +208,10 @@ ShareProfile MakeProfile(int index, int shares, const Days& days, Random& random
   if (!founding) {
     // A new float has at least some weeks of prices, and some shares are quoted no longer.
     const int span = days.history;
-    if (fate < 0.10 || index == shares - 2) share.first = int(span * (0.15 + 0.65 * when));
-    else if (fate < 0.14 || index == shares - 3) share.last = int(span * (0.45 + 0.45 * when));
+    if (fate < 0.10 || index == shares - 2)
+      share.first = int(span * (0.15 + 0.65 * when));
+    else if (fate < 0.14 || index == shares - 3)
+      share.last = int(span * (0.45 + 0.45 * when));
   }
   if (index < 3) {
     static constexpr Planned kFirst[] = {Planned::kBonus, Planned::kSplit, Planned::kCash};
@@ -318,9 +313,12 @@ Series SimulateShare(const ShareProfile& share, const Factors& factors, const Da
       plannedDone = true;
     } else if (sinceAdjustment > 250) {
       const bool extreme = close > 40000 || (share.tier == Tier::kPenny && close < 9);
-      if (extreme && event < 0.05) kind = Planned::kSplit;
-      else if (!extreme && close >= 200 && event < 0.00012) kind = Planned::kBonus;
-      else if (!extreme && close >= 200 && event < 0.00024) kind = Planned::kCash;
+      if (extreme && event < 0.05)
+        kind = Planned::kSplit;
+      else if (!extreme && close >= 200 && event < 0.00012)
+        kind = Planned::kBonus;
+      else if (!extreme && close >= 200 && event < 0.00024)
+        kind = Planned::kCash;
     }
     if (kind == Planned::kNone) continue;
     Adjustment adjustment = MakeAdjustment(kind, close, random);
@@ -378,9 +376,7 @@ Series MarketSums::Index(int sector, const Days& days) const {
 // Chained from day to day over the shares that both days had, so that a new float or an end of
 // quotation does not move it.
 Series MarketSums::MakeIndex(const Sums& sums, const Days& days) const {
-  const auto tenths = [](double points) {
-    return float(std::floor(points * 10 + 0.5) / 10.0);
-  };
+  const auto tenths = [](double points) { return float(std::floor(points * 10 + 0.5) / 10.0); };
   Series series;
   double level = 1000;
   series.records.push_back(Flat(days.texts[0], tenths(level)));
@@ -438,8 +434,7 @@ Series SimulateRight(const Right& right, const Series& share, int first, const D
     const auto worth = [&](float at) {
       const double inside = right.call ? double(at) - right.strike : right.strike - double(at);
       const double time = 0.8 * yearly * double(at) * std::sqrt(years);
-      return ToThousandths(0.5 * (inside + std::sqrt(inside * inside + time * time)) /
-                           right.ratio);
+      return ToThousandths(0.5 * (inside + std::sqrt(inside * inside + time * time)) / right.ratio);
     };
     const double luck = random.Unit();
     const double grain = random.Between(0.3, 1.7);
@@ -471,8 +466,9 @@ Series SimulateFund(const Series& index, const Days& days, Random& random) {
   const double units = random.Between(2.0e4, 2.0e5);
   for (int day = 0; day < days.count(); ++day) {
     if (day > 0) {
-      const double move = double(index.records[size_t(day)].Close) /
-                              double(index.records[size_t(day - 1)].Close) - 1;
+      const double move =
+          double(index.records[size_t(day)].Close) / double(index.records[size_t(day - 1)].Close) -
+          1;
       price *= 1 + share * move + random.Noise() * 0.0015;
     }
     PriceRec rec = Flat(days.texts[size_t(day)], FromThousandths(ToThousandths(price)));

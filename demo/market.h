@@ -49,10 +49,10 @@ struct ShareProfile {
   Tier tier = Tier::kMiddle;
   int sector = 0;
   int first = 0;
-  int last = 0;          // last day; before the market's last for a share no longer quoted
+  int last = 0;  // last day; before the market's last for a share no longer quoted
   Planned planned = Planned::kNone;
   double startPrice = 1;
-  double issued = 1e6;   // shares on issue at the start
+  double issued = 1e6;  // shares on issue at the start
 };
 ShareProfile MakeProfile(int index, int shares, const Days& days, Random& random);
 Series SimulateShare(const ShareProfile& share, const Factors& factors, const Days& days,
@@ -73,8 +73,7 @@ class MarketSums {
   struct Sums {
     std::vector<double> before, open, high, low, close, volume;
   };
-  static void AddDay(Sums& sums, int day, double units, const PriceRec& last,
-                     const PriceRec& now);
+  static void AddDay(Sums& sums, int day, double units, const PriceRec& last, const PriceRec& now);
   Series MakeIndex(const Sums& sums, const Days& days) const;
 
   Sums all_;

@@ -8,10 +8,10 @@
 namespace kora::demo {
 
 const Sector& SectorOf(int sector) {
-  static const Sector sectors[kSectors] = {
-      {"Mining", "XMIN", 110},   {"Finance", "XFNC", 310},  {"Energy", "XNRG", 120},
-      {"Consumer", "XCSM", 220}, {"Industry", "XNDS", 210}, {"Technology", "XTKN", 410},
-      {"Health", "XHLT", 230},   {"Materials", "XMTL", 130}};
+  static const Sector sectors[kSectors] = {{"Mining", "XMIN", 110},   {"Finance", "XFNC", 310},
+                                           {"Energy", "XNRG", 120},   {"Consumer", "XCSM", 220},
+                                           {"Industry", "XNDS", 210}, {"Technology", "XTKN", 410},
+                                           {"Health", "XHLT", 230},   {"Materials", "XMTL", 130}};
   return sectors[sector];
 }
 
@@ -59,15 +59,15 @@ const std::vector<IndustryClass>& IndustryClasses() {
 Namer::Namer(std::uint64_t seed) : random_(seed, 1) {
   // Two halves that make a word of no language.
   static const char* const heads[] = {
-      "Tarr", "Belm", "Kinj", "Yand", "Morv", "Wex",  "Quill", "Dunt", "Farl", "Garb", "Holv",
-      "Jint", "Lomb", "Narv", "Orrb", "Pelt", "Ravk", "Selk",  "Tulv", "Ulm",  "Verr", "Warb",
-      "Yarv", "Zebr", "Brint", "Cald", "Dorv", "Ellk", "Fenj", "Gild", "Hask", "Irv",  "Jorv",
-      "Kelb", "Lask", "Mund", "Nork", "Ostr", "Pyrm", "Rusk",  "Stav", "Tryl", "Undr", "Vosk",
-      "Wynd", "Zant", "Drav", "Burr"};
-  static const char* const tails[] = {
-      "owin",   "umurra", "ajarra", "endool", "abindi", "orrick", "ulmere", "istow",  "angong",
-      "ovalla", "undary", "ecambe", "itarra", "ellup",  "ondine", "aquay",  "urrin",  "ismar",
-      "ogarth", "entha"};
+      "Tarr", "Belm", "Kinj", "Yand", "Morv",  "Wex",  "Quill", "Dunt", "Farl", "Garb",
+      "Holv", "Jint", "Lomb", "Narv", "Orrb",  "Pelt", "Ravk",  "Selk", "Tulv", "Ulm",
+      "Verr", "Warb", "Yarv", "Zebr", "Brint", "Cald", "Dorv",  "Ellk", "Fenj", "Gild",
+      "Hask", "Irv",  "Jorv", "Kelb", "Lask",  "Mund", "Nork",  "Ostr", "Pyrm", "Rusk",
+      "Stav", "Tryl", "Undr", "Vosk", "Wynd",  "Zant", "Drav",  "Burr"};
+  static const char* const tails[] = {"owin",   "umurra", "ajarra", "endool", "abindi",
+                                      "orrick", "ulmere", "istow",  "angong", "ovalla",
+                                      "undary", "ecambe", "itarra", "ellup",  "ondine",
+                                      "aquay",  "urrin",  "ismar",  "ogarth", "entha"};
   for (const char* head : heads)
     for (const char* tail : tails) words_.push_back(std::string(head) + tail);
   for (size_t i = words_.size() - 1; i > 0; --i)

@@ -32,9 +32,9 @@ class Namer {
   explicit Namer(std::uint64_t seed);
 
   struct Company {
-    std::string code;   // three letters
-    std::string word;   // "Tarrowin"
-    std::string name;   // "Tarrowin Gold NL", at most 35 characters
+    std::string code;  // three letters
+    std::string word;  // "Tarrowin"
+    std::string name;  // "Tarrowin Gold NL", at most 35 characters
     int classId;
   };
   Company Next(int sector);

@@ -61,8 +61,10 @@ std::optional<CalendarDate> ParseUserDate(std::string_view text) {
     if (p == end || *p < '0' || *p > '9') return std::nullopt;
     const auto r = std::from_chars(p, end, part[i]);
     if (r.ec != std::errc()) return std::nullopt;
-    if (i == 2) yearDigits = size_t(r.ptr - p);
-    else if (r.ptr - p > 2) return std::nullopt;
+    if (i == 2)
+      yearDigits = size_t(r.ptr - p);
+    else if (r.ptr - p > 2)
+      return std::nullopt;
     p = r.ptr;
     if (i < 2) {
       if (p == end || *p != '/') return std::nullopt;

@@ -1,79 +1,59 @@
 #include "base/file_set.h"
 
-#include "base/runtime_error.h"
+#include <optional>
 
 namespace kora {
-namespace {
 
-constexpr const char* kTemporary = ".tmp~";
-
-void WriteFlushed(Io& io, const std::string& host, std::string_view bytes) {
-  const auto file = io.Open(host, OpenMode::kReplace);
-  file->WriteAt(0, bytes.data(), bytes.size());
-  file->Flush();
+// The listing of the folder that Files keeps is told of what the set did, or making thousands of
+// files would read it thousands of times.
+void FileSet::Note(const std::string& host, bool added) {
+  folders_.try_emplace(HostFolderOf(host), -1);
+  changes_.push_back({host, added});
 }
-
-std::string ReadWhole(HostFile& file) {
-  std::string bytes(size_t(file.Size()), '\0');
-  bytes.resize(file.ReadAt(0, bytes.data(), bytes.size()));
-  return bytes;
-}
-
-// For clean-ups after a failure, which is the one to tell.
-void RemoveQuietly(Io& io, const std::string& host) noexcept {
-  try {
-    if (io.Status(host).exists) io.Remove(host);
-  } catch (const RunTimeError&) {
-  }
-}
-
-}  // namespace
 
 void FileSet::Add(std::string_view path, std::string bytes) {
-  Item item;
-  item.host = files_.HostPath(path);
-  item.temporary = item.host + kTemporary;
-  const HostStatus status = files_.io().Status(item.host);
-  if (status.folder) throw RunTimeError(kPathAccess, "Is a directory");
-  item.existed = status.exists;
-  item.bytes = std::move(bytes);
-  items_.push_back(std::move(item));
+  const std::string host = files_.Locate(path, true);
+  set_.Write(host, std::move(bytes));
+  Note(host, true);
+}
+
+void FileSet::Remove(std::string_view path) {
+  const std::string host = files_.HostPath(path);
+  set_.Remove(host);
+  Note(host, false);
+}
+
+void FileSet::Rename(std::string_view from, std::string_view to) {
+  const auto [hostFrom, hostTo] = files_.RenamePaths(from, to);
+  set_.Rename(hostFrom, hostTo);
+  Note(hostFrom, false);
+  Note(hostTo, true);
+}
+
+void FileSet::Stage() {
+  for (auto& [folder, before] : folders_)
+    if (before < 0) before = files_.Modified(folder);
+  set_.Stage();
 }
 
 void FileSet::Commit() {
-  Io& io = files_.io();
+  const auto changes = std::move(changes_);
+  changes_.clear();
   try {
-    for (const Item& item : items_) WriteFlushed(io, item.temporary, item.bytes);
-    for (Item& item : items_) {
-      item.bytes.clear();
-      if (item.existed) item.bytes = ReadWhole(*io.Open(item.host, OpenMode::kRead));
-      io.Rename(item.temporary, item.host);
-      item.placed = true;
-    }
-  } catch (const RunTimeError&) {
-    Restore();
-    items_.clear();
+    std::optional<HomeLock::Held> held;
+    if (set_.size() > 1) held.emplace(files_.lock().Hold());
+    Stage();
+    set_.Commit();
+  } catch (...) {
+    folders_.clear();
     throw;
   }
-  items_.clear();
-}
-
-void FileSet::Restore() noexcept {
-  Io& io = files_.io();
-  for (const Item& item : items_) {
-    if (item.placed && item.existed) {
-      try {
-        WriteFlushed(io, item.temporary, item.bytes);
-        io.Rename(item.temporary, item.host);
-        continue;
-      } catch (const RunTimeError&) {
-        // The new file stays: it is whole, and better than none.
-      }
-    } else if (item.placed) {
-      RemoveQuietly(io, item.host);
-    }
-    RemoveQuietly(io, item.temporary);
+  for (const Change& change : changes) {
+    std::int64_t& before = folders_[HostFolderOf(change.host)];
+    files_.Note(change.host, change.added, before);
+    before = files_.Modified(HostFolderOf(change.host));
   }
+  folders_.clear();
 }
 
 }  // namespace kora

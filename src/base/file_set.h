@@ -1,41 +1,50 @@
 #pragma once
 
+#include <cstdint>
+#include <map>
 #include <string>
 #include <string_view>
 #include <vector>
 
 #include "base/files.h"
+#include "base/host_file_set.h"
 
 namespace kora {
 
-// Several files that are replaced together or not at all.
-//
-// Commit first writes all new bytes to temporary files beside the old ones, so that a full disk
-// shows while every file is still as it was, and then only renames. A crash in between leaves
-// each file old or new, never half-written, and those added first are the first to be new.
+// Files of the home that change together or not at all: a HostFileSet by DOS paths, whose rules
+// and errors it has. A set of several changes is committed under the home's lock, and finished by
+// the next who takes it where its process dies: all of the files are old then, or all new. The changes are made in the order in which they were added, and each path is
+// that of the file as it is when it is added: a file that the set itself makes or moves is named
+// in the case in which the set made it.
 class FileSet {
  public:
-  explicit FileSet(const Files& files) : files_(files) {}
+  explicit FileSet(const Files& files)
+      : files_(files), set_(files.io(), SetJournalOf(files.home())) {}
 
-  // `path` is a DOS path; a path is added once. Nothing is written yet. Error 75 for a folder.
+  // New bytes for a file, which is made when missing.
   void Add(std::string_view path, std::string bytes);
+  // Nothing where it is not there by then.
+  void Remove(std::string_view path);
+  // Replaces `to`. Error 53 in Commit where `from` is not there by then.
+  void Rename(std::string_view from, std::string_view to);
 
-  // Puts the new files in place, and the set is empty again. A failure brings back what was
-  // there, removes the temporary files and is raised again.
+  // Writes what was added so far to temporary files and frees its memory.
+  void Stage();
+  // Puts everything in place, and the set is empty again.
   void Commit();
 
  private:
-  struct Item {
+  struct Change {
     std::string host;
-    std::string temporary;
-    std::string bytes;   // the new ones; from the rename on the old ones
-    bool existed = false;
-    bool placed = false;
+    bool added;
   };
-  void Restore() noexcept;
+  void Note(const std::string& host, bool added);
 
   const Files& files_;
-  std::vector<Item> items_;
+  HostFileSet set_;
+  std::vector<Change> changes_;
+  // Times of the folders before the set changed anything in them.
+  std::map<std::string, std::int64_t> folders_;
 };
 
 }  // namespace kora

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "base/file_set.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
 
@@ -71,12 +72,6 @@ bool IsWindows(const DosParts& parts, std::string_view name) {
   return parts.drive == 'c' && EqualNoCase(name, "windows");
 }
 
-std::string FolderOf(const std::string& host) {
-  const size_t slash = host.rfind('/');
-  if (slash == std::string::npos) return ".";
-  return slash == 0 ? "/" : host.substr(0, slash);
-}
-
 std::string Join(const std::string& folder, std::string_view name) {
   std::string out;
   out.reserve(folder.size() + 1 + name.size());
@@ -88,10 +83,17 @@ std::string Join(const std::string& folder, std::string_view name) {
 
 }  // namespace
 
-Files::Files(std::string home, Io& io) : home_(std::move(home)), io_(io) {
-  while (home_.size() > 1 && home_.back() == '/') home_.pop_back();
-  if (home_.empty()) home_ = ".";  // never the root of the host
+namespace {
+
+std::string WithoutSlash(std::string home) {
+  while (home.size() > 1 && home.back() == '/') home.pop_back();
+  return home.empty() ? "." : home;  // never the root of the host
 }
+
+}  // namespace
+
+Files::Files(std::string home, Io& io)
+    : home_(WithoutSlash(std::move(home))), io_(io), lock_(home_, io) {}
 
 Files::~Files() = default;
 
@@ -108,9 +110,10 @@ Files::Folder* Files::ReadFolder(const std::string& host, std::int64_t modified)
   std::vector<std::string> names;
   try {
     names = io_.List(host);
-  } catch (const RunTimeError&) {
-    listings_.erase(host);  // a folder that may not be listed has no names to offer
-    return nullptr;
+  } catch (const RunTimeError& e) {
+    listings_.erase(host);
+    if (e.number() != kPathAccess && e.number() != kPathNotFound) throw;
+    return nullptr;  // a folder that may not be listed has no names to offer
   }
   std::sort(names.begin(), names.end());
   for (std::string& name : names) {
@@ -140,8 +143,8 @@ const std::string* Files::FindEntry(const std::string& hostFolder, std::string_v
   const bool found = it != folder->entries.end();
   // Who looks where to make a file may rely on the program's own notes, or making thousands
   // would read the folder thousands of times. Who looks for a file must not miss it.
-  if (!folder->sure && (found ? !io_.Status(Join(hostFolder, it->second)).exists
-                              : !(making && folder->own))) {
+  if (!folder->sure &&
+      (found ? !io_.Status(Join(hostFolder, it->second)).exists : !(making && folder->own))) {
     folder = ReadFolder(hostFolder, Modified(hostFolder));
     if (!folder) return nullptr;
     it = folder->entries.find(key);
@@ -151,7 +154,7 @@ const std::string* Files::FindEntry(const std::string& hostFolder, std::string_v
 
 // The program's own changes are entered into a listing that was true before them.
 void Files::Note(const std::string& host, bool added, std::int64_t before) const {
-  const std::string hostFolder = FolderOf(host);
+  const std::string hostFolder = HostFolderOf(host);
   const auto it = listings_.find(hostFolder);
   if (it == listings_.end()) return;
   Folder& folder = *it->second;
@@ -219,7 +222,8 @@ std::string Files::Locate(std::string_view path, bool making) const {
     host = Join(hostFolder, name);
     if (io_.Status(host).exists) return host;
   }
-  if (const std::string* entry = FindEntry(hostFolder, name, making)) return Join(hostFolder, *entry);
+  if (const std::string* entry = FindEntry(hostFolder, name, making))
+    return Join(hostFolder, *entry);
   return host;
 }
 
@@ -238,7 +242,8 @@ std::string Files::DosPath(std::string_view hostPath) const {
 bool Files::CheckFile(std::string_view path) const {
   try {
     return io_.Status(HostPath(path)).exists;
-  } catch (const RunTimeError&) {
+  } catch (const RunTimeError& e) {
+    if (e.number() != kBadFileName) throw;
     return false;  // what is no path does not exist
   }
 }
@@ -246,7 +251,8 @@ bool Files::CheckFile(std::string_view path) const {
 bool Files::IsFolder(std::string_view path) const {
   try {
     return io_.Status(HostPath(path)).folder;
-  } catch (const RunTimeError&) {
+  } catch (const RunTimeError& e) {
+    if (e.number() != kBadFileName) throw;
     return false;
   }
 }
@@ -289,7 +295,7 @@ std::unique_ptr<HostFile> Files::Open(std::string_view path, OpenMode mode) cons
     return file;
   }
   const std::string host = Locate(path, true);
-  const std::int64_t before = Modified(FolderOf(host));
+  const std::int64_t before = Modified(HostFolderOf(host));
   auto file = io_.Open(host, mode);
   Note(host, true, before);
   return file;
@@ -312,7 +318,7 @@ void Files::MakeFolder(std::string_view path) const {
     const HostStatus status = io_.Status(part);
     if (status.exists && !status.folder) throw RunTimeError(kPathAccess);
     if (status.exists) continue;
-    const std::int64_t before = Modified(FolderOf(part));
+    const std::int64_t before = Modified(HostFolderOf(part));
     io_.MakeFolder(part);
     Note(part, true, before);
   }
@@ -320,18 +326,24 @@ void Files::MakeFolder(std::string_view path) const {
 
 void Files::Remove(std::string_view path) const {
   const std::string host = HostPath(path);
-  const std::int64_t before = Modified(FolderOf(host));
+  const std::int64_t before = Modified(HostFolderOf(host));
   io_.Remove(host);
   Note(host, false, before);
 }
 
-void Files::Rename(std::string_view from, std::string_view to) const {
-  const std::string hostFrom = HostPath(from);
+std::pair<std::string, std::string> Files::RenamePaths(std::string_view from,
+                                                       std::string_view to) const {
+  std::string hostFrom = HostPath(from);
   std::string hostTo = Locate(to, true);
-  const std::string folderFrom = FolderOf(hostFrom), folderTo = FolderOf(hostTo);
   const std::string_view name = SplitName(to).second;
   if (hostTo == hostFrom && !name.empty() && name != "." && name != "..")
-    hostTo = Join(folderTo, name);
+    hostTo = Join(HostFolderOf(hostTo), name);
+  return {std::move(hostFrom), std::move(hostTo)};
+}
+
+void Files::Rename(std::string_view from, std::string_view to) const {
+  const auto [hostFrom, hostTo] = RenamePaths(from, to);
+  const std::string folderFrom = HostFolderOf(hostFrom), folderTo = HostFolderOf(hostTo);
   const std::int64_t beforeFrom = Modified(folderFrom), beforeTo = Modified(folderTo);
   io_.Rename(hostFrom, hostTo);
   if (io_.Status(hostTo).folder) {
@@ -354,27 +366,18 @@ std::string Files::ReadAll(std::string_view path, std::uint64_t limit) const {
 }
 
 void Files::WriteAll(std::string_view path, std::string_view bytes) const {
-  const std::string host = Locate(path, true);
-  const std::string temporary = host + ".tmp~";
-  const std::int64_t before = Modified(FolderOf(host));
-  try {
-    auto file = io_.Open(temporary, OpenMode::kReplace);
-    file->WriteAt(0, bytes.data(), bytes.size());
-    file->Flush();
-    file.reset();
-    io_.Rename(temporary, host);
-  } catch (const RunTimeError&) {
-    if (io_.Status(temporary).exists) {
-      try {
-        io_.Remove(temporary);
-      } catch (const RunTimeError&) {
-        // The first failure is the one to tell.
-      }
-    }
-    throw;
-  }
-  Note(host, true, before);
+  FileSet set(*this);
+  set.Add(path, std::string(bytes));
+  set.Commit();
 }
+
+FileStamp Files::Stamp(std::string_view path) const {
+  const HostStatus status = io_.Status(HostPath(path));
+  if (!status.exists) return {};
+  return {status.id, status.size, status.modified};
+}
+
+std::string_view FileNameOf(std::string_view path) { return path.substr(path.rfind('\\') + 1); }
 
 std::string WithBackslash(std::string_view folder) {
   std::string out(folder);
@@ -390,8 +393,18 @@ bool IsFileCode(std::string_view code) {
     const auto u = static_cast<unsigned char>(c);
     if (u < 0x21 || u == 0x7F || u >= 0x80) return false;
     switch (c) {
-      case '\\': case '/': case ':': case '*': case '?': case '"':
-      case '<': case '>': case '|': case ',': case ';': case '=': return false;
+      case '\\':
+      case '/':
+      case ':':
+      case '*':
+      case '?':
+      case '"':
+      case '<':
+      case '>':
+      case '|':
+      case ',':
+      case ';':
+      case '=': return false;
       default: break;
     }
   }

@@ -6,11 +6,22 @@
 #include <string>
 #include <string_view>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
+#include "base/home_lock.h"
 #include "base/io.h"
 
 namespace kora {
+
+// What a file was when it was looked at: equal stamps, same bytes. A file that is missing has the
+// empty one.
+struct FileStamp {
+  std::uint64_t id = 0;
+  std::uint64_t size = 0;
+  std::int64_t modified = 0;
+  friend bool operator==(const FileStamp&, const FileStamp&) = default;
+};
 
 // DOS paths and the host files behind them. Paths are UTF-8 with "\" between the names and a
 // drive in front ("c:\korawin\data\Names.dat"); names match whatever their case. Drive C: is
@@ -20,6 +31,9 @@ namespace kora {
 //
 // Opening asks the host for the exact name first and looks through the folder only when that
 // fails; folders are read once and read again only when they may have changed.
+//
+// For one thread: const calls too note what they found. A second thread has Files of its own over
+// the same home.
 //
 // Errors of every call that takes a path: 52 for one that HostPath refuses, and those of Io.
 class Files {
@@ -32,6 +46,8 @@ class Files {
 
   const std::string& home() const { return home_; }
   Io& io() const { return io_; }
+  // Whoever writes the store holds it: `const auto held = files.lock().Hold();`.
+  HomeLock& lock() const { return lock_; }
 
   // The host path of a DOS path: of the entry that is there in any case, or else where it
   // would be made. A path with no drive is of drive C:. Error 52 for a path with an empty
@@ -40,7 +56,7 @@ class Files {
   // The DOS path that names an absolute host path: on C: within the home's drive, else on Z:.
   std::string DosPath(std::string_view hostPath) const;
 
-  // True when the path exists, file or folder.
+  // True when the path exists, file or folder. What is no path does not exist.
   bool CheckFile(std::string_view path) const;
   bool IsFolder(std::string_view path) const;
   // Error 53 when the file is not there and the mode does not make it, 76 when its folder is not.
@@ -55,11 +71,15 @@ class Files {
 
   // The whole file. Error 7 when larger than `limit` bytes.
   std::string ReadAll(std::string_view path, std::uint64_t limit = 256u << 20) const;
-  // Replaces the file as a whole: written to a temporary file beside it, flushed, renamed
-  // over. A failure or a crash at any point leaves the old file or the new one.
+  // Replaces the file as a whole: a FileSet of one. A failure or a crash at any point leaves the
+  // old file or the new one.
   void WriteAll(std::string_view path, std::string_view bytes) const;
 
+  // Tells whether a file that was read is still the one: it costs one question to the host.
+  FileStamp Stamp(std::string_view path) const;
+
  private:
+  friend class FileSet;
   struct Folder;
   // Finds by text without making a string of it.
   struct TextHash : std::hash<std::string_view> {
@@ -72,6 +92,8 @@ class Files {
   };
 
   std::string Locate(std::string_view path, bool making) const;
+  // Host paths of a rename; a name that differs in case alone stays in the case asked for.
+  std::pair<std::string, std::string> RenamePaths(std::string_view from, std::string_view to) const;
   std::unique_ptr<HostFile> OpenInKnown(Known& known, std::string_view name, OpenMode mode) const;
   Folder* ReadFolder(const std::string& host, std::int64_t modified) const;
   Folder* FolderFor(const std::string& host) const;
@@ -83,10 +105,14 @@ class Files {
 
   std::string home_;
   Io& io_;
+  mutable HomeLock lock_;
   // DOS folder -> host folder, of folders that were there when they were looked for.
   mutable std::unordered_map<std::string, Known, TextHash, std::equal_to<>> folders_;
   mutable std::unordered_map<std::string, std::unique_ptr<Folder>> listings_;
 };
+
+// The name behind the last "\" of a DOS path.
+std::string_view FileNameOf(std::string_view path);
 
 // "c:\korawin\data" and "c:\korawin\data\" both to "c:\korawin\data\"; empty stays empty.
 std::string WithBackslash(std::string_view folder);

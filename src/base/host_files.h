@@ -14,8 +14,8 @@ namespace kora {
 // plain file.
 std::string ReadHostFile(Io& io, const std::string& path, std::uint64_t limit);
 
-// Replaces the file as a whole, by way of a temporary file beside it, or leaves it as it was.
-// A link stays a link to the file that is replaced. Error 75 for what is no plain file.
+// Replaces the file as a whole, or leaves it as it was: a HostFileSet of one, whose rules and
+// errors it has.
 void WriteHostFile(Io& io, const std::string& path, std::string_view bytes);
 
 }  // namespace kora

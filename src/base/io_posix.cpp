@@ -1,10 +1,13 @@
+#include <dirent.h>
+#include <fcntl.h>
+#include <sys/file.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
 #include <cerrno>
 #include <chrono>
 #include <cstring>
-#include <dirent.h>
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
+#include <utility>
 
 #include "base/io.h"
 #include "base/runtime_error.h"
@@ -34,6 +37,9 @@ bool FolderExists(const std::string& path) {
     case ENOTEMPTY:
     case ELOOP:
     case ETXTBSY: number = kPathAccess; break;
+    case EMLINK:
+    case EXDEV:
+    case EOPNOTSUPP: number = kPathAccess; break;
     case ENOSPC:
     case EDQUOT:
     case EFBIG: number = kDiskFull; break;
@@ -50,7 +56,10 @@ bool FolderExists(const std::string& path) {
 class PosixFile : public HostFile {
  public:
   explicit PosixFile(int fd) : fd_(fd) {}
-  ~PosixFile() override { ::close(fd_); }
+  ~PosixFile() override {
+    if (fd_ >= 0) ::close(fd_);
+  }
+  int Release() { return std::exchange(fd_, -1); }
 
   size_t ReadAt(std::uint64_t offset, void* data, size_t size) override {
     size_t done = 0;
@@ -92,12 +101,56 @@ class PosixFile : public HostFile {
     if (::fsync(fd_) != 0 && errno != EINVAL) Fail(errno, {});
   }
 
+  void TakeAccess(const HostStatus& like) override {
+    // Who may not give the file away keeps it; its permissions follow all the same. A file system
+    // without owners refuses both.
+    if (::fchown(fd_, like.owner, like.group) != 0 && errno == EPERM)
+      Pass(::fchown(fd_, uid_t(-1), like.group));
+    Pass(::fchmod(fd_, mode_t(like.mode)));
+  }
+
+ private:
+  static void Pass(int result) {
+    if (result != 0 && errno != EPERM && errno != EOPNOTSUPP && errno != EINVAL) Fail(errno, {});
+  }
+
+  int fd_;
+};
+
+constexpr size_t kHolderSize = 256;
+
+class PosixLock : public HostLock {
+ public:
+  explicit PosixLock(int fd) : fd_(fd) {}
+  ~PosixLock() override {
+    // A holder's name left behind would be told for that of the next one.
+    Write({});
+    ::close(fd_);
+  }
+  // Always of one size, so that a disk that filled up meanwhile has room for it. A lock whose
+  // holder can't be written is one all the same.
+  void Write(std::string_view holder) {
+    std::string text(holder.substr(0, kHolderSize - 1));
+    text.resize(kHolderSize - 1, ' ');
+    text += '\n';
+    [[maybe_unused]] const ssize_t done = ::pwrite(fd_, text.data(), text.size(), 0);
+  }
+
  private:
   int fd_;
 };
 
+std::int64_t ModifiedOf(const struct stat& st) {
+#ifdef __APPLE__
+  return std::int64_t(st.st_mtimespec.tv_sec) * 1000000000 + st.st_mtimespec.tv_nsec;
+#else
+  return std::int64_t(st.st_mtim.tv_sec) * 1000000000 + st.st_mtim.tv_nsec;
+#endif
+}
+
 class PosixIo : public Io {
  public:
+  bool AnyThread() const override { return true; }
   std::unique_ptr<HostFile> Open(const std::string& path, OpenMode mode) override {
     int flags = O_CLOEXEC;
     switch (mode) {
@@ -105,40 +158,60 @@ class PosixIo : public Io {
       case OpenMode::kReadWrite: flags |= O_RDWR; break;
       case OpenMode::kCreate: flags |= O_RDWR | O_CREAT; break;
       case OpenMode::kReplace: flags |= O_RDWR | O_CREAT | O_TRUNC; break;
+      case OpenMode::kNew: flags |= O_RDWR | O_CREAT | O_EXCL | O_NOFOLLOW; break;
     }
     // A pipe in the place of a file must not hang the open.
     int fd;
     do fd = ::open(path.c_str(), flags | O_NONBLOCK, 0666);
     while (fd < 0 && errno == EINTR);
     if (fd < 0) Fail(errno, path);
+    // While it is open others see that it is being made. Where there are no locks, nobody does.
+    if (mode == OpenMode::kNew) ::flock(fd, LOCK_EX | LOCK_NB);
     return std::make_unique<PosixFile>(fd);
   }
 
   HostStatus Status(const std::string& path) override {
     struct stat st;
     HostStatus out;
-    if (::stat(path.c_str(), &st) != 0) return out;
+    if (::stat(path.c_str(), &st) != 0) {
+      switch (errno) {
+        case ENOENT:
+        case ENOTDIR:
+        case EACCES:
+        case EPERM:
+        case ELOOP:
+        case EINVAL:
+        case ENAMETOOLONG: return out;
+        default: Fail(errno, path);
+      }
+    }
     out.exists = true;
     out.folder = S_ISDIR(st.st_mode);
+    out.plain = S_ISREG(st.st_mode);
     out.size = std::uint64_t(st.st_size);
-#ifdef __APPLE__
-    out.modified = std::int64_t(st.st_mtimespec.tv_sec) * 1000000000 + st.st_mtimespec.tv_nsec;
-#else
-    out.modified = std::int64_t(st.st_mtim.tv_sec) * 1000000000 + st.st_mtim.tv_nsec;
-#endif
+    out.modified = ModifiedOf(st);
+    out.id = std::uint64_t(st.st_ino);
+    out.mode = std::uint32_t(st.st_mode & 07777);
+    out.owner = std::uint32_t(st.st_uid);
+    out.group = std::uint32_t(st.st_gid);
+    // The super-user may write what everybody has locked, and does not mean to.
+    out.readOnly = (st.st_mode & 0222) == 0;
     return out;
   }
 
   std::vector<std::string> List(const std::string& folder) override {
     DIR* dir = ::opendir(folder.c_str());
     if (!dir) Fail(errno, folder + "/");
+    const std::unique_ptr<DIR, int (*)(DIR*)> closing(dir, ::closedir);
     std::vector<std::string> names;
-    while (const dirent* entry = ::readdir(dir)) {
-      const std::string name = entry->d_name;
-      if (name != "." && name != "..") names.push_back(name);
+    for (;;) {
+      errno = 0;
+      const dirent* entry = ::readdir(dir);
+      if (!entry && errno != 0) Fail(errno, folder + "/");
+      if (!entry) return names;
+      const std::string_view name = entry->d_name;
+      if (name != "." && name != "..") names.emplace_back(name);
     }
-    ::closedir(dir);
-    return names;
   }
 
   void MakeFolder(const std::string& path) override {
@@ -155,9 +228,97 @@ class PosixIo : public Io {
     struct stat st;
     Fail(error, ::lstat(from.c_str(), &st) == 0 ? to : from);
   }
+
+  void FlushDisk(const std::string& folder) override {
+#ifdef __linux__
+    int fd;
+    do fd = ::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    while (fd < 0 && errno == EINTR);
+    if (fd < 0 && errno != EACCES) Fail(errno, folder + "/");
+    const int error = fd < 0 || ::syncfs(fd) == 0 ? 0 : errno;
+    if (fd >= 0) ::close(fd);
+    // A folder that may not be read, or a file system that knows no flush of its own.
+    if (fd < 0 || error == ENOSYS || error == EINVAL || error == EOPNOTSUPP) {
+      ::sync();
+    } else if (error != 0) {
+      Fail(error, folder + "/");
+    }
+#else
+    (void)folder;
+    ::sync();
+#endif
+  }
+
+  void Link(const std::string& from, const std::string& to) override {
+    if (::link(from.c_str(), to.c_str()) != 0) Fail(errno, from);
+  }
+
+  std::string LinkTarget(const std::string& path) override {
+    constexpr int kLongestChain = 40;
+    std::string host = path;
+    for (int links = 0; links < kLongestChain; ++links) {
+      std::string target(kLongestPath, '\0');
+      const ssize_t size = ::readlink(host.c_str(), target.data(), target.size());
+      if (size < 0 && (errno == EINVAL || errno == ENOENT || errno == ENOTDIR)) return host;
+      if (size < 0) Fail(errno, host);
+      target.resize(size_t(size));
+      if (target.starts_with('/')) {
+        host = std::move(target);
+      } else {
+        const size_t slash = host.rfind('/');
+        host = slash == std::string::npos ? target : host.substr(0, slash + 1) + target;
+      }
+    }
+    Fail(ELOOP, path);
+  }
+
+  void FlushFolder(const std::string& folder) override {
+    int fd;
+    do fd = ::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    while (fd < 0 && errno == EINTR);
+    // One that may be written but not read can't be opened, and some hosts flush no folders.
+    if (fd < 0 && errno == EACCES) return;
+    if (fd < 0) Fail(errno, folder + "/");
+    const int error = ::fsync(fd) != 0 ? errno : 0;
+    ::close(fd);
+    if (error != 0 && error != EINVAL && error != EOPNOTSUPP && error != EBADF)
+      Fail(error, folder + "/");
+  }
+
+  std::unique_ptr<HostLock> TryLock(const std::string& path, std::string_view holder,
+                                    std::string& heldBy) override {
+    heldBy.clear();
+    int fd;
+    do fd = ::open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK, 0666);
+    while (fd < 0 && errno == EINTR);
+    if (fd < 0) Fail(errno, path);
+    auto lock = std::make_unique<PosixFile>(fd);  // closes it unless the lock takes it over
+    int result;
+    do result = ::flock(fd, LOCK_EX | LOCK_NB);
+    while (result != 0 && errno == EINTR);
+    if (result != 0 && errno != EWOULDBLOCK && errno != EACCES) Fail(errno, path);
+    if (result != 0) {
+      std::string text(kHolderSize, ' ');
+      text.resize(lock->ReadAt(0, text.data(), text.size()));
+      heldBy = text.substr(0, text.find_last_not_of(" \n") + 1);
+      return nullptr;
+    }
+    auto held = std::make_unique<PosixLock>(lock->Release());
+    held->Write(holder);
+    return held;
+  }
+
+ private:
+  static constexpr size_t kLongestPath = 4096;
 };
 
 }  // namespace
+
+std::string HostFolderOf(const std::string& path) {
+  const size_t slash = path.rfind('/');
+  if (slash == std::string::npos) return ".";
+  return slash == 0 ? "/" : path.substr(0, slash);
+}
 
 bool TimeIsSettled(std::int64_t modified) {
   using namespace std::chrono;

@@ -66,7 +66,8 @@ std::string FormatDecimal(const Decimal& value, bool negative, std::string_view 
   std::string_view shownWhole(row.data(), size_t(wholeDigits) + 1);
   while (!shownWhole.empty() && shownWhole.front() == '0') shownWhole.remove_prefix(1);
   std::string_view shownPart(row.data() + wholeDigits + 1, size_t(maxPart));
-  const bool zero = shownWhole.empty() && shownPart.find_first_not_of('0') == std::string_view::npos;
+  const bool zero =
+      shownWhole.empty() && shownPart.find_first_not_of('0') == std::string_view::npos;
   while (int(shownPart.size()) > minPart && shownPart.back() == '0') shownPart.remove_suffix(1);
 
   std::string out;
@@ -100,8 +101,7 @@ void AppendShortest(std::string& out, T value) {
       return;
     }
     char buffer[512];
-    const auto end =
-        std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed);
+    const auto end = std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed);
     out.append(buffer, end.ptr);
     return;
   }

@@ -18,6 +18,7 @@ const char* ErrorText(int number) {
     case kBadRecordNumber: return "Bad record number";
     case kTooManyFiles: return "Too many files";
     case kDeviceNotAvailable: return "Device not available";
+    case kPermissionDenied: return "Permission denied";
     case kDiskNotReady: return "Disk not ready";
     case kPathAccess: return "Path or file access error";
     case kPathNotFound: return "Path not found";

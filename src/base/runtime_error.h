@@ -21,6 +21,7 @@ enum ErrorNumber : int {
   kBadRecordNumber = 63,
   kTooManyFiles = 67,
   kDeviceNotAvailable = 68,
+  kPermissionDenied = 70,
   kDiskNotReady = 71,
   kPathAccess = 75,
   kPathNotFound = 76,

@@ -60,6 +60,11 @@ bool EqualNoCase(std::string_view a, std::string_view b) {
   return true;
 }
 
+bool EndsNoCase(std::string_view text, std::string_view ending) {
+  return text.size() >= ending.size() &&
+         EqualNoCase(text.substr(text.size() - ending.size()), ending);
+}
+
 std::string PadRight(std::string_view text, size_t size) {
   std::string out(text.substr(0, size));
   out.resize(size, ' ');
@@ -100,7 +105,11 @@ std::string ToAnsi(std::string_view text) {
   out.reserve(text.size());
   for (size_t i = 0; i < text.size();) {
     const auto c = static_cast<unsigned char>(text[i]);
-    const int more = c < 0x80 ? 0 : (c >> 5) == 6 ? 1 : (c >> 4) == 14 ? 2 : (c >> 3) == 30 ? 3 : -1;
+    const int more = c < 0x80         ? 0
+                     : (c >> 5) == 6  ? 1
+                     : (c >> 4) == 14 ? 2
+                     : (c >> 3) == 30 ? 3
+                                      : -1;
     if (more == 0) {
       out += char(c);
       ++i;

@@ -16,6 +16,7 @@ std::string_view Trim(std::string_view text);
 std::string UCase(std::string_view text);
 std::string LCase(std::string_view text);
 bool EqualNoCase(std::string_view a, std::string_view b);
+bool EndsNoCase(std::string_view text, std::string_view ending);
 
 // Pads with blanks on the right, or cuts, to `size` bytes.
 std::string PadRight(std::string_view text, size_t size);

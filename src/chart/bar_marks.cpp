@@ -1,6 +1,6 @@
 #include "chart/bar_marks.h"
 
-#include "store/colours.h"
+#include "looks/colours.h"
 
 namespace kora {
 

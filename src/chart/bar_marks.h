@@ -35,8 +35,8 @@ class StopLossTracker {
   // else kChartLines.
   int Next(const ChartBar& bar, const ChartBar& previous, std::int16_t x);
 
-  bool broken() const { return broken_; }     // the stop was broken by the bar last seen
-  float stop() const { return stop_; }        // price, 0 none
+  bool broken() const { return broken_; }        // the stop was broken by the bar last seen
+  float stop() const { return stop_; }           // price, 0 none
   std::int16_t stopX() const { return stopX_; }  // where it was set
 
  private:

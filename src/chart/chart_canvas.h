@@ -6,8 +6,8 @@
 #include "chart/chart_pen.h"
 #include "chart/chart_request.h"
 #include "chart/composition.h"
+#include "looks/colours.h"
 #include "settings/settings.h"
-#include "store/colours.h"
 
 namespace kora {
 

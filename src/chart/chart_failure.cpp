@@ -23,8 +23,13 @@ std::string ChartFailureText(int number, const std::string& detail, const ChartF
     case kBadCall:
     case kOverflow: {
       std::string text = "There is a problem with the data for " + at.file + "\n";
-      if (at.record != 0) text += " at Rec Number (" + record + ") " + at.date;
-      else text += " at date (" + at.date + ") ";
+      // A failure that no record stands behind tells itself.
+      if (at.record == 0 && at.date.empty() && detail != ErrorText(number))
+        return text + " " + detail;
+      if (at.record != 0)
+        text += " at Rec Number (" + record + ") " + at.date;
+      else
+        text += " at date (" + at.date + ") ";
       text += at.RecType == kAdvanceDecline
                   ? "\nUse Check advance/decline totals procedure to adjust base to a higher "
                     "positive number."
@@ -39,8 +44,7 @@ std::string ChartFailureText(int number, const std::string& detail, const ChartF
     case kFileNotFound:
     case kBadRecordNumber:
     case kPathAccess:
-    case kPathNotFound:
-      return "There is a problem with " + at.file + " Cannot find or open";
+    case kPathNotFound: return "There is a problem with " + at.file + " Cannot find or open";
     case kInvalidValue:
       if (const std::string font = UCase(at.font); !font.empty())
         return "There is a problem with the Font you have selected for " + font +
@@ -54,8 +58,8 @@ std::string ChartFailureText(int number, const std::string& detail, const ChartF
       std::string text =
           "There is an unexpected error No. " + Str(std::int32_t(number)) + "\n" + detail;
       if (at.record != 0)
-        text += " Check data at Record number " + record +
-                " using View/Modify to check and correct.";
+        text +=
+            " Check data at Record number " + record + " using View/Modify to check and correct.";
       return text;
     }
   }

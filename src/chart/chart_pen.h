@@ -55,6 +55,13 @@ class ChartPen {
   void ScriptLineOnly(char letter, const Segment& s);
   void ScriptPoint(char letter, double x, double y, Colour colour);
 
+  // Where the script stands, and back to there: what was written since is gone, as when the
+  // surface was painted over.
+  size_t ScriptMark() const { return writes() ? script_->text().size() : 0; }
+  void CutScript(size_t mark) {
+    if (writes()) script_->buffer().resize(mark);
+  }
+
  private:
   void Write(char letter, const Segment& s);
 

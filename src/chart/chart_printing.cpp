@@ -29,9 +29,7 @@ class PaperPlayer {
         fonts_(fonts),
         colours_(colours),
         fontLabel_(fontLabel),
-        textFactor_(setup.ScriptPrintMode
-                        ? 1
-                        : std::min(1.0, frame.SX / printer.TwipsPerPixelX())),
+        textFactor_(setup.ScriptPrintMode ? 1 : std::min(1.0, frame.SX / printer.TwipsPerPixelX())),
         weight_(setup.PrintLine >= 1 && setup.PrintLine <= 10 ? setup.PrintLine : 2) {
     font_ = {fonts.Font1Name, fonts.TitleSize >= 1 ? fonts.TitleSize : 8, fonts.Font1Bold, false};
     SetFont(font_, "Font 1");
@@ -53,7 +51,8 @@ class PaperPlayer {
   Colour OnPaper(Colour colour) const {
     if (setup_.PrintColourMode == 0) return colours_[0];
     const bool white = colour == colours_[15] || colour == colours_[7];
-    return white && setup_.PrintWhiteBlack == 1 ? colours_[0] : colour;
+    if (white && setup_.PrintWhiteBlack == 1) return colours_[0];
+    return setup_.DarkPaper ? ForWhitePaper(colour) : colour;
   }
   // Scaled before it is rounded, so that the halves of candles come to paper.
   double X(const ScriptLine& line, int field) const {
@@ -171,8 +170,7 @@ std::int32_t Kept(double value) {
 }
 
 template <typename Script>
-bool Print(const ChartPrintServices& services, PrintSetup setup, ChartSize chart,
-           Script&& script) {
+bool Print(const ChartPrintServices& services, PrintSetup setup, ChartSize chart, Script&& script) {
   Printer& printer = services.printer;
   Dialogs& dialogs = services.dialogs;
   if (!printer.Exists()) {
@@ -185,6 +183,8 @@ bool Print(const ChartPrintServices& services, PrintSetup setup, ChartSize chart
   try {
     if (setup.PrintOrient == kPortrait || setup.PrintOrient == kLandscape)
       printer.SetOrientation(setup.PrintOrient);
+    else if (setup.FitSide)
+      printer.SetOrientation(BetterSide(chart));
     SetPageDefaults(printer, chart, setup);
     const ChartFrame frame = FrameOnPage(printer, setup, chart);
     const auto& text = script();
@@ -197,8 +197,8 @@ bool Print(const ChartPrintServices& services, PrintSetup setup, ChartSize chart
       failure = "Your printer will not accept font selected for " + fontLabel;
       title = "Printer Font";
     } else {
-      failure = "There is an unexpected error No. " + Str(std::int32_t(e.number())) + "\n" +
-                e.what();
+      failure =
+          "There is an unexpected error No. " + Str(std::int32_t(e.number())) + "\n" + e.what();
     }
   } catch (const std::bad_alloc&) {
     failure = "There is an unexpected error No. 7\n" + std::string(ErrorText(kOutOfMemory));
@@ -227,6 +227,8 @@ PrintSetup PrintSetupFrom(const Settings& settings, const PrinterColours& printe
   setup.PrintColourMode = printer.ColourPrinter;
   setup.PrintWhiteBlack = printer.WhiteAsBlack;
   setup.ScriptPrintMode = settings.words.ScriptPrintMode;
+  setup.DarkPaper = settings.charts.DarkPaper;
+  setup.FitSide = settings.charts.FitSide;
   return setup;
 }
 
@@ -264,6 +266,28 @@ ChartFrame FrameOnPage(const Printer& printer, const PrintSetup& setup, ChartSiz
   return frame;
 }
 
+std::int16_t BetterSide(ChartSize chart) {
+  return chart.width > chart.height ? kLandscape : kPortrait;
+}
+
+Colour ForWhitePaper(Colour colour) {
+  constexpr double kReadable = 3;  // contrast with white that texts and thin lines need
+  const auto light = [](double part) {
+    part /= 255;
+    return part <= 0.03928 ? part / 12.92 : std::pow((part + 0.055) / 1.055, 2.4);
+  };
+  double parts[3] = {double(colour & 0xFF), double(colour >> 8 & 0xFF),
+                     double(colour >> 16 & 0xFF)};
+  const auto contrast = [&] {
+    return 1.05 /
+           (0.2126 * light(parts[0]) + 0.7152 * light(parts[1]) + 0.0722 * light(parts[2]) + 0.05);
+  };
+  if (contrast() >= kReadable) return colour;
+  while (contrast() < kReadable)
+    for (double& part : parts) part *= 0.97;
+  return CLng(parts[0]) | CLng(parts[1]) << 8 | CLng(parts[2]) << 16;
+}
+
 bool IsOnPage(const Printer& printer, const ChartFrame& frame) {
   const double left = -double(frame.PrintLeft), top = -double(frame.PrintTop);
   return left >= 0 && top >= 0 && left + frame.width <= printer.ScaleWidth() &&
@@ -299,20 +323,18 @@ bool PlayOnPaper(std::string_view script, Printer& printer, const ChartFrame& fr
                  std::string& fontLabel) {
   printer.SetScale(frame.PrintLeft, frame.PrintTop);
   PaperPlayer player(printer, frame, setup, fonts, colours, fontLabel);
-  return ForEachCommand(script, ScriptMedium::kPaper,
-                        [&player](ScriptShape shape, const ScriptLine& line) {
-                          player.Play(shape, line);
-                        });
+  return ForEachCommand(
+      script, ScriptMedium::kPaper,
+      [&player](ScriptShape shape, const ScriptLine& line) { player.Play(shape, line); });
 }
 
 bool PrintChart(const ChartPrintServices& services, const PrintSetup& setup, ChartSize chart,
                 std::string_view scriptPath) {
-  return Print(services, setup, chart,
-               [&] { return ReadChartScript(services.files, scriptPath); });
+  return Print(services, setup, chart, [&] { return ReadChartScript(services.files, scriptPath); });
 }
 
-bool PrintChartScript(const ChartPrintServices& services, const PrintSetup& setup,
-                      ChartSize chart, std::string_view script) {
+bool PrintChartScript(const ChartPrintServices& services, const PrintSetup& setup, ChartSize chart,
+                      std::string_view script) {
   return Print(services, setup, chart, [script] { return script; });
 }
 

@@ -6,9 +6,9 @@
 #include <string_view>
 
 #include "base/files.h"
+#include "looks/colours.h"
 #include "platform/printer.h"
 #include "settings/settings.h"
-#include "store/colours.h"
 
 namespace kora {
 
@@ -16,16 +16,18 @@ class Dialogs;
 
 // How charts are printed: the settings under the names that printing has for them.
 struct PrintSetup {
-  float PrintEnlarge = 0;              // paper units to the chart unit, 1 as on the screen
-  std::int32_t PrintWidth = 0;         // of the chart on paper, twips; 0 not set: the page
-  std::int32_t PrintHeight = 0;        // set-up was never saved
-  std::int32_t PrintLeft = 0;          // origin of the scale, twips: a margin is negative;
-  std::int32_t PrintTop = 0;           // 0 in either: centred
-  std::int16_t PrintLine = 0;          // weight of H and P in dots; 1 to 10, otherwise 2
-  std::int16_t PrintOrient = 0;        // 1 portrait, 2 landscape; otherwise the printer's
-  std::int16_t PrintColourMode = 0;    // 1 colour, 0 black and white
-  std::int16_t PrintWhiteBlack = 1;    // 1: white in black
-  bool ScriptPrintMode = false;        // texts in bold
+  float PrintEnlarge = 0;            // paper units to the chart unit, 1 as on the screen
+  std::int32_t PrintWidth = 0;       // of the chart on paper, twips; 0 not set: the page
+  std::int32_t PrintHeight = 0;      // set-up was never saved
+  std::int32_t PrintLeft = 0;        // origin of the scale, twips: a margin is negative;
+  std::int32_t PrintTop = 0;         // 0 in either: centred
+  std::int16_t PrintLine = 0;        // weight of H and P in dots; 1 to 10, otherwise 2
+  std::int16_t PrintOrient = 0;      // 1 portrait, 2 landscape; otherwise the printer's
+  std::int16_t PrintColourMode = 0;  // 1 colour, 0 black and white
+  std::int16_t PrintWhiteBlack = 1;  // 1: white in black
+  bool ScriptPrintMode = false;      // texts in bold
+  bool DarkPaper = false;            // light colours are darkened
+  bool FitSide = false;              // where PrintOrient is neither: as the chart fits better
 };
 PrintSetup PrintSetupFrom(const Settings& settings, const PrinterColours& printer);
 // Keeps enlargement, size, origin and orientation, in the settings and in their file.
@@ -38,12 +40,19 @@ struct ChartSize {
 
 // Where the chart comes to lie on the part of the page that is reached, twips.
 struct ChartFrame {
-  std::int32_t SX = 0, SY = 0;          // twips to the chart unit
+  std::int32_t SX = 0, SY = 0;  // twips to the chart unit
   std::int32_t width = 0, height = 0;
   std::int32_t PrintLeft = 0, PrintTop = 0;  // origin of the scale
 };
 // Error 6 for what 32 bits don't hold.
 ChartFrame FrameOnPage(const Printer& printer, const PrintSetup& setup, ChartSize chart);
+// The side on which a chart of that shape is printed larger.
+std::int16_t BetterSide(ChartSize chart);
+
+// A colour as it reads on white: the darkest of its hue that is still told apart, where it is too
+// light.
+Colour ForWhitePaper(Colour colour);
+
 // True when no edge of the chart leaves the page.
 bool IsOnPage(const Printer& printer, const ChartFrame& frame);
 
@@ -80,7 +89,7 @@ struct ChartPrintServices {
 // failed, which was told; then no page was sent.
 bool PrintChart(const ChartPrintServices& services, const PrintSetup& setup, ChartSize chart,
                 std::string_view scriptPath);
-bool PrintChartScript(const ChartPrintServices& services, const PrintSetup& setup,
-                      ChartSize chart, std::string_view script);
+bool PrintChartScript(const ChartPrintServices& services, const PrintSetup& setup, ChartSize chart,
+                      std::string_view script);
 
 }  // namespace kora

@@ -5,9 +5,8 @@ namespace kora {
 ChartRequest RequestFromSettings(const Settings& settings) {
   const ChartSettings& c = settings.charts;
   ChartRequest request;
-  if (c.Type.size() == 1 && std::string_view("BCLP").find(c.Type[0]) != std::string_view::npos)
-    request.ChartStyle = c.Type[0];
-  if (c.Period == "A" || c.Period == "W" || c.Period == "M") request.ChartPeriod = c.Period;
+  request.ChartStyle = ParseStyle(c.Type).value_or(request.ChartStyle);
+  request.ChartPeriod = ParsePeriod(c.Period).value_or(request.ChartPeriod);
   request.BarSpacing = c.Spacing;
   request.BlankSpace = c.BlankSpace;
   request.WeekFactor = c.WeekFactor;

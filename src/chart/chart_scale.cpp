@@ -53,8 +53,10 @@ float RoundBottom(float l, float high) {
 // Outside 0 to 600 both ends go to round figures.
 void RoundOutward(float& low, float& high) {
   if (low >= 0 && low <= 600) return;
-  if (low <= -100 || low > 600) low = CSng(Int(low / 100.0) * 100);
-  else if (low < -10) low = CSng(Int(low / 10.0) * 10);
+  if (low <= -100 || low > 600)
+    low = CSng(Int(low / 100.0) * 100);
+  else if (low < -10)
+    low = CSng(Int(low / 10.0) * 10);
 
   if ((high > -100 && high < 0) || (high > 0.5 && high < 100)) {
     high = CSng(Int(high / 10.0) * 10);
@@ -71,8 +73,8 @@ double StepFor(double r) {
   };
   if (r > 0 && r < 0.11) return 0.005;
   static constexpr Row rows[] = {
-      {0.1101, 0.5, 0.02}, {0.5001, 1, 0.05}, {1.0001, 2, 0.1},    {2.0001, 3, 0.2},
-      {3.0001, 4, 0.3},    {4.0001, 5, 0.4},  {5.0001, 10, 0.5},   {10.0001, 20, 1},
+      {0.1101, 0.5, 0.02}, {0.5001, 1, 0.05}, {1.0001, 2, 0.1},   {2.0001, 3, 0.2},
+      {3.0001, 4, 0.3},    {4.0001, 5, 0.4},  {5.0001, 10, 0.5},  {10.0001, 20, 1},
       {20.0001, 50, 5},    {50.0001, 80, 10}, {80.0001, 100, 15},
   };
   for (const Row& row : rows)
@@ -142,8 +144,7 @@ std::int16_t PriceMap::Y(double price) const {
 }
 
 double PriceMap::Price(double y) const {
-  if (Logarithmic)
-    return double(ScaleLow) * std::exp(Divide(y - ChartBottom, double(LogFactor)));
+  if (Logarithmic) return double(ScaleLow) * std::exp(Divide(y - ChartBottom, double(LogFactor)));
   return (ChartBottom - y) * double(PricePerY) + double(ScaleLow);
 }
 

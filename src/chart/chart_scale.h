@@ -5,17 +5,16 @@
 namespace kora {
 
 // A chart range and its grid. GridStep survives from one chart to the next: a range that no
-// row of the step table covers keeps it.
+// row of the step table covers keeps it, and in a fresh run takes what it starts with.
 struct ChartScale {
   float ScaleLow = 0, ScaleHigh = 0;
-  float GridStep = 0;
+  float GridStep = 0.02f;  // never 0
   std::int16_t GridCount = 0;
   double Range = 0;  // ScaleHigh - ScaleLow to two decimals, as the step was picked by
 };
 
 // Automatic scale: rounds `high` and `low` (the highest High and lowest Low) outward to a chart
-// range and picks the grid step. Error 11 where no step fits and none is left from before;
-// error 6 for a range beyond 32 bits.
+// range and picks the grid step. Error 6 for a range beyond 32 bits.
 void SetChartScaleAutomatic(float high, float low, ChartScale& scale);
 
 // Manual scale from the name record. When either is 0 both become 0, nothing else is set, and
@@ -26,9 +25,9 @@ void SetChartScaleManual(float base, float top, ChartScale& scale);
 struct PriceMap {
   bool Logarithmic = false;
   float ScaleLow = 0;
-  float PricePerY = 1;         // arithmetic: what ScaleHigh holds once the scale is set up
-  float LogBase = 0;           // ln ScaleLow
-  float LogFactor = 1;         // y units per log unit, negative
+  float PricePerY = 1;  // arithmetic: price per y unit
+  float LogBase = 0;    // ln ScaleLow
+  float LogFactor = 1;  // y units per log unit, negative
   std::int16_t ChartBottom = 0;
 
   // y of a price, half to even; under logarithms the floor. Error 6 outside 16 bits.

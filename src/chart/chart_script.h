@@ -47,9 +47,9 @@ class ChartScript {
 struct ScriptLine {
   std::array<std::string, 6> text;
 
-  char letter() const;                       // upper case, 0 for an empty first field
-  double number(int field) const;            // fields from 1, as the letter is field 1
-  std::int32_t whole(int field) const;       // rounded half to even; error 6 out of 32 bits
+  char letter() const;                  // upper case, 0 for an empty first field
+  double number(int field) const;       // fields from 1, as the letter is field 1
+  std::int32_t whole(int field) const;  // rounded half to even; error 6 out of 32 bits
 };
 
 // Splits at commas. In the text field of a line that begins with "T" blanks stay; from every

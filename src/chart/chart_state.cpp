@@ -3,8 +3,8 @@
 namespace kora {
 
 ChartRequest MakeRequest(ChartState& state, const Settings& settings, const NameRec& name) {
-  if (name.RecType <= kAdvanceDecline && (state.ChartStyle == 'B' || state.ChartStyle == 'C'))
-    state.ChartStyle = 'L';
+  if (name.RecType <= kAdvanceDecline && NeedsRange(state.ChartStyle))
+    state.ChartStyle = Style::kLine;
   ChartRequest request = RequestFromSettings(settings);
   request.Name = name;
   request.ChartStyle = state.ChartStyle;
@@ -18,8 +18,13 @@ ChartRequest MakeRequest(ChartState& state, const Settings& settings, const Name
   request.FinishDate = state.DateLimitDate;
   request.ColourMarks = state.ReversalsOn;
   request.OutsideMarks = state.OutsideDaysOn;
+  request.PFAutoBox = state.PFAutoBox;
+  request.PFBoxSize = state.PFBoxSize;
+  if (state.SwingOn) {
+    request.Swing = state.Swing.kind;
+    request.SwingSize = state.Swing.size;
+  }
   request.OscName = state.OscCode;
-  request.MultiOscOn = state.MultiOscOn;
   request.SuppressScript = state.SuppressScript;
   return request;
 }

@@ -1,39 +1,24 @@
 #include "chart/composer.h"
 
 #include <algorithm>
-#include <array>
-#include <cmath>
 #include <memory>
 #include <new>
-#include <optional>
 
 #include "base/dates.h"
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
-#include "chart/bar_marks.h"
 #include "chart/chart_canvas.h"
 #include "chart/chart_failure.h"
 #include "chart/price_averages.h"
 #include "chart/scale_drawing.h"
+#include "chart/styles/style_drawer.h"
 
 namespace kora {
 namespace {
 
-constexpr std::string_view kTitle = "Chart Display";
 constexpr std::string_view kStamp = "KORA";
 constexpr double kEndTextX = 380;
-
-// Ends the composition with a message of its own; nothing went wrong with the machine.
-struct Refusal {
-  std::string text;
-  std::string_view title;
-};
-
-// `percent` of `height`: rounded to a whole product, then truncated.
-std::int16_t PercentOf(double height, int percent) {
-  return CInt(CLng(height * percent) / 100);
-}
 
 class Composer {
  public:
@@ -41,6 +26,7 @@ class Composer {
       : services_(services),
         request_(request),
         chart_(chart),
+        style_(StyleOf(request)),
         script_(request.SuppressScript ? nullptr : services.script),
         pen_(services.price, script_),
         canvas_{pen_, request, services.fonts, services.colours, chart} {}
@@ -58,37 +44,23 @@ class Composer {
   void LayOut();
   void DrawTitle();
   void OpenData();
-  void ChooseWindow();
-  void ApplyFinishDate();
   void LoadBars();
   void MakeVolumeRoom();
   void AlignSecondChart();
-  void SetUpScale(bool line);
-  std::optional<std::int16_t> VolumeY(const ChartBar& bar) const;
-  void DrawVolumeBar(double x, std::optional<std::int16_t> y);
-  void DrawBars();
-  void DrawLine();
-  void DrawBar(const BarY& y, double x, Colour colour);
-  void DrawStop(const StopLossTracker& stop);
-  void DrawAdjustment(const ChartBar& bar, double x);
-  void Smooth(std::int16_t closeY, double x);
   void DrawEnd();
   void DrawEndTexts();
   void DrawAverages();
-  void AdvanceSlot();
 
   const ChartServices& services_;
   const ChartRequest& request_;
   Composition& chart_;
+  const ChartStyle& style_;
   ChartScript* script_;
   ChartPen pen_;
   ChartCanvas canvas_;
   std::string classText_;
   std::unique_ptr<PriceFile> file_;
-  bool lineChart_ = false;
   std::string barDate_;  // of the bar being drawn, for messages
-  std::optional<CloseSmoother> smoother_;
-  int smoothed_ = 0;
 };
 
 void Composer::Run() {
@@ -98,8 +70,7 @@ void Composer::Run() {
   chart_.CloseY.clear();
   chart_.DataFile = std::string(request_.Name.Code.trimmed()) + ".WDT";
   if (script_) {
-    const bool goesOn = chart_.ChartSlot == 2 || chart_.OscPanel >= 2;
-    script_->Open(goesOn);
+    script_->Open(IsSecond(request_.Place));
   }
   classText_ = IndustryClassText(services_.files, services_.paths.SystemPath,
                                  request_.Name.IndClass.trimmed());
@@ -107,20 +78,22 @@ void Composer::Run() {
   LayOut();
   DrawTitle();
   OpenData();
-  ChooseWindow();
   LoadBars();
   MakeVolumeRoom();
   AlignSecondChart();
-  lineChart_ = request_.ChartStyle == 'L' || request_.Name.RecType < kShare;
-  if (request_.ChartStyle != 'P') {
-    if (lineChart_) DrawLine();
-    else DrawBars();
-  }
+  std::function<float(float)> ask;
+  if (services_.AskBoxValue)
+    ask = [this](float computed) {
+      services_.dialogs.SetBusy(false);
+      const float value = services_.AskBoxValue(computed);
+      services_.dialogs.SetBusy(true);
+      return value;
+    };
+  style_.Draw({canvas_, *file_, barDate_, ask});
   DrawEnd();
   CloseFiles();
   chart_.SurfaceHeight = services_.price.ScaleHeight();
   chart_.ChartDrawn = true;
-  AdvanceSlot();
 }
 
 void Composer::LoadBars() {
@@ -161,27 +134,14 @@ void Composer::PrepareSurface() {
   surface.SetDrawStyle(DrawStyle::kSolid);
   surface.SetDrawWidth(1);
   // What opens a script anew also begins a picture.
-  if (chart_.ChartSlot != 2 && chart_.OscPanel < 2) surface.Cls();
+  if (!IsSecond(request_.Place)) surface.Cls();
 }
 
 void Composer::LayOut() {
-  const double height = services_.price.ScaleHeight();
-  const double width = services_.price.ScaleWidth();
-  if (chart_.TwoCharts && chart_.ChartSlot == 1) {
-    chart_.ChartTop = 2;
-    chart_.ChartBottom = PercentOf(height, 46);
-  } else if (chart_.TwoCharts && chart_.ChartSlot == 2) {
-    chart_.ChartTop = PercentOf(height, 51);
-    chart_.ChartBottom = PercentOf(height, 95);
-  } else {
-    const bool panelBelow = services_.panel && services_.panel->Visible();
-    chart_.ChartTop = PercentOf(height, panelBelow ? 13 : 10);
-    chart_.ChartBottom = PercentOf(height, 95);
-  }
-  chart_.ChartLeft = 42;  // room for the scale
-  chart_.FirstBarX = chart_.ChartLeft;
-  chart_.ChartRight = PercentOf(width, 99);
-  chart_.ChartMiddle = CInt((chart_.ChartRight - chart_.ChartLeft) / 2.0 + 36);
+  const Surface& surface = services_.price;
+  const bool panelBelow = services_.panel && services_.panel->Visible();
+  static_cast<ChartLayout&>(chart_) =
+      LayOutChart(request_, surface.ScaleWidth(), surface.ScaleHeight(), panelBelow);
 }
 
 void Composer::DrawTitle() {
@@ -189,15 +149,15 @@ void Composer::DrawTitle() {
   const std::string code = FromAnsi(name.Code.trimmed());
   const double size = services_.fonts.TitleSize;
   const SurfaceFont font = canvas_.Font1(size);
-  if (chart_.TwoCharts) {
+  if (IsSplit(request_.Place)) {
     const double x = 4.0 * chart_.ChartLeft, y = chart_.ChartTop + 2.0;
     const Colour colour = canvas_.colour(kChartTitle);
     pen_.Text('T', font, {9.75, x, y, code, colour});
     return;
   }
-  if (chart_.OscPanel > 0) {
-    const Colour colour = canvas_.colour(chart_.OscPanel + 20);
-    pen_.Text('T', font, {9.75, (chart_.OscPanel - 1) * 60.0, 2, code, colour});
+  if (IsSuperimposed(request_.Place)) {
+    const int which = request_.Place == ChartPlace::kOver ? 1 : 0;
+    pen_.Text('T', font, {9.75, which * 60.0, 2, code, canvas_.colour(kAverage3 + which)});
     return;
   }
   const std::string title =
@@ -212,64 +172,28 @@ void Composer::DrawTitle() {
 
 void Composer::OpenData() {
   const std::string fileName = CodeFileName(request_.Name.Code.trimmed(), ".WDT");
-  file_ = std::make_unique<PriceFile>(services_.files,
-                                      services_.paths.CurrentDataPath + fileName);
-  chart_.Bars.FirstDataRec = 0;
-  chart_.Bars.CurrentDataRec = 0;
-  chart_.Bars.LastDataRec = CInt(file_->count());
-  if (chart_.Bars.LastDataRec == 0) throw Refusal{"No Data for " + chart_.DataFile, kTitle};
-}
-
-void Composer::ChooseWindow() {
-  chart_.BarSpacing = request_.BarSpacing > 0 ? request_.BarSpacing : std::int16_t{2};
+  file_ = std::make_unique<PriceFile>(services_.files, services_.paths.CurrentDataPath + fileName);
   ChartBars& bars = chart_.Bars;
-  // The multi-oscillator view scrolls over a surface as wide as its bars.
-  const bool wide = request_.MultiOscOn == -1;
-  chart_.PlotWidth =
-      wide ? 2100.0 : double(chart_.ChartRight) - chart_.ChartLeft - request_.BlankSpace;
-  if (request_.ChartStyle == 'P') {
-    bars.FirstDataRec = 1;  // a point-and-figure chart reads the whole file
-    return;
-  }
-  double days = 1;
-  if (request_.ChartPeriod == "M") days = 20;
-  if (request_.ChartPeriod == "W")
-    days = request_.WeekFactor >= 4 && request_.WeekFactor <= 5.25 ? request_.WeekFactor : 4.75;
-  const std::int32_t wanted = CLng(chart_.PlotWidth / chart_.BarSpacing * days);
-  if (request_.FinishDateOn) ApplyFinishDate();
-  bars.FirstDataRec = CInt(std::clamp<double>(double(bars.LastDataRec) - wanted, 1, bars.LastDataRec));
-  if (wide)
+  bars.FirstDataRec = 0;
+  bars.LastDataRec = CInt(file_->count());
+  if (bars.LastDataRec == 0) throw ChartRefusal{"No Data for " + chart_.DataFile, kChartDisplay};
+  const RecordWindow window = ChooseWindow(*file_, request_, chart_, style_.readsWholeFile);
+  bars.FirstDataRec = window.FirstDataRec;
+  bars.LastDataRec = window.LastDataRec;
+  if (request_.Place == ChartPlace::kWide && !style_.readsWholeFile)
     services_.price.SetWidth((bars.LastDataRec - bars.FirstDataRec) * double(chart_.BarSpacing) +
                              120);
 }
 
-void Composer::ApplyFinishDate() {
-  constexpr std::int32_t kRun = 512;
-  std::array<PriceRec, kRun> run;
-  for (std::int32_t first = 1; first <= file_->count(); first += kRun) {
-    const auto n = static_cast<size_t>(std::min(kRun, file_->count() - first + 1));
-    file_->ReadRun(first, std::span(run.data(), n));
-    for (size_t i = 0; i < n; ++i) {
-      if (run[i].RecDate.raw() < request_.FinishDate) continue;
-      chart_.Bars.LastDataRec = CInt(double(first) + double(i));
-      return;
-    }
-  }
-}
-
 void Composer::MakeVolumeRoom() {
-  if (request_.ChartStyle != 'P' && request_.VolumeOption && chart_.Bars.VolumeShown &&
-      chart_.OscPanel == 0) {
-    chart_.VolBottom = chart_.ChartBottom;
-    chart_.ChartBottom = CInt(0.9 * chart_.ChartBottom);
-    chart_.VolTop = chart_.ChartBottom;
-  } else {
-    chart_.VolBottom = chart_.ChartBottom;
-    chart_.VolTop = chart_.ChartBottom;
-    chart_.Bars.VolumeShown = chart_.Bars.VolumeShown && chart_.OscPanel == 0;
-  }
-  if (request_.ChartStyle != 'P' && request_.VolumeOption) {
-    const bool unit = chart_.Bars.VolumeShown && services_.VolumeUnitText;
+  ChartBars& bars = chart_.Bars;
+  const bool wanted = style_.hasVolumes && request_.VolumeOption;
+  bars.VolumeShown = bars.VolumeShown && !IsSuperimposed(request_.Place);
+  chart_.VolBottom = chart_.ChartBottom;
+  if (wanted && bars.VolumeShown) chart_.ChartBottom = CInt(0.9 * chart_.ChartBottom);
+  chart_.VolTop = chart_.ChartBottom;
+  if (wanted) {
+    const bool unit = bars.VolumeShown && services_.VolumeUnitText;
     SetVolumeLabel(chart_, unit ? services_.VolumeUnitText(request_.Name) : "");
   }
   chart_.CloseY.reserve(static_cast<size_t>(std::max(0.0, chart_.PlotWidth)) + 10);
@@ -277,204 +201,24 @@ void Composer::MakeVolumeRoom() {
 
 // The last bars of two charts stand below each other.
 void Composer::AlignSecondChart() {
-  if (chart_.OscPanel == 2 || chart_.ChartSlot == 2) {
+  if (IsSecond(request_.Place)) {
     if (chart_.UpperBarCount > chart_.Bars.BarCount)
-      chart_.FirstBarX = CInt(chart_.ChartLeft + double(chart_.UpperBarCount - chart_.Bars.BarCount) *
-                                                     chart_.BarSpacing);
-  } else if (chart_.OscPanel == 1 || chart_.ChartSlot == 1) {
+      chart_.FirstBarX =
+          CInt(chart_.ChartLeft +
+               double(chart_.UpperBarCount - chart_.Bars.BarCount) * chart_.BarSpacing);
+  } else if (IsSplit(request_.Place) || IsSuperimposed(request_.Place)) {
     chart_.UpperBarCount = chart_.Bars.BarCount;
   }
 }
 
-void Composer::SetUpScale(bool line) {
-  ChartScale& scale = chart_.Scale;
-  if (request_.AutoScale)
-    SetChartScaleAutomatic(chart_.Bars.ChartHigh, chart_.Bars.ChartLow, scale);
-  else
-    SetChartScaleManual(request_.Name.Base, request_.Name.Top, scale);
-  if (scale.ScaleLow == 0 && scale.ScaleHigh == 0) {
-    chart_.ScaleMissing = true;
-    throw Refusal{" MANUAL SCALING has been selected but there are no chart scale definitions in "
-                  "the Name File for " +
-                      FromAnsi(request_.Name.Code.trimmed()) +
-                      "\nUse <Change Scales> in the Set Defaults window or add these scales "
-                      "directly to the Name File\nDo not use 0(zero) as chart base or ceiling\n"
-                      "OTHERWISE USE AUTOMATIC SCALING",
-                  kTitle};
-  }
-  PriceMap& map = chart_.Price;
-  map.Logarithmic = line ? request_.LogLines : request_.LogBars;
-  map.ScaleLow = scale.ScaleLow;
-  map.ChartBottom = chart_.ChartBottom;
-  if (map.Logarithmic) {
-    // With one end at 0 the chart goes on with the logarithms it has.
-    if (scale.ScaleLow == 0 || scale.ScaleHigh == 0) return;
-    if (scale.ScaleLow < 0)
-      throw Refusal{"You cannot display a Logarithmic chart when there are NEGATIVE values. "
-                    "Display the chart as an Arithmetic chart.",
-                    "Negative Values"};
-    map.LogBase = static_cast<float>(std::log(double(scale.ScaleLow)));
-    double logHigh;
-    if (scale.ScaleHigh > 0) logHigh = std::log(double(scale.ScaleHigh));
-    else if (line) logHigh = Divide(std::log(10.0), std::log(-double(scale.ScaleHigh)));
-    else throw RunTimeError(kBadCall);
-    map.LogFactor = static_cast<float>(
-        Divide(double(chart_.ChartTop) - chart_.ChartBottom, logHigh - double(map.LogBase)));
-  } else {
-    map.PricePerY = static_cast<float>(Divide(double(scale.ScaleHigh) - double(scale.ScaleLow),
-                                              double(chart_.ChartBottom) - chart_.ChartTop));
-    scale.ScaleHigh = map.PricePerY;
-  }
-}
-
-std::optional<std::int16_t> Composer::VolumeY(const ChartBar& bar) const {
-  if (!chart_.Bars.VolumeShown || bar.Volume <= 0) return std::nullopt;
-  const double y = chart_.Volume.RawY(bar.Volume);
-  if (request_.CutVols && y < chart_.VolTop) return chart_.VolTop;
-  return CInt(y);
-}
-
-void Composer::DrawVolumeBar(double x, std::optional<std::int16_t> y) {
-  if (!y || *y > chart_.VolBottom) return;
-  pen_.Line('H', {x, double(chart_.VolBottom), x, double(*y), canvas_.colour(kVolumeBars)});
-}
-
-void Composer::Smooth(std::int16_t closeY, double x) {
-  if (!smoother_) smoother_.emplace(request_.MaExp);
-  const auto y = smoother_->Add(closeY);
-  if (!y) return;
-  ++smoothed_;
-  if (chart_.OscPanel == 0 && request_.OscName != "MACD" && (request_.Ma1On || request_.Ma2On) &&
-      smoothed_ >= 2)
-    pen_.Point('P', x, *y, canvas_.colour(kAverage1));
-}
-
-void Composer::DrawAdjustment(const ChartBar& bar, double x) {
-  if (bar.SourceRec == 0 || chart_.OscPanel != 0) return;
-  const PriceRec record = file_->Read(bar.SourceRec);
-  const Colour colour = canvas_.colour(kAdjustments);
-  const Segment line{x, double(chart_.ChartTop), x, double(chart_.ChartBottom), colour};
-  pen_.LineStyled(DrawStyle::kDash, line, 'V', line);
-  canvas_.SmallText(x, chart_.ChartTop + 2.0, FromAnsi(record.AdjDesc.trimmed()), colour);
-}
-
-void Composer::DrawBar(const BarY& y, double x, Colour colour) {
-  const Segment range{x, double(y.High), x, double(y.Low), colour};
-  if (request_.ChartStyle == 'C') {
-    const Colour lines = canvas_.colour(kChartLines);
-    pen_.Line('H', {x, double(y.High), x, double(y.Low), lines});
-    const bool fall = y.Close > y.Open;
-    const Colour body = fall ? canvas_.colour(kCandleDown) : lines;
-    // A rising body is an outline in the script: hollow on paper.
-    pen_.FilledBox(fall ? 'C' : 'B', {x - 1, double(y.Open), x + 1, double(y.Close), body},
-                   {x - 1.5, double(y.Open), x + 1.5, double(y.Close), body});
-    return;
-  }
-  pen_.Line('H', range);
-  if (chart_.BarSpacing > 2) {
-    pen_.Line('H', {x - 2, double(y.Open), x, double(y.Open), colour},
-              {x - 1.5, double(y.Open), x, double(y.Open), colour});
-    pen_.Line('H', {x, double(y.Close), x + 2, double(y.Close), colour},
-              {x, double(y.Close), x + 1.5, double(y.Close), colour});
-  } else if (chart_.BarSpacing == 2) {
-    pen_.Point('P', x - 1, y.Open, colour);
-    pen_.Point('P', x + 1, y.Close, colour);
-  }
-}
-
-void Composer::DrawStop(const StopLossTracker& stop) {
-  const auto right = [&](std::string_view text, int entry) {
-    const SurfaceFont font = canvas_.Font1(ChartCanvas::kSmallText);
-    canvas_.SmallText(chart_.ChartRight - canvas_.TextWidth(font, text), 30, text,
-                      canvas_.colour(entry));
-  };
-  if (stop.broken()) right("PREVIOUS STOP BROKEN", 13);
-  if (stop.stop() > 0) {
-    const double y = chart_.Price.Y(stop.stop());
-    pen_.Line('L', {double(stop.stopX()), y, double(chart_.ChartRight), y, canvas_.colour(10)});
-    right("Current Stop Loss : " + Format(stop.stop(), "0.00#"), 10);
-  }
-}
-
-void Composer::DrawBars() {
-  SetUpScale(false);
-  if (chart_.Bars.VolumeShown) SetVolumeMap(request_, false, chart_.Price.Logarithmic, chart_);
-  DateAxis axis(canvas_);
-  StopLossTracker stop(request_.StopLossShown, request_.StopLossPct);
-  const bool bars = request_.ChartStyle == 'B';
-  const bool smooths =
-      request_.OscName != "MACD" && request_.OscName != "PARA" && request_.OscName != "PARAV";
-  const bool outside = bars && request_.OutsideMarks;
-  BarY previous, beforePrevious;
-  const ChartBar* previousBar = nullptr;  // the last one that was drawn
-  int seen = 0;
-  std::int16_t x = chart_.FirstBarX;
-  for (int i = 0; i <= chart_.Bars.BarCount; ++i, x = CInt(double(x) + chart_.BarSpacing)) {
-    const ChartBar& bar = chart_.Bars[static_cast<size_t>(i)];
-    barDate_ = bar.date();
-    if (bar.High == 0) {
-      chart_.CloseY.push_back(chart_.CloseY.empty() ? std::int16_t{0} : chart_.CloseY.back());
-      continue;
-    }
-    BarY y;
-    y.High = chart_.Price.Y(bar.High);
-    y.Open = chart_.Price.Y(bar.Open);
-    y.Low = chart_.Price.Y(bar.Low);
-    y.Close = chart_.Price.Y(bar.Close);
-    chart_.CloseY.push_back(y.Close);
-    const auto volumeY = VolumeY(bar);
-    int entry = kChartLines;
-    if (outside && previousBar) entry = stop.Next(bar, *previousBar, x);
-    if (outside && i == chart_.Bars.BarCount && request_.StopLossShown) DrawStop(stop);
-    DrawAdjustment(bar, x);
-    axis.Bar(bar.date(), x);
-    DrawVolumeBar(x, volumeY);
-    if (bars && request_.ColourMarks)
-      entry = ReversalMark(y, seen > 0 ? &previous : nullptr, seen > 1 ? &beforePrevious : nullptr);
-    DrawBar(y, x, canvas_.colour(entry));
-    if (smooths) Smooth(y.Close, x);
-    beforePrevious = previous;
-    previous = y;
-    previousBar = &bar;
-    ++seen;
-  }
-  chart_.LastBarX = x;
-}
-
-void Composer::DrawLine() {
-  SetUpScale(true);
-  if (chart_.Bars.VolumeShown) SetVolumeMap(request_, true, chart_.Price.Logarithmic, chart_);
-  DateAxis axis(canvas_);
-  const bool smooths = request_.OscName != "MACD";
-  std::int16_t x = chart_.FirstBarX;
-  for (int i = 0; i <= chart_.Bars.BarCount; ++i, x = CInt(double(x) + chart_.BarSpacing)) {
-    const ChartBar& bar = chart_.Bars[static_cast<size_t>(i)];
-    barDate_ = bar.date();
-    const bool hasClose = bar.Close != 0;
-    const std::int16_t lastY = i == 0 ? std::int16_t{0} : chart_.CloseY.back();
-    const std::int16_t y = hasClose ? chart_.Price.Y(bar.Close) : lastY;
-    chart_.CloseY.push_back(y);
-    const auto volumeY = VolumeY(bar);
-    DrawAdjustment(bar, x);
-    axis.Bar(bar.date(), x);
-    if (i > 0 && hasClose)
-      pen_.Line('H', {double(x) - chart_.BarSpacing, double(lastY), double(x), double(y),
-                      canvas_.colour(kChartLines)});
-    if (smooths) Smooth(y, x);
-    DrawVolumeBar(x, volumeY);
-  }
-  chart_.LastBarX = x;
-}
-
 void Composer::DrawEnd() {
-  const bool whole = request_.ChartStyle != 'P' && chart_.OscPanel == 0;
-  if (request_.ChartStyle != 'P') {
+  if (!style_.ownScale) {
     if (chart_.Bars.VolumeShown) DrawVolumePanel(canvas_);
-    DrawScale(canvas_, lineChart_, classText_);
+    DrawScale(canvas_, style_.lineScale, classText_);
     DrawFixedGrid(canvas_);
   }
   DrawEndTexts();
-  if (!whole) return;
+  if (!style_.takesOverlays || IsSuperimposed(request_.Place)) return;
   DrawAverages();
   for (const auto& overlay : services_.overlays) overlay(canvas_);
 }
@@ -482,11 +226,12 @@ void Composer::DrawEnd() {
 void Composer::DrawEndTexts() {
   const ChartBars& bars = chart_.Bars;
   const Colour colour = canvas_.colour(kScalesText);
-  const double top = chart_.ChartSlot == 2 ? chart_.ChartTop : 0;
+  const double top = request_.Place == ChartPlace::kLower ? chart_.ChartTop : 0;
   const ChartBar& last = bars[static_cast<size_t>(bars.BarCount)];
-  if (chart_.OscPanel < 2)
-    canvas_.SmallText(kEndTextX, top + 2, "Last date processed " + DateToShort(last.date()), colour);
-  if (chart_.OscPanel == 0) {
+  if (request_.Place != ChartPlace::kOver)
+    canvas_.SmallText(kEndTextX, top + 2, "Last date processed " + DateToShort(last.date()),
+                      colour);
+  if (!IsSuperimposed(request_.Place)) {
     const ChartBar& before = bars[static_cast<size_t>(std::max(bars.BarCount - 1, 0))];
     const std::int16_t type = request_.Name.RecType;
     const char* format = type == 1 || type == 2 || type == 4 ? "#####.00#" : "#####";
@@ -506,7 +251,7 @@ void Composer::DrawEndTexts() {
 
 void Composer::DrawAverages() {
   if (request_.OscName == "MACD" || request_.OscName == "PARA") return;
-  const bool daily = request_.ChartPeriod == "A";
+  const bool daily = request_.ChartPeriod == Period::kDaily;
   const auto average = [&](std::int16_t period, int entry, int index) {
     const auto draw = request_.MaExp ? ExpAverageLine : SimpleAverageLine;
     draw(pen_, period, chart_.CloseY, canvas_.colour(entry), chart_.FirstBarX, chart_.BarSpacing,
@@ -514,16 +259,6 @@ void Composer::DrawAverages() {
   };
   if (request_.Ma1On) average(daily ? request_.Ma1Days : request_.Ma1Weeks, kAverage2, 1);
   if (request_.Ma2On) average(daily ? request_.Ma2Days : request_.Ma2Weeks, kAverage3, 2);
-}
-
-void Composer::AdvanceSlot() {
-  if (!chart_.TwoCharts) return;
-  if (chart_.ChartSlot == 1) {
-    chart_.ChartSlot = 2;
-  } else if (chart_.ChartSlot == 2) {
-    chart_.TwoCharts = false;
-    chart_.ChartSlot = 0;
-  }
 }
 
 std::string Composer::FailureText(int number, const std::string& detail) const {
@@ -570,7 +305,7 @@ bool ComposeChart(const ChartServices& services, const ChartRequest& request, Co
       composer.Run();
       dialogs.SetBusy(false);
       return true;
-    } catch (const Refusal& refusal) {
+    } catch (const ChartRefusal& refusal) {
       composer.GiveUpFiles();
       dialogs.SetBusy(false);
       dialogs.Message(refusal.text, refusal.title);
@@ -583,7 +318,7 @@ bool ComposeChart(const ChartServices& services, const ChartRequest& request, Co
     }
     dialogs.SetBusy(false);
     if (number == kDiskNotReady) {
-      if (dialogs.Ask("Disk Not ready. Close drive door", kTitle, Buttons::kOkCancel) ==
+      if (dialogs.Ask("Disk Not ready. Close drive door", kChartDisplay, Buttons::kOkCancel) ==
           Answer::kOk) {
         composer.DropScript();  // the next try writes all of it
         continue;
@@ -592,7 +327,7 @@ bool ComposeChart(const ChartServices& services, const ChartRequest& request, Co
       return false;
     }
     composer.GiveUpFiles();
-    dialogs.Message(composer.FailureText(number, detail), kTitle);
+    dialogs.Message(composer.FailureText(number, detail), kChartDisplay);
     return false;
   }
 }

@@ -7,10 +7,10 @@
 #include "chart/chart_request.h"
 #include "chart/chart_script.h"
 #include "chart/composition.h"
+#include "looks/colours.h"
 #include "platform/dialogs.h"
 #include "platform/surface.h"
 #include "settings/settings.h"
-#include "store/colours.h"
 
 namespace kora {
 
@@ -23,13 +23,16 @@ struct ChartServices {
   const Paths& paths;
   const FontSettings& fonts;
   const ChartColours& colours;
-  Surface& price;              // the price picture
-  Surface* panel = nullptr;    // the oscillator picture below it; may be hidden
+  Surface& price;            // the price picture
+  Surface* panel = nullptr;  // the oscillator picture below it; may be hidden
   ChartScript* script = nullptr;
   // Drawn over the finished price chart, in this order: bands, multiple averages, trendlines.
   std::vector<std::function<void(const ChartCanvas&)>> overlays = {};
   // The unit of a security's volumes, "'00", which those above the chart know; empty for none.
   std::function<std::string(const NameRec&)> VolumeUnitText = {};
+  // Asks for the box value of a point-and-figure chart, proposing the computed one, where boxes
+  // are not automatic; empty takes the computed one.
+  std::function<float(float computed)> AskBoxValue = {};
 };
 
 // Turns one security and the chart options into a chart on `services.price` and, unless the

@@ -45,8 +45,7 @@ std::optional<std::int16_t> CloseSmoother::Add(std::int16_t y) {
 }
 
 void SimpleAverageLine(ChartPen& pen, std::int16_t period, std::span<const std::int16_t> closeY,
-                       Colour colour, std::int16_t firstX, std::int16_t spacing,
-                       int averageIndex) {
+                       Colour colour, std::int16_t firstX, std::int16_t spacing, int averageIndex) {
   if (period < 1) return;
   AverageTrace trace(pen, colour, averageIndex);
   const auto n = static_cast<size_t>(period);

@@ -34,8 +34,7 @@ class CloseSmoother {
 //
 // Simple: the mean of the last `period` values, half to even.
 void SimpleAverageLine(ChartPen& pen, std::int16_t period, std::span<const std::int16_t> closeY,
-                       Colour colour, std::int16_t firstX, std::int16_t spacing,
-                       int averageIndex);
+                       Colour colour, std::int16_t firstX, std::int16_t spacing, int averageIndex);
 // Exponential: k = 2 / (period + 1); seeded with the mean of the first `period` values, then
 // y * k + (1 - k) * previous; half to even at each step.
 void ExpAverageLine(ChartPen& pen, std::int16_t period, std::span<const std::int16_t> closeY,

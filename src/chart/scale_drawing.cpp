@@ -25,11 +25,13 @@ std::int32_t RoundedVolume(std::int32_t v) {
 
 std::string ModeLine(const ChartCanvas& canvas, bool lineChart, std::string_view classText) {
   const ChartRequest& request = canvas.request;
-  std::string text = request.ChartPeriod == "W"   ? "WEEKLY"
-                     : request.ChartPeriod == "M" ? "MONTHLY"
-                                                  : "DAILY";
-  if (!canvas.chart.Price.Logarithmic) text += " - ARITHMETIC -";
-  else text += lineChart ? " - LOGARITHMIC - " : " - LOGARITHMIC -";
+  std::string text = request.ChartPeriod == Period::kWeekly    ? "WEEKLY"
+                     : request.ChartPeriod == Period::kMonthly ? "MONTHLY"
+                                                               : "DAILY";
+  if (!canvas.chart.Price.Logarithmic)
+    text += " - ARITHMETIC -";
+  else
+    text += lineChart ? " - LOGARITHMIC - " : " - LOGARITHMIC -";
   if (request.BandKind == 1) {
     const auto width = [](std::int16_t w) { return Str(std::int32_t(w >= 1 && w <= 100 ? w : 5)); };
     text += "      Percentage Bands  &" + width(request.Name.BandUp) + "%    -" +
@@ -108,12 +110,12 @@ void DrawScale(const ChartCanvas& canvas, bool lineChart, std::string_view class
 
   pen.Box('B', {left, double(chart.ChartTop), right, double(chart.ChartBottom), border});
 
-  if (!chart.TwoCharts && chart.OscPanel == 0) {
+  if (!IsSplit(request.Place) && !IsSuperimposed(request.Place)) {
     const std::string mode = ModeLine(canvas, lineChart, classText);
     pen.Text('S', canvas.Font1(size), {size, left + 2, chart.ChartTop - 18.0, mode, text},
              {size, left + 2, chart.ChartTop - 12.0, mode, text});
   }
-  if (chart.OscPanel != 0) return;
+  if (IsSuperimposed(request.Place)) return;
 
   const char* format = request.Name.RecType != kShare ? "######"
                        : chart.Scale.Range > 0.1      ? "###.00"
@@ -155,12 +157,13 @@ void DrawFixedGrid(const ChartCanvas& canvas) {
                           canvas.colour(kFixedGrid)});
 }
 
-void DateAxis::Bar(std::string_view yyyymmdd, double x) {
+bool DateAxis::Bar(std::string_view yyyymmdd, double x) {
   // A chart laid over another stands on the other's axis.
-  if (canvas_.chart.OscPanel <= 1 && yyyymmdd.substr(0, 6) > lastMonth_) NewMonth(yyyymmdd, x);
+  return canvas_.request.Place != ChartPlace::kOver && yyyymmdd.substr(0, 6) > lastMonth_ &&
+         NewMonth(yyyymmdd, x);
 }
 
-void DateAxis::NewMonth(std::string_view yyyymmdd, double x) {
+bool DateAxis::NewMonth(std::string_view yyyymmdd, double x) {
   const Composition& chart = canvas_.chart;
   const ChartRequest& request = canvas_.request;
   ChartPen& pen = canvas_.pen;
@@ -168,12 +171,12 @@ void DateAxis::NewMonth(std::string_view yyyymmdd, double x) {
   const std::string_view month = yyyymmdd.substr(4, 2);
   const double bottom = chart.VolBottom;
   const Colour text = canvas_.colour(kScalesText);
-  const bool daily = request.ChartPeriod == "A";
+  const bool daily = request.ChartPeriod == Period::kDaily;
 
   const int mark = CInt(x / 8);
   const bool yearChanged = year != lastYear_;
   if (mark >= lastMark_ + 4 || yearChanged) {
-    if (!request.GridLines || !daily || yearChanged || request.ChartStyle == 'P') {
+    if (!request.GridLines || !daily || yearChanged || ticksAlone_) {
       pen.Line('L', {x, bottom, x, bottom + 5, text});
       lastMark_ = mark;
     } else if (request.MovingGrid) {
@@ -185,14 +188,16 @@ void DateAxis::NewMonth(std::string_view yyyymmdd, double x) {
     monthSkipped_ = true;
   }
 
-  if (year > lastYear_ && month == "01" && x > 64) {
+  const bool yearMark = year > lastYear_ && month == "01" && x > 64;
+  if (yearMark) {
     pen.Line('D', {x, bottom + 2, x, double(chart.ChartTop), canvas_.colour(kEndOfYear)},
              {x, bottom + 2, x, double(chart.ChartTop), text});
     canvas_.SmallText(x, bottom + 2, year, text);
   } else if (daily && !monthSkipped_) {
     const double number = Val(month);
     if (number >= 1 && number <= 12) {
-      const std::string_view letter = std::string_view("JFMAMJJASOND").substr(size_t(number) - 1, 1);
+      const std::string_view letter =
+          std::string_view("JFMAMJJASOND").substr(size_t(number) - 1, 1);
       const double size =
           request.ScriptPrintMode ? canvas_.fonts.Font2Points() : ChartCanvas::kSmallText;
       pen.Text('T', canvas_.Font1(ChartCanvas::kSmallText),
@@ -203,6 +208,7 @@ void DateAxis::NewMonth(std::string_view yyyymmdd, double x) {
   lastMonth_ = yyyymmdd.substr(0, 6);
   lastYear_ = year;
   monthSkipped_ = false;
+  return yearMark;
 }
 
 }  // namespace kora

@@ -32,18 +32,22 @@ void DrawFixedGrid(const ChartCanvas& canvas);
 // The date axis below the plot, called at each bar with a new month key.
 class DateAxis {
  public:
-  explicit DateAxis(const ChartCanvas& canvas) : canvas_(canvas) {}
+  // `ticksAlone`: months get a tick below the plot even where the grid has a line for them.
+  explicit DateAxis(const ChartCanvas& canvas, bool ticksAlone = false)
+      : canvas_(canvas), ticksAlone_(ticksAlone) {}
 
-  // Takes a bar's date at `x`; marks it where its month key is above the last one seen.
-  void Bar(std::string_view yyyymmdd, double x);
+  // Takes a bar's date at `x`; marks it where its month key is above the last one seen. True
+  // where that was the line at the end of a year.
+  bool Bar(std::string_view yyyymmdd, double x);
 
  private:
-  void NewMonth(std::string_view yyyymmdd, double x);
+  bool NewMonth(std::string_view yyyymmdd, double x);
 
   const ChartCanvas& canvas_;
+  bool ticksAlone_;
   std::string lastMonth_;  // "yyyymm"
   std::string lastYear_;
-  int lastMark_ = 0;       // x in eighths where a month was last marked
+  int lastMark_ = 0;  // x in eighths where a month was last marked
   bool monthSkipped_ = false;
 };
 

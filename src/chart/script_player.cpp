@@ -34,9 +34,12 @@ class Player {
     const char letter = line.letter();
     if (shape == ScriptShape::kSegment) return Segment(letter, line);
     if (shape == ScriptShape::kPoint) return Point(line);
-    if (letter == 'T') Text(line);
-    else if (letter == 'S') ScaleText(line);
-    else Stamp(line);
+    if (letter == 'T')
+      Text(line);
+    else if (letter == 'S')
+      ScaleText(line);
+    else
+      Stamp(line);
   }
 
  private:
@@ -90,7 +93,7 @@ class Player {
     const bool filled = letter == 'C' || letter == 'F';
     const bool broken = letter == 'D' || letter == 'E' || letter == 'V';
     budget_.Spend(kWorkOfCommand + (filled ? across * down / kFilledUnitsPerWork
-                                          : (across + down) * (broken ? kDashedFactor : 2)));
+                                           : (across + down) * (broken ? kDashedFactor : 2)));
     switch (letter) {
       case 'B': surface_.Box(x1, y1, x2, y2, colour); return;
       case 'C':
@@ -121,10 +124,9 @@ bool PlayChartScript(std::string_view script, Surface& surface, const FontSettin
                      const ChartColours& colours) {
   try {
     Player player(surface, fonts, colours);
-    return ForEachCommand(script, ScriptMedium::kScreen,
-                          [&player](ScriptShape shape, const ScriptLine& line) {
-                            player.Play(shape, line);
-                          });
+    return ForEachCommand(
+        script, ScriptMedium::kScreen,
+        [&player](ScriptShape shape, const ScriptLine& line) { player.Play(shape, line); });
   } catch (const RunTimeError&) {
     return false;
   } catch (const std::bad_alloc&) {
@@ -151,8 +153,7 @@ bool ShowSavedChart(const Files& files, Dialogs& dialogs, Surface& surface,
   }
   dialogs.SetBusy(false);
   if (!played)
-    dialogs.Message("There is problem displaying this chart - format invalid.",
-                    "Show Saved Chart");
+    dialogs.Message("There is problem displaying this chart - format invalid.", "Show Saved Chart");
   return played;
 }
 

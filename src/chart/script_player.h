@@ -3,9 +3,9 @@
 #include <string_view>
 
 #include "base/files.h"
+#include "looks/colours.h"
 #include "platform/surface.h"
 #include "settings/settings.h"
-#include "store/colours.h"
 
 namespace kora {
 

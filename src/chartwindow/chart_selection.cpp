@@ -1,12 +1,13 @@
 #include "chartwindow/chart_selection.h"
 
 #include <algorithm>
-#include <array>
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "indicators/oscillators.h"
 #include "platform/dialogs.h"
+#include "store/industry_classes.h"
 
 namespace kora {
 namespace {
@@ -15,50 +16,38 @@ constexpr std::string_view kTitle = "Chart Selection";
 constexpr std::string_view kFullListLabel = " FULL LIST   (Names.Dat)";
 constexpr std::string_view kLatest = "LATEST";
 
-constexpr std::array<OscChoice, 18> kOscChoices = {{{"(None)", ""},
-                                                    {"Directional Movement", "DM"},
-                                                    {"Coppock", "COP"},
-                                                    {"ElderRay", "ERY"},
-                                                    {"FX", "FX"},
-                                                    {"Jones Holy Grail", "JHG"},
-                                                    {"MACD", "MACD"},
-                                                    {"Momentum", "MOM"},
-                                                    {"On-Balance Volume", "OBV"},
-                                                    {"Parabolic", "PARA"},
-                                                    {"ROC", "ROC"},
-                                                    {"ROC & FX", "R/F"},
-                                                    {"RMO", "RMO"},
-                                                    {"RMX", "RMX"},
-                                                    {"RSI", "RSI"},
-                                                    {"Stochastic", "STO"},
-                                                    {"Volatility", "VTY"},
-                                                    {"Williams %R", "WMS"}}};
-
-int IndexOfStyle(char style, int other) {
+int IndexOf(Style style) {
   switch (style) {
-    case 'B': return kBarIndex;
-    case 'C': return kCandleIndex;
-    case 'L': return kLineIndex;
-    case 'P': return kPointFigureIndex;
-    default: return other;
+    case Style::kBar: return kBarIndex;
+    case Style::kCandlestick: return kCandleIndex;
+    case Style::kPointFigure: return kPointFigureIndex;
+    case Style::kLine: break;
   }
+  return kLineIndex;
 }
 
-char StyleOfIndex(int index) {
+Style StyleOfIndex(int index) {
   switch (index) {
-    case kBarIndex: return 'B';
-    case kCandleIndex: return 'C';
-    case kPointFigureIndex: return 'P';
-    default: return 'L';
+    case kBarIndex: return Style::kBar;
+    case kCandleIndex: return Style::kCandlestick;
+    case kPointFigureIndex: return Style::kPointFigure;
+    default: return Style::kLine;
   }
 }
 
-int IndexOfPeriod(std::string_view period) {
-  return period == "W" ? kWeeklyIndex : period == "M" ? kMonthlyIndex : kDailyIndex;
+int IndexOf(Period period) {
+  switch (period) {
+    case Period::kWeekly: return kWeeklyIndex;
+    case Period::kMonthly: return kMonthlyIndex;
+    case Period::kDaily: break;
+  }
+  return kDailyIndex;
 }
 
-std::string PeriodOfIndex(int index) {
-  return index == kWeeklyIndex ? "W" : index == kMonthlyIndex ? "M" : "A";
+Period PeriodOfIndex(int index) {
+  return index == kWeeklyIndex    ? Period::kWeekly
+         : index == kMonthlyIndex ? Period::kMonthly
+                                  : Period::kDaily;
 }
 
 std::string BoolText(bool value) { return value ? "True" : "False"; }
@@ -70,7 +59,15 @@ bool HasBars(const NameRec& rec) { return rec.RecType == kShare || rec.RecType =
 
 }  // namespace
 
-std::span<const OscChoice> OscChoices() { return kOscChoices; }
+std::span<const OscChoice> OscChoices() {
+  static const std::vector<OscChoice> choices = [] {
+    std::vector<OscChoice> all{{"(None)", ""}};
+    for (const Oscillator& row : Oscillators())
+      if (row.choice) all.push_back({row.choice, row.code});
+    return all;
+  }();
+  return choices;
+}
 
 std::vector<ListEntry> ListEntries(const Files& files, const std::string& dataPath,
                                    const SettingsFile& user) {
@@ -88,13 +85,6 @@ std::vector<ListEntry> ListEntries(const Files& files, const std::string& dataPa
     out.push_back({std::move(text), item});
   }
   return out;
-}
-
-bool MatchesIndClass(std::string_view indClass, std::string_view filter) {
-  const std::string_view own = Trim(indClass);
-  if (own.empty() || filter.empty()) return false;
-  if (filter.back() == '0') return own.size() == 3 && own.substr(0, 2) == filter.substr(0, 2);
-  return own == filter;
 }
 
 struct ChartSelection::Books {
@@ -168,7 +158,7 @@ void ChartSelection::ShowName(const NameRec& rec, std::int32_t record) {
   current.Rec = rec;
   current.NameRecNo = CInt(record);
   current.CurrentCode = std::string(rec.Code.trimmed());
-  current.CurrentDataFile = current.CurrentCode + ".WDT";
+  current.PriceFileName = current.CurrentCode + ".WDT";
   view_.Text1 = FromAnsi(rec.Code.trimmed());
   view_.Text2 = FromAnsi(rec.Name.trimmed());
 }
@@ -180,7 +170,7 @@ void ChartSelection::ShowRecord(const Books& books) {
   GoTo(state.ChartIndex < 1 || state.ChartIndex > Count() ? std::int16_t(1) : state.ChartIndex);
   view_.Text1.clear();
   view_.Text2.clear();
-  services_.current.CurrentDataFile.clear();
+  services_.current.PriceFileName.clear();
   const std::int16_t record =
       FullList() ? state.ChartIndex : books.list[size_t(state.ChartIndex - 1)].ListRecNo;
   ShowName(books.names.Read(record), record);
@@ -222,7 +212,6 @@ void ChartSelection::Load() {
   ChartState& state = services_.state;
   const bool first = !state.ChartSelLoaded;
   second_ = false;
-  state.MultiOscOn = 0;
   view_ = {};
   view_.Command6Shown = services_.settings.download.DataService == 3;
   view_.Text7 = state.VolumeOption ? "ON" : "OFF";
@@ -232,9 +221,8 @@ void ChartSelection::Load() {
       const std::string value = services_.ini.GetSetting("Charts", key);
       return value == kUnknown ? std::string(missing) : value;
     };
-    const std::string type = kept("Type", "B");
-    state.ChartStyle = type.size() == 1 ? StyleOfIndex(IndexOfStyle(type[0], kLineIndex)) : 'L';
-    state.ChartPeriod = PeriodOfIndex(IndexOfPeriod(kept("Period", "A")));
+    state.ChartStyle = ParseStyle(kept("Type", "B")).value_or(Style::kLine);
+    state.ChartPeriod = ParsePeriod(kept("Period", "A")).value_or(Period::kDaily);
     state.BandKind = SettingCInt(kept("Bands", "0"));
     state.Ma1On = services_.settings.charts.AvOne;
     state.Ma2On = services_.settings.charts.AvTwo;
@@ -247,13 +235,14 @@ void ChartSelection::Load() {
   } else {
     view_.Text3 = Str(std::int32_t(state.BarSpacing));
     if (state.OscShown) {
-      const auto* chosen = std::find_if(kOscChoices.begin(), kOscChoices.end(),
-                                        [&](const auto& o) { return o.code == state.OscSelected; });
-      if (chosen != kOscChoices.end()) view_.Combo2 = int(chosen - kOscChoices.begin());
+      const std::span<const OscChoice> choices = OscChoices();
+      const auto chosen = std::find_if(choices.begin(), choices.end(),
+                                       [&](const auto& o) { return o.code == state.OscSelected; });
+      if (chosen != choices.end()) view_.Combo2 = int(chosen - choices.begin());
     }
   }
-  SetStyle(IndexOfStyle(state.ChartStyle, kLineIndex));
-  view_.Combo4 = IndexOfPeriod(state.ChartPeriod);
+  SetStyle(IndexOf(state.ChartStyle));
+  view_.Combo4 = IndexOf(state.ChartPeriod);
   if (state.BandKind != 1 && state.BandKind != 2) state.BandKind = 0;
   view_.Combo3 = state.BandKind;
   view_.OAve1Ticked = state.Ma1On;
@@ -287,8 +276,8 @@ void ChartSelection::LoadSecond() {
   second_ = true;
   view_ = {};
   view_.Text3 = Str(std::int32_t(state.BarSpacing));
-  SetStyle(IndexOfStyle(state.ChartStyle, kLineIndex));
-  view_.Combo4 = IndexOfPeriod(state.ChartPeriod);
+  SetStyle(IndexOf(state.ChartStyle));
+  view_.Combo4 = IndexOf(state.ChartPeriod);
   ShowAverages();
   ShowListName();
   Guarded([&] {
@@ -325,7 +314,7 @@ bool ChartSelection::Activate() {
     state.ChartIndex = 1;
     ShowRecord(books);
     SetStyleForRecord(false);
-    view_.Combo4 = IndexOfPeriod(state.ChartPeriod);
+    view_.Combo4 = IndexOf(state.ChartPeriod);
     ShowAverages();
   });
   if (state.BarSpacing == 0) {
@@ -348,28 +337,19 @@ bool ChartSelection::TakeChoices() {
   ChartState& state = services_.state;
   return Guarded([&] {
     const double spacing = Val(view_.Text3);
-    const char style = StyleOfIndex(view_.Combo1);
-    state.BarSpacing = style != 'P' && spacing < 2 ? std::int16_t(2) : CInt(spacing);
+    const Style style = StyleOfIndex(view_.Combo1);
+    state.BarSpacing =
+        style != Style::kPointFigure && spacing < 2 ? std::int16_t(2) : CInt(spacing);
     state.ChartStyle = style;
     state.ChartPeriod = PeriodOfIndex(view_.Combo4);
   });
 }
 
-// The window's NextChart adds 1 again.
-void ChartSelection::StepBack() {
-  ChartState& state = services_.state;
-  state.ChartIndex = std::int16_t(std::max<std::int16_t>(state.ChartIndex, 1) - 1);
-}
-
 bool ChartSelection::OK() {
   ChartState& state = services_.state;
   if (!TakeChoices()) return false;
-  if (second_) {
-    StepBack();
-    return true;
-  }
-  state.MultiOscOn = 0;
-  if (state.ChartStyle == 'P') {
+  if (second_) return true;
+  if (state.ChartStyle == Style::kPointFigure) {
     state.OscShown = false;
     state.BandKind = 0;
   } else {
@@ -378,13 +358,12 @@ bool ChartSelection::OK() {
   }
   ChartSettings& charts = services_.settings.charts;
   const SettingsFile::Batch batch(services_.ini);
-  Write("Type", charts.Type = std::string(1, state.ChartStyle));
-  Write("Period", charts.Period = state.ChartPeriod);
+  Write("Type", charts.Type = TextOf(state.ChartStyle));
+  Write("Period", charts.Period = TextOf(state.ChartPeriod));
   Write("Spacing", Str(std::int32_t(charts.Spacing = state.BarSpacing)));
   Write("Bands", Str(std::int32_t(charts.Bands = state.BandKind)));
   WriteShared();
   Write("List", Str(std::int32_t(charts.List = state.ChartListNo)));
-  StepBack();
   return true;
 }
 
@@ -392,8 +371,8 @@ void ChartSelection::Close() {
   const ChartState& state = services_.state;
   ChartSettings& charts = services_.settings.charts;
   const SettingsFile::Batch batch(services_.ini);
-  if (state.ChartStyle != '\0') Write("Type", charts.Type = std::string(1, state.ChartStyle));
-  if (!state.ChartPeriod.empty()) Write("Period", charts.Period = state.ChartPeriod);
+  Write("Type", charts.Type = TextOf(state.ChartStyle));
+  Write("Period", charts.Period = TextOf(state.ChartPeriod));
   if (state.BarSpacing >= 1 && state.BarSpacing <= 10)
     Write("Spacing", Str(std::int32_t(charts.Spacing = state.BarSpacing)));
   if (state.BandKind == 1 || state.BandKind == 2)
@@ -453,9 +432,10 @@ ChartSelection::Entered ChartSelection::EnterCode(std::string_view typed) {
 }
 
 void ChartSelection::TakeFound() {
-  if (HasNoBars(services_.current.Rec)) SetStyle(kLineIndex);
+  if (HasNoBars(services_.current.Rec))
+    SetStyle(kLineIndex);
   else if (HasBars(services_.current.Rec))
-    SetStyle(IndexOfStyle(services_.state.ChartStyle, kBarIndex));
+    SetStyle(IndexOf(services_.state.ChartStyle));
   ChoosePeriod(kDailyIndex);
   SpacingRange();
 }
@@ -511,8 +491,10 @@ void ChartSelection::FindNextICRec(const Books& books) {
     ShowRecord(books);
     return;
   }
-  if (HasNoBars(services_.current.Rec)) SetStyle(kLineIndex);
-  else if (HasBars(services_.current.Rec)) SetStyle(kBarIndex);
+  if (HasNoBars(services_.current.Rec))
+    SetStyle(kLineIndex);
+  else if (HasBars(services_.current.Rec))
+    SetStyle(kBarIndex);
   ChoosePeriod(kDailyIndex);
   SpacingRange();
 }
@@ -563,9 +545,10 @@ void ChartSelection::SetStyle(int index) {
 
 void ChartSelection::SetStyleForRecord(bool firstLoad) {
   if (HasNoBars(services_.current.Rec))
-    SetStyle(firstLoad && services_.state.ChartStyle == 'P' ? kPointFigureIndex : kLineIndex);
+    SetStyle(firstLoad && services_.state.ChartStyle == Style::kPointFigure ? kPointFigureIndex
+                                                                            : kLineIndex);
   else if (HasBars(services_.current.Rec))
-    SetStyle(IndexOfStyle(rememberedStyle_, kBarIndex));
+    SetStyle(IndexOf(rememberedStyle_));
 }
 
 void ChartSelection::ChooseStyle(int index) {
@@ -614,18 +597,20 @@ bool ChartSelection::ChooseBands(int index) {
 }
 
 void ChartSelection::ChooseOscillator(int index) {
-  if (index < 0 || size_t(index) >= kOscChoices.size()) return;
+  if (index < 0 || size_t(index) >= OscChoices().size()) return;
   view_.Combo2 = index;
   services_.state.OscShown = index != 0;
-  if (index != 0) services_.state.OscCode = std::string(kOscChoices[size_t(index)].code);
+  if (index != 0) services_.state.OscCode = std::string(OscChoices()[size_t(index)].code);
 }
 
 void ChartSelection::TypeSpacing(std::string_view text) { view_.Text3 = std::string(text); }
 
 void ChartSelection::LeaveSpacing() {
   const double value = Val(view_.Text3);
-  if (value < 1) view_.Text3 = "2";
-  else if (value > 20) view_.Text3 = "20";
+  if (value < 1)
+    view_.Text3 = "2";
+  else if (value > 20)
+    view_.Text3 = "20";
   CandleSpacing();
 }
 

@@ -10,9 +10,9 @@
 
 #include "chart/chart_state.h"
 #include "lists/chart_list.h"
+#include "looks/colours.h"
 #include "platform/settings_file.h"
 #include "settings/settings.h"
-#include "store/colours.h"
 #include "store/name_file.h"
 
 // What chart selection decides. Its forms show the view and pass on what the user does.
@@ -21,7 +21,8 @@ namespace kora {
 
 class Dialogs;
 
-// The oscillators that chart selection offers; the place is the index of Combo2.
+// The oscillators that chart selection offers, in the order of their table behind none; the
+// place is the index of Combo2.
 struct OscChoice {
   std::string_view caption, code;
 };
@@ -39,23 +40,19 @@ struct ListEntry {
 std::vector<ListEntry> ListEntries(const Files& files, const std::string& dataPath,
                                    const SettingsFile& user);
 
-// Trimmed IndClass of a record against a filter. A filter ending in "0" is a group: any class of
-// 3 characters that begins with the filter's first two. An empty filter or class never matches.
-bool MatchesIndClass(std::string_view indClass, std::string_view filter);
-
 // What the form shows. Colours are entries of ChartColours.
 struct ChartSelectionView {
-  std::string Label8;           // name of the list in use
-  std::string Text1, Text2;     // code and name of the security on show
-  std::string Text3 = "2";      // spacing
-  std::string Text4, Text5;     // count of the list in use, ChartIndex
-  std::string Text6 = "LATEST"; // finish date
-  std::string Text7 = "ON";     // volumes
-  std::string Text8;            // industry class
+  std::string Label8;            // name of the list in use
+  std::string Text1, Text2;      // code and name of the security on show
+  std::string Text3 = "2";       // spacing
+  std::string Text4, Text5;      // count of the list in use, ChartIndex
+  std::string Text6 = "LATEST";  // finish date
+  std::string Text7 = "ON";      // volumes
+  std::string Text8;             // industry class
   std::string Label4 = "Chart Spacing";
   std::int16_t VScroll1 = 1, VScrollMax = 1;  // from 1
   int Combo1 = 0, Combo2 = 0, Combo3 = 0, Combo4 = 0;
-  std::string OAve1, OAve2;     // captions: the periods
+  std::string OAve1, OAve2;  // captions: the periods
   bool OAve1Ticked = false, OAve2Ticked = false;
   int OAve1Colour = kBackground, OAve2Colour = kBackground;
   bool Check16 = false;
@@ -96,7 +93,7 @@ class ChartSelection {
   void LoadSecond();
   // On return to the form. True when the list had changed: the code takes the focus.
   bool Activate();
-  // Stores and writes the choices; ChartIndex is one less then, for the window's NextChart.
+  // Stores and writes the choices; ChartIndex is the place of the chart that was chosen.
   // False, with the message, when the spacing is no number that can be kept. For the second
   // chart only style, period and spacing are stored and nothing is written.
   bool OK();
@@ -130,7 +127,7 @@ class ChartSelection {
   void TickAverage(int which, bool ticked);  // 1 or 2
   // After the settings' averages were switched or saved elsewhere: on or off, and their periods.
   void AveragesChanged();
-  void TypeSpacing(std::string_view text);   // as typed, no rule yet
+  void TypeSpacing(std::string_view text);  // as typed, no rule yet
   void LeaveSpacing();
   void StepSpacing(bool up);
   void FlipVolumes();
@@ -164,7 +161,6 @@ class ChartSelection {
   void FindNextICRec(const Books& books);
   void TakeFound();
   bool TakeChoices();
-  void StepBack();
   void Write(std::string_view key, const std::string& value);
   void WriteShared();
   void SetStyle(int index);
@@ -179,7 +175,7 @@ class ChartSelection {
 
   ChartSelectionServices services_;
   ChartSelectionView view_;
-  char rememberedStyle_ = 'B';  // chosen for a share or index
+  Style rememberedStyle_ = Style::kBar;  // chosen for a share or index
   bool second_ = false;
 };
 

@@ -2,34 +2,55 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdlib>
+#include <utility>
 #include <vector>
 
 #include "base/dates.h"
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "base/version.h"
 #include "chart/script_player.h"
 #include "chartwindow/chart_selection.h"
+#include "chartwindow/tools/cross_hair.h"
+#include "chartwindow/tools/fibonacci.h"
+#include "chartwindow/tools/move_trendline.h"
+#include "chartwindow/tools/text_note.h"
+#include "chartwindow/tools/trendline.h"
+#include "chartwindow/tools/zoom_chart.h"
+#include "indicators/osc_settings.h"
 #include "indicators/oscillators.h"
 #include "indicators/price_overlays.h"
+#include "indicators/swing_settings.h"
 #include "lists/chart_list.h"
+#include "store/industry_classes.h"
 
 namespace kora {
 namespace {
 
 constexpr std::string_view kTitle = "Charts";
+constexpr int kMostRows = 32767;
 constexpr std::string_view kSaveTitle = "Save Chart";
 constexpr std::string_view kCompareTitle = "RMX Compare ";
 constexpr std::string_view kFrameKey = "BDFrame";
 
-bool EndsWith(std::string_view name, std::string_view ending) {
-  return name.size() >= ending.size() &&
-         EqualNoCase(name.substr(name.size() - ending.size()), ending);
-}
-
 void ReadyToCopy(Surface& surface) {
   surface.SetDrawMode(DrawMode::kCopy);
   surface.SetDrawStyle(DrawStyle::kSolid);
+}
+
+const char* NameOf(Style style) {
+  switch (style) {
+    case Style::kCandlestick: return "Candlestick";
+    case Style::kLine: return "Line";
+    case Style::kPointFigure: return "Point and Figure";
+    default: return "Bar";
+  }
+}
+
+const char* NameOf(Period period) {
+  return period == Period::kWeekly ? "Weekly" : period == Period::kMonthly ? "Monthly" : "Daily";
 }
 
 void OwnScale(Surface& surface) { surface.SetScale(0, 0, surface.Width(), surface.Height()); }
@@ -82,7 +103,29 @@ const ToolButtonText& ToolButtonOf(int button) {
 }
 
 ChartWindow::ChartWindow(const ChartWindowServices& services)
-    : services_(services), dialogs_(services.dialogs) {
+    : services_(services),
+      dialogs_(services.dialogs),
+      toolView_{.chart = Chart,
+                .request = Request,
+                .arrangement = arrangement_,
+                .boxes = Chart.Boxes,
+                .panelFrame = panelFrame_,
+                .chartFromFile = ChartFromFile,
+                .price = services_.price,
+                .panel = services_.panel,
+                .colours = services_.colours,
+                .settings = services_.settings,
+                .dialogs = dialogs_,
+                .files = services_.files,
+                .panels = view_.Panels,
+                .title = view_.Title,
+                .SwingOn = services_.state.SwingOn,
+                .rows = rows_,
+                .Touched =
+                    [this](const Surface& surface, double x1, double y1, double x2, double y2) {
+                      if (Touched) Touched(surface, x1, y1, x2, y2);
+                    },
+                .Keep = [this](const DrawnMark& mark) { Keep(mark); }} {
   RefreshTitle();
 }
 
@@ -92,6 +135,7 @@ void ChartWindow::Load() {
   AnalPageMode = false;
   s.ChartIndex = 0;
   s.OutsideDaysOn = false;
+  s.KeepOsc = SettingBool(services_.ini.GetSetting("Charts", "KeepOsc"));
   framePending_ = true;
   if (!s.ChartSelLoaded) {
     const ChartRequest standing = RequestFromSettings(services_.settings);
@@ -110,16 +154,23 @@ void ChartWindow::Load() {
 void ChartWindow::Unload() {
   CancelChartTools();
   state().PFAutoBox = false;
-  state().SplitScreen = state().SplitShown = state().Superimposed = false;
+  if (std::exchange(state().SwingOn, false)) state().BarSpacing = SavedSpacing_;
+  arrangement_ = Arrangement::kOne;
 }
 
 void ChartWindow::RefreshTitle() {
-  view_.Title = "KORA Charting 7F   -  CHARTS  " +
+  view_.Title = std::string(kProgramTitle) + "   -  CHARTS  " +
                 std::string(Trim(services_.settings.paths.CurrentDataPath));
+  if (ChartFromFile)
+    view_.Title += "  -  " + SuggestedName();
+  else if (Chart.ChartDrawn)
+    view_.Title += "  -  " + FromAnsi(Request.Name.Code.trimmed()) + "  " +
+                   NameOf(Request.ChartStyle) + "  " + NameOf(Request.ChartPeriod);
 }
 
 std::string ChartWindow::ScriptOnShow() const {
-  return ChartFromFile ? SavedChartFile : ScriptPath();
+  if (ChartFromFile) return SavedChartFile;
+  return Chart.ChartDrawn ? scriptPath_ : std::string();
 }
 
 void ChartWindow::StartPrinting(bool print) {
@@ -128,18 +179,16 @@ void ChartWindow::StartPrinting(bool print) {
   if (print) state().ChartTask = kTaskPrinting;
 }
 
-std::string ChartWindow::ScriptPath() const {
-  return services_.settings.paths.CurrentDataPath + "TCht.Tmp";
-}
-
 // ---- Which chart
 
-bool ChartWindow::NextChart() {
+bool ChartWindow::ShowAt(int index) {
   if (Loading) return false;
-  if (!Move(1, false)) return false;
+  if (!GoTo(index, false)) return false;
   ShowDateLimit();
   return DrawChart();
 }
+
+bool ChartWindow::NextChart() { return ShowAt(state().ChartIndex + 1); }
 
 bool ChartWindow::StepChart() {
   if (Loading) return false;
@@ -148,19 +197,15 @@ bool ChartWindow::StepChart() {
     s.DateLimitOn = false;
     HideFrame();
   }
-  s.PFBoxSize = 0;
-  if (!Move(s.ChartDirection == 1 ? 1 : -1, s.ChartListNo == kFullList && s.ICFilterOn))
+  if (!GoTo(s.ChartIndex + (s.ChartDirection == 1 ? 1 : -1),
+            s.ChartListNo == kFullList && s.ICFilterOn))
     return false;  // what stands on the window stays
   if (!s.OscShown) LayOut(false);
   if (s.DateLimitOn) TakeChosenLimit();
   return DrawChart();
 }
 
-bool ChartWindow::Redraw() {
-  if (Loading || !HasChart()) return false;
-  --state().ChartIndex;
-  return NextChart();
-}
+bool ChartWindow::Redraw() { return HasChart() && ShowAt(state().ChartIndex); }
 
 bool ChartWindow::Refresh() {
   CancelChartTools();
@@ -168,8 +213,9 @@ bool ChartWindow::Refresh() {
 }
 
 bool ChartWindow::Resized() {
-  ForgetCross();
-  if (Loading || (!HasChart() && !ChartFromFile)) return false;
+  ForgetTool();
+  // Under the multi-oscillator view the script is the view's; the chart is drawn on return.
+  if (Loading || AnalPageMode || (!HasChart() && !ChartFromFile)) return false;
   return dialogs_.Repeat([this] { return DrawAll(); });
 }
 
@@ -179,9 +225,12 @@ bool ChartWindow::DrawAll() {
     return ShowSavedChart(services_.files, dialogs_, services_.price, services_.settings.fonts,
                           services_.colours, SavedChartFile);
   }
-  if (state().SplitShown || state().Superimposed) return RedrawPair();
+  if (IsPair(arrangement_)) return RedrawPair();
   const std::string picked = panelPicked_ ? panelCode_ : "";
-  if (!Redraw()) return false;
+  boxKept_ = true;
+  const bool drawn = Redraw();
+  boxKept_ = false;
+  if (!drawn) return false;
   if (picked.empty()) return true;
   state().OscCode = picked;
   return ShowOscillator();
@@ -189,32 +238,24 @@ bool ChartWindow::DrawAll() {
 
 // Both charts of a pair once more, or the first where the second is still to come.
 bool ChartWindow::RedrawPair() {
-  ChartState& s = state();
   const ChartRequest first = first_, second = Request;
-  const bool split = s.SplitShown;
-  const bool both = split ? !s.SplitScreen : Chart.OscPanel == 0;
+  const bool split = IsSplit(arrangement_), both = !AwaitsSecond(arrangement_);
   LayOut(false);
-  if (split) {
-    s.SplitScreen = true;
-    Chart.ChartSlot = 1;
-  } else {
-    Chart.OscPanel = 1;
-  }
-  if (!Compose(first)) return false;
-  if (!split) Chart.OscPanel = 2;
-  return !both || Compose(second);
+  if (!Compose(first, split ? ChartPlace::kUpper : ChartPlace::kUnder)) return false;
+  return !both || Compose(second, split ? ChartPlace::kLower : ChartPlace::kOver);
 }
 
-// Opens the files, finds the record `step` places on and reads it.
-bool ChartWindow::Move(int step, bool filtered) {
+// Opens the files, finds the record at that place and reads it.
+bool ChartWindow::GoTo(int index, bool filtered) {
   dialogs_.Forget();
   AnalPageMode = false;
   state().SuppressScript = false;
+  if (!boxKept_) state().PFBoxSize = 0;
   EmptyDrawnLines();
   const std::string& dataPath = services_.settings.paths.CurrentDataPath;
   std::string path = NameFilePath(dataPath);
   try {
-    if (FindRecord(step, filtered)) return true;
+    if (FindRecord(index, filtered)) return true;
     state().ChartIndex = 0;
     return false;
   } catch (const RunTimeError& e) {
@@ -231,11 +272,29 @@ bool ChartWindow::Move(int step, bool filtered) {
   }
 }
 
-bool ChartWindow::FindRecord(int step, bool filtered) {
+namespace {
+
+// How many records the security on show has moved since another program wrote the name file in
+// another order; 0 where it is gone.
+int MovedBy(const NameFile& names, const CurrentName& current) {
+  const std::int16_t shown = current.NameRecNo;
+  if (shown < 1) return 0;
+  if (shown <= names.count() && names.Read(shown).Code == current.Rec.Code) return 0;
+  NameRec found;
+  const std::int16_t number = FindCode(names, current.Rec.Code.raw(), found);
+  return number == 0 ? 0 : number - shown;
+}
+
+}  // namespace
+
+bool ChartWindow::FindRecord(int index, bool filtered) {
   ChartState& s = state();
   CurrentName& current = services_.current;
   const std::string& dataPath = services_.settings.paths.CurrentDataPath;
   const NameFile names(services_.files, NameFilePath(dataPath));
+  // The record on show, or one beside it: where they stand now.
+  if (s.ChartListNo == kFullList && std::abs(index - current.NameRecNo) <= 1)
+    index += MovedBy(names, current);
   current.NameCount = CInt(names.count());
   std::int16_t count = current.NameCount;
   std::vector<ListRec> list;
@@ -251,21 +310,23 @@ bool ChartWindow::FindRecord(int step, bool filtered) {
                      current.NameCount == 0 ? kTitle : "Chart Lists");
     return false;
   }
-  const int index = s.ChartIndex + step;
-  if (index > count) s.ChartIndex = 1;
-  else if (index < 1) s.ChartIndex = count;
-  else s.ChartIndex = CInt(index);
+  if (index > count)
+    s.ChartIndex = 1;
+  else if (index < 1)
+    s.ChartIndex = count;
+  else
+    s.ChartIndex = CInt(index);
   if (filtered) FindNextChtIC(ReadNames(services_.files, dataPath));
 
   const std::int32_t record =
       list.empty() ? s.ChartIndex : list[size_t(s.ChartIndex) - 1].ListRecNo;
   current.Rec = names.Read(record);
   current.NameRecNo = CInt(record);
-  current.CurrentDataFile = std::string(current.Rec.Code.trimmed()) + ".WDT";
+  current.PriceFileName = std::string(current.Rec.Code.trimmed()) + ".WDT";
   // Such data has no bars. The style stays for the charts that follow.
   if (current.Rec.RecType >= kCloseVolume && current.Rec.RecType <= kAdvanceDecline &&
-      (s.ChartStyle == 'B' || s.ChartStyle == 'C'))
-    s.ChartStyle = 'L';
+      NeedsRange(s.ChartStyle))
+    s.ChartStyle = Style::kLine;
   return true;
 }
 
@@ -285,19 +346,18 @@ bool ChartWindow::FindNextChtIC(const std::vector<NameRec>& names) {
     index = step > 0 ? 1 : count;
   }
   dialogs_.Message("No records on file for that Industry classification or group",
-                     "Industry Classification");
+                   "Industry Classification");
   s.ChartIndex = 1;
   return false;
 }
 
 // What the mouse drew belongs to one chart.
 void ChartWindow::EmptyDrawnLines() {
-  if (state().SplitScreen) return;
+  if (arrangement_ == Arrangement::kUpper) return;
   try {
     const std::string path = services_.settings.paths.CurrentDataPath + "ChtLns.Tmp";
     if (!services_.files.CheckFile(path)) return;
-    if (services_.files.Open(path, OpenMode::kRead)->Size() > 0)
-      services_.files.WriteAll(path, "");
+    if (services_.files.Open(path, OpenMode::kRead)->Size() > 0) services_.files.WriteAll(path, "");
   } catch (const RunTimeError&) {
     // A data folder that can't be written still shows charts.
   }
@@ -308,10 +368,12 @@ bool ChartWindow::DrawChart() {
   ChartState& s = state();
   panelPicked_ = false;
   // Two charts on one picture have no room for a panel.
-  const bool pair = s.SplitScreen || Chart.OscPanel > 0;
-  if (s.OscShown && !pair) {
-    if (s.ChartPeriod != "A" && s.OscCode == "RMO") {
-      dialogs_.Message("RMO only available on Daily Charts", "RMO");
+  // One that was kept has no place on a point-and-figure chart, and comes back behind it.
+  const bool hidden = panelKept_ && s.ChartStyle == Style::kPointFigure;
+  if (s.OscShown && !AwaitsSecond(arrangement_) && !hidden) {
+    const Oscillator* oscillator = FindOscillator(s.OscCode);
+    if (oscillator && oscillator->dailyOnly && s.ChartPeriod != Period::kDaily) {
+      TellDailyOnly(s.OscCode);
       LayOut(false);
       return Compose();
     }
@@ -329,17 +391,19 @@ bool ChartWindow::DrawChart() {
 }
 
 void ChartWindow::LayOut(bool twoPanes) {
-  EraseCross();
+  if (tool_) tool_->Recomposed();
   if (!twoPanes) {
-    if (Chart.OscPanel == 0 && services_.panel.Visible()) {
+    if (services_.panel.Visible()) {
       services_.panel.SetBackColour(services_.colours[kBackground]);
       services_.panel.Cls();
     }
     panelCode_.clear();
   }
-  if (services_.layOut) services_.layOut(twoPanes);
-  else services_.panel.SetVisible(twoPanes);
-  view_.LegendShown = state().ReversalsOn && state().ChartStyle == 'B';
+  if (services_.layOut)
+    services_.layOut(twoPanes);
+  else
+    services_.panel.SetVisible(twoPanes);
+  view_.LegendShown = state().ReversalsOn && state().ChartStyle == Style::kBar;
 }
 
 ChartServices ChartWindow::Services(Surface& price, Surface* panel, ChartScript* script) {
@@ -352,88 +416,109 @@ ChartServices ChartWindow::Services(Surface& price, Surface* panel, ChartScript*
           .panel = panel,
           .script = script,
           .overlays = PriceOverlays(state().MMAOn, services_.settings.osc.MMASet),
-          .VolumeUnitText = services_.VolumeUnitText};
+          .VolumeUnitText = services_.VolumeUnitText,
+          .AskBoxValue = services_.askBoxValue};
+}
+
+// Lines and texts of the security, read as the chart is composed and placed on it.
+std::function<void(const ChartCanvas&)> ChartWindow::MarksOverlay() {
+  return [this](const ChartCanvas& canvas) {
+    savedMarks_ = ReadSavedMarks(services_.files, services_.settings.paths.ChartMiscPath,
+                                 canvas.request.Name.Code.trimmed());
+    DrawSavedMarks(canvas, savedMarks_, rows_);
+  };
 }
 
 bool ChartWindow::Compose() {
-  return Compose(MakeRequest(state(), services_.settings, services_.current.Rec));
+  return Compose(MakeRequest(state(), services_.settings, services_.current.Rec),
+                 PlaceOfNext(arrangement_));
 }
 
-bool ChartWindow::Compose(const ChartRequest& request) {
-  ChartState& s = state();
-  // Two charts of a pair are composed one after the other over a picture that stays. What the
-  // cross hair read is of the chart before, and must not stand under this one.
-  EraseCross();
-  if (cross_) ClearStatusBar();
-  ChartFromFile = false;
-  Chart.TwoCharts = s.SplitScreen;
-  s.SplitShown = s.SplitScreen;
-  s.Superimposed = Chart.OscPanel == 1 || Chart.OscPanel == 2;
-  const bool second = Chart.OscPanel == 2;
-  Request = request;
-  if (Chart.OscPanel == 1 || (s.SplitScreen && Chart.ChartSlot == 1)) first_ = request;
-  script_.emplace(services_.files, ScriptPath());
-  const bool drawn = ComposeChart(Services(services_.price, &services_.panel, &*script_), Request,
-                                  Chart);
-  if (!drawn) {
-    Chart.TwoCharts = false;
-    s.MultiOscOn = 0;
+bool ChartWindow::Compose(const ChartRequest& request, ChartPlace place) {
+  // Two charts of a pair are composed one after the other over a picture that stays.
+  if (tool_) tool_->Recomposed();
+  DropMarker();
+  point_.reset();
+  if (!IsSecond(place)) {
+    marks_.clear();
+    rows_.clear();
+    savedMarks_ = {};
   }
-  s.SplitScreen = Chart.TwoCharts;
-  if (!s.SplitScreen) Chart.ChartSlot = 0;
-  if (second || !drawn) Chart.OscPanel = 0;
+  ChartFromFile = false;
+  Request = request;
+  Request.Place = place;
+  if (place == ChartPlace::kUpper || place == ChartPlace::kUnder) first_ = request;
+  // The script belongs to this chart, wherever the data folder goes meanwhile.
+  scriptPath_ = services_.settings.paths.CurrentDataPath + "TCht.Tmp";
+  script_.emplace(services_.files, scriptPath_);
+  ChartServices services = Services(services_.price, &services_.panel, &*script_);
+  services.overlays.push_back(MarksOverlay());
+  const bool drawn = ComposeChart(services, Request, Chart);
+  // Drawn again, by a print or another size, it is not asked for again.
+  if (drawn && Request.ChartStyle == Style::kPointFigure && !Request.PFAutoBox) {
+    Request.PFBoxSize = state().PFBoxSize = Chart.Boxes.PFBoxSize;
+    if (place == ChartPlace::kUpper || place == ChartPlace::kUnder) first_ = Request;
+  }
+  arrangement_ = ArrangementAfter(place, drawn);
+  RefreshTitle();
   if (!drawn && services_.panel.Visible()) services_.panel.Cls();
   return drawn;
 }
 
 bool ChartWindow::Recompose() {
   if (Loading || !HasChart()) return false;
-  if (Chart.OscPanel == 2 || state().SplitScreen) {
+  if (AwaitsSecond(arrangement_)) {
     // The second chart is still to come: the first one alone is drawn anew.
     first_.GridLines = services_.settings.charts.GridLines;
     return RedrawPair();
   }
+  EmptyDrawnLines();
   if (!Compose()) return false;
   if (!panelCode_.empty()) ShowPanel(panelCode_);
   return true;
 }
 
 bool ChartWindow::DrawAgain(Surface& price, Surface* panel) {
-  const ChartState& s = state();
+  if (ScriptOnShow().empty()) return false;
   try {
-    if (ChartFromFile || s.SplitShown || s.Superimposed) {
+    if (ChartFromFile || IsPair(arrangement_)) {
       price.SetBackColour(services_.colours[kBackground]);
       price.Cls();
-      return PlayChartScript(
-          services_.files.ReadAll(ScriptOnShow()), price,
-          services_.settings.fonts, services_.colours);
+      return PlayChartScript(services_.files.ReadAll(ScriptOnShow()), price,
+                             services_.settings.fonts, services_.colours);
     }
   } catch (const RunTimeError&) {
     return false;
   }
-  if (!HasChart()) return false;
   Composition chart = Chart;
   ChartRequest request = Request;
   request.SuppressScript = true;
-  if (!ComposeChart(Services(price, panel, nullptr), request, chart)) return false;
+  // The marks as they stand on the window, whatever became of their files since.
+  ChartServices services = Services(price, panel, nullptr);
+  services.overlays.push_back([this](const ChartCanvas& canvas) {
+    std::vector<TrendlineRow> rows;
+    DrawSavedMarks(canvas, savedMarks_, rows);
+  });
+  if (!ComposeChart(services, request, chart)) return false;
   const bool overlay = !panelCode_.empty() && !HasPanel(panelCode_);
   if (!panelCode_.empty() && (panel || overlay)) {
-    OscHost host = Host(panelCode_, chart, request, price, panel ? *panel : services_.panel,
-                        nullptr);
+    OscHost host =
+        Host(panelCode_, chart, request, price, panel ? *panel : services_.panel, nullptr);
     ShowOscillatorPanel(host);
   }
+  ReplayMarks(price, panel);
   return true;
 }
 
 // ---- How it is drawn
 
-bool ChartWindow::SetStyle(char style) {
+bool ChartWindow::SetStyle(Style style) {
   CancelChartTools();
   state().ChartStyle = style;
   return Redraw();
 }
 
-bool ChartWindow::SetPeriod(std::string_view period) {
+bool ChartWindow::SetPeriod(Period period) {
   CancelChartTools();
   state().ChartPeriod = period;
   return Redraw();
@@ -450,8 +535,8 @@ bool ChartWindow::ToggleReversals() {
   CancelChartTools();
   ChartState& s = state();
   s.ReversalsOn = !s.ReversalsOn;
-  view_.LegendShown = s.ReversalsOn && s.ChartStyle == 'B';
-  return s.ChartStyle == 'B' && Recompose();
+  view_.LegendShown = s.ReversalsOn && s.ChartStyle == Style::kBar;
+  return s.ChartStyle == Style::kBar && Recompose();
 }
 
 bool ChartWindow::ToggleOutsideDays() {
@@ -470,6 +555,21 @@ bool ChartWindow::TogglePFAuto() {
   return HasChart() && NextChart();
 }
 
+bool ChartWindow::ToggleSwing() {
+  CancelChartTools();
+  ChartState& s = state();
+  s.SwingOn = !s.SwingOn;
+  if (s.SwingOn) {
+    s.ChartStyle = Style::kBar;
+    SavedSpacing_ = s.BarSpacing;
+    s.BarSpacing = std::max<std::int16_t>(s.BarSpacing, 3);
+    s.Swing = SwingToShow(s.Swing);
+  } else {
+    s.BarSpacing = SavedSpacing_;
+  }
+  return Redraw();
+}
+
 // ---- Oscillators
 
 OscHost ChartWindow::Host(std::string_view code, Composition& chart, const ChartRequest& request,
@@ -484,27 +584,28 @@ OscHost ChartWindow::Host(std::string_view code, Composition& chart, const Chart
           .panel = panel,
           .script = script,
           .OscCode = std::string(code),
-          .SlowStochastic = state().SlowStochastic,
-          .AnalPageMode = AnalPageMode};
+          .SlowStochastic = state().SlowStochastic};
 }
 
 void ChartWindow::ShowPanel(std::string_view code) {
-  EraseCross();
-  OscHost host = Host(code, Chart, Request, services_.price, services_.panel,
-                      script_ ? &*script_ : nullptr);
+  if (tool_) tool_->Recomposed();
+  OscHost host =
+      Host(code, Chart, Request, services_.price, services_.panel, script_ ? &*script_ : nullptr);
   // The panel before may have left a scale of its own.
   OwnScale(services_.panel);
   ShowOscillatorPanel(host);
-  panelTop_ = host.PanelTop;
-  panelBottom_ = host.PanelBottom;
+  panelFrame_ = {
+      .Left = 42, .Right = Chart.ChartRight, .Top = host.PanelTop, .Bottom = host.PanelBottom};
   panelCode_ = host.OscCode;
 }
 
 void ChartWindow::PickOscillator(std::string_view code, bool slow) {
   ChartState& s = state();
   if (!HasChart()) return;
-  const auto never = [&](bool hindered) { return hindered || s.ChartStyle == 'P'; };
-  if (code == "PARA" || code == "PARAV") {
+  const auto never = [&](bool hindered) { return hindered || s.ChartStyle == Style::kPointFigure; };
+  const Oscillator* oscillator = FindOscillator(code);
+  if (!oscillator) return;
+  if (!oscillator->panel) {
     if (never(false)) return;
     if (code == "PARAV") CancelChartTools();
     s.OscCode = code;
@@ -512,12 +613,13 @@ void ChartWindow::PickOscillator(std::string_view code, bool slow) {
     if (!Compose()) return;
     ShowPanel(code);
     panelPicked_ = true;
+    KeepPicked();
     return;
   }
-  if (code == "OBV" && never(!s.VolumeOption || !Chart.Bars.VolumeShown)) return;
+  if (oscillator->needsVolume && never(!s.VolumeOption || !Chart.Bars.VolumeShown)) return;
   CancelChartTools();
-  if (code == "RMO" && s.ChartPeriod != "A") {
-    dialogs_.Message("RMO only available on Daily Charts", "RMO");
+  if (oscillator->dailyOnly && s.ChartPeriod != Period::kDaily) {
+    TellDailyOnly(code);
     return;
   }
   if (code == "STO") s.SlowStochastic = slow;
@@ -534,60 +636,83 @@ void ChartWindow::PickOscillator(std::string_view code, bool slow) {
   }
 }
 
-bool ChartWindow::PeriodsValid() const {
-  const OscSettings& osc = services_.settings.osc;
-  const std::string& code = state().OscCode;
-  const auto first = [&](const PeriodPair& pair) {
-    const std::int16_t value = pair.For(state().ChartPeriod);
-    return value >= 1 && value <= 200;
-  };
-  const auto second = [&](const PeriodPair& pair) {
-    const std::int16_t value = pair.For(state().ChartPeriod);
-    return value >= 0 && value <= 200;
-  };
-  if (code == "STO") return first(osc.StochK) && second(osc.StochD);
-  if (code == "FX") return first(osc.FXF) && second(osc.FXX);
-  if (code == "R/F") return first(osc.FXF) && second(osc.FXX) && first(osc.RocP);
-  if (code == "ROC") return first(osc.RocP);
-  // One value for all chart periods.
-  if (code == "RMX") return osc.RmxP.daily >= 1 && osc.RmxP.daily <= 200;
-  if (code == "RMO") return first(osc.RmoP);
-  if (code == "RSI") return first(osc.RsiP);
-  if (code == "MACD") return first(osc.Md1) && first(osc.Md2) && first(osc.Md3);
-  if (code == "WMS") return first(osc.WmsA);
-  if (code == "ERY") return first(osc.ERA);
-  if (code == "DM") return first(osc.DMA);
-  if (code == "MOM") return first(osc.MMA);
-  if (code == "COP") return first(osc.CopD);
-  if (code == "JHG") return first(osc.HolyD);
-  if (code == "VTY") return first(osc.VtyD);
-  return true;
+std::string ChartWindow::ChartName() const {
+  if (ChartFromFile) return "Saved chart " + SavedChartFile;
+  const ChartBars& bars = Chart.Bars;
+  if (!Chart.ChartDrawn || bars.BarCount < 0 || size_t(bars.BarCount) >= bars.bars.size())
+    return "Chart";
+  const ChartBar& last = bars[size_t(bars.BarCount)];
+  std::string name = "Chart " + FromAnsi(Request.Name.Code.trimmed());
+  switch (Request.ChartStyle) {
+    case Style::kBar: name += ", bars"; break;
+    case Style::kCandlestick: name += ", candlesticks"; break;
+    case Style::kLine: name += ", line"; break;
+    case Style::kPointFigure: name += ", point and figure"; break;
+  }
+  switch (Request.ChartPeriod) {
+    case Period::kDaily: name += ", daily"; break;
+    case Period::kWeekly: name += ", weekly"; break;
+    case Period::kMonthly: name += ", monthly"; break;
+  }
+  if (!last.date().empty()) name += ", " + DateToDisplay(std::string(last.date()));
+  return name + ", close " + Str(last.Close);
+}
+
+std::string ChartWindow::PanelName() const {
+  const Oscillator* oscillator = FindOscillator(panelCode_);
+  if (!oscillator) return "Oscillator";
+  return "Oscillator " + std::string(oscillator->choice ? oscillator->choice : panelCode_);
+}
+
+// What was picked is asked for as chart selection does, which then shows it.
+void ChartWindow::KeepPicked() {
+  ChartState& s = state();
+  const Oscillator* oscillator = FindOscillator(panelCode_);
+  if (!s.KeepOsc || !oscillator || !oscillator->choice) return;
+  s.OscShown = panelKept_ = true;
+  s.OscSelected = panelCode_;
+}
+
+void ChartWindow::ToggleKeepOscillator() {
+  ChartState& s = state();
+  const bool keep = s.KeepOsc = !s.KeepOsc;
+  services_.ini.PutSetting("Charts", "KeepOsc", keep ? "True" : "False");
+  if (keep && panelPicked_) KeepPicked();
+  // What was kept goes with the next chart.
+  if (!keep && panelKept_ && s.OscSelected == panelCode_) s.OscShown = false;
+  if (!keep) panelKept_ = false;
+}
+
+void ChartWindow::TellDailyOnly(std::string_view code) {
+  dialogs_.Message(std::string(code) + " only available on Daily Charts", code);
 }
 
 bool ChartWindow::CompareFileThere() {
   const std::string& code = state().OscCode;
-  if (code != "RMX" && code != "RMO") return true;
+  const Oscillator* oscillator = FindOscillator(code);
+  if (!oscillator || !oscillator->compares) return true;
   const std::string& file = services_.settings.osc.CompFile;
   try {
     if (!Trim(file).empty() && services_.files.CheckFile(Trim(file))) return true;
   } catch (const RunTimeError&) {
     // A name that can't be one names no file.
   }
-  dialogs_.Message(
-      code == "RMX" ? " Oscillator values not valid"
-                    : file + " is not available. Use your code for the All Ordinaries Index",
-      kCompareTitle);
+  dialogs_.Message(code == "RMX"
+                       ? " Oscillator values not valid"
+                       : file + " is not available. Use your code for the All Ordinaries Index",
+                   kCompareTitle);
   return false;
 }
 
 bool ChartWindow::ShowOscillator() {
   ChartState& s = state();
-  if (!PeriodsValid()) {
+  const Oscillator* oscillator = FindOscillator(s.OscCode);
+  if (oscillator && !PeriodsInRange(*oscillator, services_.settings.osc, s.ChartPeriod)) {
     dialogs_.Message(s.OscCode + " Oscillator values not valid", "Oscillator Values");
     return false;
   }
   if (!CompareFileThere() || s.ChartStartup) return false;
-  if (!HasChart() || s.ChartStyle == 'P') return false;
+  if (!HasChart() || s.ChartStyle == Style::kPointFigure) return false;
   const std::string code = s.OscCode;
   LayOut(HasPanel(code));
   dialogs_.Yield();
@@ -595,6 +720,7 @@ bool ChartWindow::ShowOscillator() {
   if (!Compose()) return false;
   ShowPanel(code);
   panelPicked_ = true;
+  KeepPicked();
   return true;
 }
 
@@ -607,13 +733,11 @@ void ChartWindow::StartSuperimpose() {
   s.OscShown = false;
   s.OscCode.clear();
   LayOut(false);
-  s.SplitScreen = false;
   s.ChartTask = kTaskSuperimpose;
-  Chart.OscPanel = 1;
   services_.price.SetAutoRedraw(true);
-  if (!Compose()) return;
+  if (!Compose(MakeRequest(s, services_.settings, services_.current.Rec), ChartPlace::kUnder))
+    return;
   dialogs_.Yield();
-  Chart.OscPanel = 2;
   if (services_.openChart2) services_.openChart2();
 }
 
@@ -621,32 +745,26 @@ void ChartWindow::StartSplitScreen() {
   CancelChartTools();
   ChartState& s = state();
   if (!HasChart()) return;
-  s.ChartTask = kTaskFibonacci;
-  if (s.SplitScreen) return;
+  s.ChartTask = kTaskFibonacciOrSplit;
+  if (arrangement_ == Arrangement::kUpper) return;
   s.OscShown = false;
   s.OscCode.clear();
   LayOut(false);
-  s.SplitScreen = true;
-  Chart.ChartSlot = 1;
-  if (Compose() && services_.openChart2) services_.openChart2();
+  if (Compose(MakeRequest(s, services_.settings, services_.current.Rec), ChartPlace::kUpper) &&
+      services_.openChart2)
+    services_.openChart2();
 }
 
 void ChartWindow::DropSecondChart() {
   CancelChartTools();
-  EndPair();
-}
-
-void ChartWindow::EndPair() {
-  ChartState& s = state();
-  s.SplitScreen = s.SplitShown = s.Superimposed = false;
-  Chart.TwoCharts = false;
-  Chart.ChartSlot = 0;
+  arrangement_ = Arrangement::kOne;
 }
 
 // ---- Files
 
 std::string ChartWindow::SuggestedName() const {
-  return std::string(services_.current.Rec.Code.trimmed()) + ".cht";
+  if (!ChartFromFile) return std::string(Request.Name.Code.trimmed()) + ".cht";
+  return SavedChartFile.substr(SavedChartFile.find_last_of('\\') + 1);
 }
 
 void ChartWindow::StartSaving() {
@@ -663,11 +781,15 @@ void ChartWindow::SaveChartAs(const std::optional<std::string>& path,
     Resized();  // as it stands, with a panel that was picked
     return;
   }
-  const bool script = EndsWith(*path, ".cht");
-  const bool picture = makePicture && (EndsWith(*path, ".png") || EndsWith(*path, ".svg") ||
-                                       EndsWith(*path, ".pdf"));
+  const bool script = EndsNoCase(*path, ".cht");
+  const bool picture = makePicture && (EndsNoCase(*path, ".png") || EndsNoCase(*path, ".svg") ||
+                                       EndsNoCase(*path, ".pdf"));
   if (!script && !picture) {
     dialogs.Message("File extension must be .cht", kSaveTitle);
+    return;
+  }
+  if (ScriptOnShow().empty()) {
+    dialogs.Message(" CHART NOT SAVED ", kSaveTitle);
     return;
   }
   bool there = false;
@@ -678,13 +800,13 @@ void ChartWindow::SaveChartAs(const std::optional<std::string>& path,
     dialogs.Message("File name invalid", kSaveTitle);
     return;
   }
-  if (there && dialogs.Ask(*path + " already exists - Overwrite", kSaveTitle,
-                           Buttons::kOkCancel) != Answer::kOk) {
+  if (there && dialogs.Ask(*path + " already exists - Overwrite", kSaveTitle, Buttons::kOkCancel) !=
+                   Answer::kOk) {
     dialogs.Message(" CHART NOT SAVED ", kSaveTitle);
     return;
   }
   try {
-    files.WriteAll(*path, script ? files.ReadAll(ScriptPath()) : makePicture(*path));
+    files.WriteAll(*path, script ? files.ReadAll(ScriptOnShow()) : makePicture(*path));
   } catch (const RunTimeError&) {
     dialogs.Message(" CHART NOT SAVED ", kSaveTitle);
     return;
@@ -694,11 +816,11 @@ void ChartWindow::SaveChartAs(const std::optional<std::string>& path,
 
 void ChartWindow::ShowSaved(const std::string& path) {
   CancelChartTools();
-  if (!EndsWith(path, ".cht")) {
+  if (!EndsNoCase(path, ".cht")) {
     dialogs_.Message("File extension must be .cht", "Saved Charts");
     return;
   }
-  EndPair();
+  arrangement_ = Arrangement::kOne;
   LayOut(false);
   state().OscCode.clear();
   SavedChartFile = path;
@@ -706,13 +828,14 @@ void ChartWindow::ShowSaved(const std::string& path) {
                                  services_.settings.fonts, services_.colours, path);
   // Whatever came of it, the composed chart is gone: nothing reads its tables.
   if (!ChartFromFile) Chart.ChartDrawn = false;
+  RefreshTitle();
 }
 
 // ---- The date limit
 
 void ChartWindow::ShowDateLimit() {
   const ChartState& s = state();
-  if (!s.DateLimitOn || s.MultiOscOn != 0) {
+  if (!s.DateLimitOn || arrangement_ == Arrangement::kMulti) {
     HideFrame();
     return;
   }
@@ -752,8 +875,10 @@ bool ChartWindow::StepDateLimit(int index) {
   const int sign = index < 3 ? 1 : -1;
   const int unit = index % 3;
   CalendarDate moved;
-  if (unit == 2) moved = AddMonths(*date, sign);
-  else moved = DateOfDayNumber(DayNumber(*date) + sign * (unit == 0 ? 1 : 7));
+  if (unit == 2)
+    moved = AddMonths(*date, sign);
+  else
+    moved = DateOfDayNumber(DayNumber(*date) + sign * (unit == 0 ? 1 : 7));
   // The calendar ends where a year no longer has four digits.
   if (moved.year < 1000 || moved.year > 9999) return false;
   s.DateLimitText = FormatDisplayDate(moved);
@@ -775,7 +900,7 @@ bool ChartWindow::DropFrame(double x, double y, double width, double height) {
 void ChartWindow::StartNewChart() {
   ChartState& s = state();
   const bool superimposing = s.ChartTask == kTaskSuperimpose;
-  if (Chart.OscPanel > 3) s.MultiOscOn = 0;
+  if (arrangement_ == Arrangement::kMulti) arrangement_ = Arrangement::kOne;
   CancelChartTools();
   s.SuppressScript = false;
   EmptyDrawnLines();
@@ -785,19 +910,18 @@ void ChartWindow::StartNewChart() {
 }
 
 void ChartWindow::CancelChartTools() {
-  EraseCross();
-  cross_.reset();
+  LeaveTool();
   GridOFF();
   SetTB(kNoButton);
-  Chart.OscPanel = 0;
+  // The first of two in one frame is left to stand alone.
+  if (arrangement_ == Arrangement::kUnder) arrangement_ = Arrangement::kOne;
   FibOFF();
+  view_.AutoScroll = 0;
+  view_.Caption.clear();
   ReadyToCopy(services_.price);
   ReadyToCopy(services_.panel);
   state().ChartTask = kTaskNone;
-}
-
-void ChartWindow::ClearStatusBar() {
-  std::fill(view_.Panels.begin() + 2, view_.Panels.end(), std::string());
+  RefreshTitle();
 }
 
 void ChartWindow::GridON() {
@@ -810,91 +934,361 @@ void ChartWindow::GridOFF() { view_.PanelShown.fill(false); }
 void ChartWindow::FibOFF() {
   std::fill(view_.Panels.begin() + 1, view_.Panels.end(), std::string());
   std::fill(view_.PanelShown.begin() + 1, view_.PanelShown.end(), false);
+  view_.PanelsAlike = false;
 }
 
 void ChartWindow::ToggleGrid() {
-  if (GridOn()) {
+  const bool on = GridOn();
+  CancelChartTools();
+  if (on) return;
+  StartTool(std::make_unique<CrossHairTool>(toolView_), kButtonGrid, kTaskGrid);
+  GridON();
+}
+
+void ChartWindow::ToggleTrendline() {
+  const bool on = IsOn(kTaskTrendline);
+  CancelChartTools();
+  if (on || state().ChartStyle == Style::kPointFigure || !toolView_.Readable()) return;
+  StartTool(std::make_unique<TrendlineTool>(toolView_), kButtonTrend, kTaskTrendline);
+}
+
+void ChartWindow::ToggleFibonacci() {
+  const bool on = IsOn(kTaskFibonacciOrSplit);
+  // The first of two charts in one frame waits for its second: no tool starts then.
+  const bool waits = arrangement_ == Arrangement::kUnder;
+  CancelChartTools();
+  if (on || waits || !toolView_.Readable()) return;
+  StartTool(std::make_unique<FibonacciTool>(toolView_), kButtonFib, kTaskFibonacciOrSplit);
+  view_.PanelShown.fill(true);
+  view_.PanelsAlike = true;
+  view_.Panels[1] = "FIBONACCI";
+}
+
+void ChartWindow::StartText() {
+  CancelChartTools();
+  if (state().ChartStyle == Style::kPointFigure || !toolView_.Readable()) return;
+  StartTool(std::make_unique<TextNoteTool>(toolView_), kNoButton, kTaskNone);
+}
+
+void ChartWindow::ToggleZoom() {
+  const bool on = IsOn(kTaskZoom);
+  CancelChartTools();
+  const Style style = Request.ChartStyle;
+  if (on || !NeedsRange(style) || !toolView_.Readable()) return;
+  const auto zoom = [this](const ZoomBox& box) {
+    if (services_.openZoom) services_.openZoom(box);
+    Redraw();
+  };
+  StartTool(std::make_unique<ZoomBoxTool>(toolView_, zoom), kButtonZoom, kTaskZoom);
+}
+
+void ChartWindow::TellHowToErase() {
+  if (view_.AutoScroll > 0) CancelChartTools();
+  if (state().ChartStyle == Style::kPointFigure) return;
+  dialogs_.Message(
+      "To delete a trendline, click that trendline with your RIGHT mouse button the select DELETE",
+      kTitle);
+}
+
+void ChartWindow::RemoveAllTrendlines() {
+  constexpr std::string_view kRemoveTitle = "Remove all Trendlines";
+  if (state().ChartStyle == Style::kPointFigure || !toolView_.Readable()) return;
+  const std::string code(Request.Name.Code.trimmed());
+  if (dialogs_.Ask("Remove all trendlines for " + code, kRemoveTitle, Buttons::kYesNo) !=
+          Answer::kYes ||
+      dialogs_.Ask("WARNING - All trendlines for " + code + " will be removed. Are you sure?",
+                   kRemoveTitle, Buttons::kYesNo) != Answer::kYes)
+    return;
+  try {
+    RemoveTrendlines(services_.files, TrendlinePath(services_.settings.paths.ChartMiscPath, code));
+  } catch (const RunTimeError&) {
+    // The chart shows whether they are gone.
+  }
+  Refresh();
+}
+
+// Each hit in turn: the line shows which is meant while its menu is open.
+void ChartWindow::HitTrendlines(const ToolPoint& at) {
+  if (!toolView_.Readable() || at.pane != Pane::kPrice || !services_.popUpTrend) return;
+  Surface& price = services_.price;
+  const auto draw = [&](const TrendlineRow& row, Colour colour) {
+    if (tool_) tool_->Hide();
+    price.Line(row.x1, row.y1, row.x2, row.y2, colour);
+    if (tool_) tool_->Show();
+    toolView_.Touched(price, row.x1, row.y1, row.x2, row.y2);
+  };
+  const ChartColours& colours = services_.colours;
+  std::optional<TrendlineRow> moved;
+  for (size_t i = 0; i < rows_.size(); ++i) {
+    const TrendlineRow row = rows_[i];
+    if (!HitsLine(row, at.x, at.y)) continue;
+    draw(row, colours[kMovingGrid]);
+    const TrendChoice choice = services_.popUpTrend();
+    if (choice == TrendChoice::kDelete) {
+      draw(row, colours[colours[kTrendlines] == colours[14] ? 15 : 14]);
+      draw(row, colours[kBackground]);
+      try {
+        DeleteTrendline(
+            services_.files,
+            TrendlinePath(services_.settings.paths.ChartMiscPath, Request.Name.Code.trimmed()),
+            std::int32_t(i) + 1);
+      } catch (const RunTimeError& e) {
+        draw(row, colours[kTrendlines]);
+        dialogs_.Message(e.what(), "Trendline");
+        break;
+      }
+      continue;
+    }
+    draw(row, colours[kTrendlines]);
+    if (choice == TrendChoice::kMove) moved = row;
+  }
+  if (!moved) return;
+  CancelChartTools();
+  StartTool(std::make_unique<MoveTrendlineTool>(toolView_, *moved, at), kNoButton, kTaskNone);
+  point_ = at;
+}
+
+// ---- What the mouse has drawn
+
+void ChartWindow::Keep(const DrawnMark& mark) {
+  marks_.push_back(mark);
+  const auto append = [&](const std::string& path) {
+    ChartScript script(services_.files, path);
+    script.Open(true);
+    script.buffer() += LineOf(mark);
+    script.Close();
+  };
+  try {
+    append(scriptPath_);
+    // Texts come back from their own file.
+    if (mark.letter != 'T')
+      append(scriptPath_.substr(0, scriptPath_.find_last_of('\\') + 1) + "ChtLns.Tmp");
+  } catch (const RunTimeError& e) {
+    dialogs_.Message(e.what(), kTitle);
+  }
+}
+
+void ChartWindow::ReplayMarks(Surface& price, Surface* panel) const {
+  ChartPen upper(price, nullptr);
+  const double below = services_.price.ScaleHeight();
+  for (const DrawnMark& mark : marks_) {
+    if (mark.letter == 'T') {
+      const FontSettings& fonts = services_.settings.fonts;
+      upper.Text('T', {fonts.Font1Name, ChartCanvas::kSmallText, fonts.Font1Bold, false},
+                 {ChartCanvas::kSmallText, mark.x1, mark.y1, mark.text, mark.colour});
+    } else if (mark.letter != 'M') {
+      upper.Line(mark.letter, {mark.x1, mark.y1, mark.x2, mark.y2, mark.colour});
+    } else if (panel) {
+      ChartPen(*panel, nullptr)
+          .Line('M', {mark.x1, mark.y1 - below, mark.x2, mark.y2 - below, mark.colour});
+    }
+  }
+}
+
+// ---- The walk through all charts
+
+void ChartWindow::ToggleAutoScroll() {
+  constexpr std::string_view kInterval = "Display Interval";
+  ChartState& s = state();
+  const bool on = s.ChartTask == kTaskAutoScroll;
+  CancelChartTools();
+  if (on || !HasChart()) return;
+  SetTB(kButtonAuto);
+  s.ICFilterOn = false;
+  s.ICFilter.clear();
+  s.ChartTask = kTaskAutoScroll;
+  std::string standing(Trim(services_.ini.GetSetting("Charts", "Auto")));
+  if (standing == kUnknown || Val(standing) < 1 || Val(standing) > 20) standing = "2.5";
+  const auto answer =
+      dialogs_.Prompt(std::string("Set interval between charts (0 - 60 seconds)\n\n") +
+                          (s.ChartListNo == kFullList ? "All charts" : ""),
+                      kInterval, standing);
+  if (!answer || answer->empty()) {
     CancelChartTools();
     return;
   }
+  double seconds = RoundHalfEven(Val(*answer));
+  if (!(seconds >= 0 && seconds <= 60)) seconds = 30;
+  services_.ini.PutSetting("Charts", "Auto", Str(seconds));
+  try {
+    // The timer counts in 16 bits: 33 seconds and more are beyond it.
+    view_.AutoScroll = CInt(seconds * 1000);
+  } catch (const RunTimeError& e) {
+    CancelChartTools();
+    dialogs_.Message(e.what(), kInterval);
+    return;
+  }
+  view_.Caption = "AUTOMATIC SCROLL - TO STOP click AUTO";
+}
+
+bool ChartWindow::AutoScrollTick() { return view_.AutoScroll > 0 && NextChart(); }
+
+void ChartWindow::StartTool(std::unique_ptr<ChartTool> tool, ToolButton button, std::int16_t task) {
+  SetTB(button);
+  state().ChartTask = task;
+  tool_ = std::move(tool);
+  view_.CrossPointer = tool_->Cross();
+}
+
+void ChartWindow::LeaveTool() {
+  DropMarker();
+  point_.reset();
+  view_.CrossPointer = false;
+  if (!tool_) return;
+  const std::unique_ptr<ChartTool> tool = std::move(tool_);
+  tool->Leave();
+}
+
+// A tool that is done is left as by Escape.
+void ChartWindow::After(ToolState toolState) {
+  if (toolState == ToolState::kOn || !tool_) return;
+  const std::function<void()> afterwards = tool_->Afterwards();
   CancelChartTools();
-  SetTB(kButtonGrid);
-  state().ChartTask = kTaskGrid;
-  GridON();
-  cross_.emplace(services_.price, &services_.panel, services_.colours[kMovingGrid]);
-  cross_->Touched = [this](const Surface& surface, double x1, double y1, double x2, double y2) {
-    if (CrossTouched) CrossTouched(surface, x1, y1, x2, y2);
+  if (afterwards) afterwards();
+}
+
+void ChartWindow::MouseMove(const ToolPoint& at) {
+  if (!tool_) return;
+  DropMarker();
+  point_ = at;
+  After(tool_->Move(at));
+}
+
+void ChartWindow::MousePress(const ToolPoint& at, MouseButton button) {
+  DropMarker();
+  if (button == MouseButton::kRight && !IsOn(kTaskZoom)) return HitTrendlines(at);
+  if (tool_) After(tool_->Press(at, button));
+}
+
+void ChartWindow::MouseRelease(const ToolPoint& at, MouseButton button) {
+  DropMarker();
+  if (tool_) After(tool_->Release(at, button));
+}
+
+// ---- The point of the keys
+
+void ChartWindow::PointTo(const ToolPoint& at) {
+  DropMarker();
+  point_ = at;
+  const ToolState done = tool_->Move(at);
+  // The cross hair shows the point by itself.
+  if (done == ToolState::kOn && !GridOn() && toolView_.Readable() && at.pane == Pane::kPrice) {
+    marker_ = std::make_unique<CrossHair>(services_.price, nullptr, services_.colours[kMovingGrid]);
+    marker_->SetTouched(toolView_.Touched);
+    marker_->Move(at.x, at.y, LimitsOf(Chart, Request.ChartStyle));
+  }
+  After(done);
+}
+
+void ChartWindow::DropMarker() {
+  if (!marker_) return;
+  marker_->Erase();
+  marker_.reset();
+}
+
+void ChartWindow::MovePoint(int bars, int down) {
+  if (!tool_) ToggleGrid();
+  if (!tool_ || !toolView_.Readable()) return;
+  if (Request.ChartStyle == Style::kPointFigure)
+    return MoveRow(down == 0 ? bars : down < 0 ? 1 : -1);
+  const std::int32_t last = std::max<std::int32_t>(Chart.Bars.BarCount, 0);
+  // Where the bar is drawn: the column is read back from there without rounding.
+  const auto x = [&](std::int32_t column) {
+    return Chart.ChartLeft + double(column) * Chart.BarSpacing;
   };
-}
-
-void ChartWindow::MouseMove(double x, double y) {
-  if (cross_) MoveTo(x, y, ColumnOf(Chart, x));
-}
-
-void ChartWindow::MoveTo(double x, double y, std::int32_t column) {
-  const ChartState& s = state();
-  crossColumn_ = column;
-  // What the pointer reads are the tables of a composition, not what a saved chart shows.
-  if (ChartFromFile || !Chart.ChartDrawn) {
-    ClearStatusBar();
-    return;
+  const auto close = [&](std::int32_t column) {
+    const double y =
+        size_t(column) < Chart.CloseY.size() ? Chart.CloseY[size_t(column)] : Chart.ChartTop;
+    return std::clamp<double>(y, Chart.ChartTop, std::max(Chart.ChartTop, Chart.ChartBottom));
+  };
+  const bool begins = !point_ || (point_->pane == Pane::kPrice &&
+                                  (point_->x < Chart.ChartLeft || point_->x > Chart.ChartRight));
+  if (begins) return PointTo({x(last), close(last), Pane::kPrice});
+  ToolPoint at = *point_;
+  if (bars != 0) {
+    // Into the blank space beyond the last bar too, where lines may end.
+    const std::int32_t furthest =
+        tool_->FollowsCloses()
+            ? last
+            : std::max(last, std::int32_t((Chart.ChartRight - Chart.ChartLeft) / Chart.BarSpacing));
+    const std::int32_t column = std::clamp<std::int32_t>(
+        CLng((at.x - Chart.ChartLeft) / Chart.BarSpacing) + bars, 0, furthest);
+    at.x = x(column);
+    if (tool_->FollowsCloses() && down == 0) at.y = close(std::min(column, last));
   }
-  const CrossLimits limits =
-      LimitsOf(Chart, Request.ChartStyle, s.SplitShown, panelTop_, panelBottom_);
-  if (!cross_->Move(x, y, limits)) {
-    ClearStatusBar();
-    return;
+  at.y += down;
+  const bool panel = services_.panel.Visible() && panelFrame_.Bottom > panelFrame_.Top;
+  if (at.pane == Pane::kPrice) {
+    if (panel && down > 0 && at.y > Chart.ChartBottom && !GridOn()) {
+      at.pane = Pane::kPanel;
+      at.y = panelFrame_.Top;
+    } else {
+      at.y = std::clamp<double>(
+          at.y, Chart.ChartTop,
+          std::max(Chart.ChartTop, GridOn() ? Chart.VolBottom : Chart.ChartBottom));
+    }
+  } else if (!panel || at.y < panelFrame_.Top) {
+    at.pane = Pane::kPrice;
+    at.y = Chart.ChartBottom;
+  } else {
+    at.y = std::min<double>(at.y, panelFrame_.Bottom);
   }
-  const std::int16_t type = Request.Name.RecType;
-  if (Request.ChartStyle == 'P') {
-    view_.Panels[3] = Format(PFPixelToPrice(Chart, Boxes, y), ReadoutFormat(type));
-    return;
+  PointTo(at);
+}
+
+void ChartWindow::PointToEnd(bool last) {
+  if (!tool_) ToggleGrid();
+  point_.reset();
+  MovePoint(0);
+  if (Request.ChartStyle == Style::kPointFigure)
+    MovePoint(last ? kMostRows : -kMostRows);
+  else if (!last)
+    MovePoint(-std::max<std::int32_t>(Chart.Bars.BarCount, 0) - 1);
+}
+
+void ChartWindow::ClickPoint() {
+  if (!tool_) return;
+  if (!point_) MovePoint(0);
+  if (!tool_ || !point_) return;
+  const ToolPoint at = *point_;
+  DropMarker();
+  After(tool_->Click(at));
+}
+
+void ChartWindow::Type(char32_t character) {
+  if (tool_) After(tool_->Type(character));
+}
+
+// Boxes have no bar to go to: the keys go up and down their rows, at the last column, from the
+// row of the last close on.
+void ChartWindow::MoveRow(std::int32_t rows) {
+  const std::int32_t last = Chart.Bars.BarCount, pitch = Chart.Boxes.PFBoxPixels;
+  if (pitch < 1 || last < 0 || size_t(last) >= Chart.Bars.bars.size()) return;
+  const std::int32_t most = (Chart.ChartBottom - Chart.ChartTop) / pitch;
+  ToolPoint at{double(Chart.LastBarX), 0, Pane::kPrice};
+  std::int32_t row = 0;
+  if (point_) {
+    at.x = point_->x;
+    row = std::int32_t((Chart.ChartBottom - point_->y) / pitch) + rows;
+  } else {
+    const double close = double(Chart.Bars[size_t(last)].Close);
+    row = (Chart.ChartBottom - PFPriceToPixel(Chart, Chart.Boxes, close)) / pitch;
   }
-  if (s.Superimposed || s.SplitShown) return;
-  if (const auto texts = BarReadout(Chart, type, column))
-    std::copy(texts->begin(), texts->end(), view_.Panels.begin() + 2);
+  at.y = Chart.ChartBottom - std::clamp(row, 0, most) * pitch;
+  PointTo(at);
 }
 
-void ChartWindow::MouseClick() {
-  if (GridOn()) CancelChartTools();
-}
-
-void ChartWindow::MoveCross(int bars) {
-  const bool begins = !cross_ || !cross_->Drawn();
-  if (!cross_) ToggleGrid();
-  CrossToColumn(begins ? Chart.Bars.BarCount : crossColumn_ + bars);
-}
-
-void ChartWindow::CrossToEnd(bool last) {
-  if (!cross_) ToggleGrid();
-  CrossToColumn(last ? Chart.Bars.BarCount : 0);
-}
-
-void ChartWindow::CrossToColumn(std::int32_t column) {
-  column = std::clamp<std::int32_t>(column, 0, std::max<std::int32_t>(Chart.Bars.BarCount, 0));
-  const auto place = size_t(column);
-  double y = Chart.ChartTop;
-  if (place < Chart.CloseY.size()) y = Chart.CloseY[place];
-  y = std::clamp<double>(y, Chart.ChartTop, std::max(Chart.ChartTop, Chart.ChartBottom));
-  MoveTo(XOfColumn(Chart, column), y, column);
-}
-
-void ChartWindow::WithoutCross(const std::function<void()>& work) {
-  const bool drawn = cross_ && cross_->Drawn();
-  const double x = drawn ? cross_->GridX() : 0, y = drawn ? cross_->GridY() : 0;
-  if (drawn) cross_->Erase();
+void ChartWindow::WithoutTool(const std::function<void()>& work) {
+  if (marker_) marker_->Flip();
+  if (tool_) tool_->Hide();
   work();
-  if (drawn)
-    cross_->Move(x, y,
-                 LimitsOf(Chart, Request.ChartStyle, state().SplitShown, panelTop_, panelBottom_));
+  if (tool_) tool_->Show();
+  if (marker_) marker_->Flip();
 }
 
-void ChartWindow::EraseCross() {
-  if (cross_) cross_->Erase();
-}
-
-void ChartWindow::ForgetCross() {
-  if (cross_) cross_->Forget();
+void ChartWindow::ForgetTool() {
+  if (marker_) marker_->Forget();
+  if (tool_) tool_->Forget();
 }
 
 }  // namespace kora

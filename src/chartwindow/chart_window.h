@@ -3,6 +3,7 @@
 #include <array>
 #include <cstdint>
 #include <functional>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -10,13 +11,21 @@
 #include "chart/chart_state.h"
 #include "chart/composer.h"
 #include "chart/composition.h"
-#include "chartwindow/read_out.h"
 #include "chartwindow/told_once.h"
+#include "chartwindow/tools/arrangement.h"
+#include "chartwindow/tools/chart_tool.h"
+#include "chartwindow/tools/cross_hair.h"
+#include "chartwindow/tools/read_out.h"
+#include "chartwindow/tools/saved_marks.h"
+#include "chartwindow/tools/zoom_box.h"
 #include "indicators/osc_panel.h"
 #include "platform/settings_file.h"
 #include "store/name_file.h"
 
 namespace kora {
+
+// What the menu of a trendline offers.
+enum class TrendChoice { kNothing, kMove, kDelete };
 
 // What the chart window works with. Nothing is owned.
 struct ChartWindowServices {
@@ -38,6 +47,13 @@ struct ChartWindowServices {
   std::function<void()> openOscFrm = {};
   // The dialog that chooses the second chart of a pair; it ends with NextChart.
   std::function<void()> openChart2 = {};
+  // Asks for the box value of a point-and-figure chart, proposing one; the answer, or the
+  // proposal. Empty takes the proposal.
+  std::function<float(float)> askBoxValue = {};
+  // The pop-up menu of a trendline, at the pointer.
+  std::function<TrendChoice()> popUpTrend = {};
+  // Shows the part of the chart within the box, until it is closed.
+  std::function<void(const ZoomBox&)> openZoom = {};
   // The unit of a security's volumes; none while it is empty.
   std::function<std::string(const NameRec&)> VolumeUnitText = {};
 };
@@ -65,10 +81,27 @@ struct FramePlace {
 
 // Buttons of the tool bar, by their place.
 enum ToolButton : int {
-  kNoButton = 0, kButtonNew = 1, kButtonAuto, kButtonRefresh, kButtonBack, kButtonForward,
-  kButtonBar, kButtonCandle, kButtonLine, kButtonPF, kButtonDaily, kButtonWeekly, kButtonMonthly,
-  kButtonGrid, kButtonTrend, kButtonErase, kButtonMulti1, kButtonMulti2, kButtonFib,
-  kButtonSpaces, kButtonZoom,
+  kNoButton = 0,
+  kButtonNew = 1,
+  kButtonAuto,
+  kButtonRefresh,
+  kButtonBack,
+  kButtonForward,
+  kButtonBar,
+  kButtonCandle,
+  kButtonLine,
+  kButtonPF,
+  kButtonDaily,
+  kButtonWeekly,
+  kButtonMonthly,
+  kButtonGrid,
+  kButtonTrend,
+  kButtonErase,
+  kButtonMulti1,
+  kButtonMulti2,
+  kButtonFib,
+  kButtonSpaces,
+  kButtonZoom,
 };
 inline constexpr int kToolButtons = kButtonZoom;
 struct ToolButtonText {
@@ -81,22 +114,29 @@ const ToolButtonText& ToolButtonOf(int button);
 // What the form shows beside the pictures.
 struct ChartWindowView {
   static constexpr size_t kPanels = 8;
-  int TB = kNoButton;                     // the button that is pressed
-  std::array<std::string, kPanels> Panels;  // StatusBar1; Panels[0] is panel 1
+  int TB = kNoButton;   // the button that is pressed
+  StatusPanels Panels;  // StatusBar1; Panels[0] is panel 1
   std::array<bool, kPanels> PanelShown{};
-  bool FrameShown = false;                // Frame1 with the date steps, enabled when shown
-  std::optional<FramePlace> Frame;        // nothing: where the form puts it
-  bool LegendShown = false;               // Picture4
+  bool FrameShown = false;          // Frame1 with the date steps, enabled when shown
+  std::optional<FramePlace> Frame;  // nothing: where the form puts it
+  bool LegendShown = false;         // Picture4
+  bool PanelsAlike = false;         // the last panel is as wide as the others
+  bool CrossPointer = false;        // over the pictures
+  std::string Caption;              // Label1, hidden while empty
+  int AutoScroll = 0;               // milliseconds between charts while they walk by; 0 off
+  // The caption of the window: the data folder and, of a chart that stands, code, style and period.
   std::string Title;
 };
 
-// The rules of the chart window: which security comes next, when it is composed, and what the
+// What the chart window does without its form: which security comes next, when it is composed, and what the
 // tools do. The form shows the surfaces and the view, and passes on what the user does.
 //
 // Each call that composes returns false when no chart was drawn; the reason was told then.
 class ChartWindow {
  public:
   explicit ChartWindow(const ChartWindowServices& services);
+  ChartWindow(const ChartWindow&) = delete;
+  ChartWindow& operator=(const ChartWindow&) = delete;
 
   const ChartWindowView& view() const { return view_; }
   ChartState& state() const { return services_.state; }
@@ -104,6 +144,7 @@ class ChartWindow {
   // Forms that come or go after the window.
   void SetOscFrm(std::function<void()> open) { services_.openOscFrm = std::move(open); }
   void SetChart2(std::function<void()> open) { services_.openChart2 = std::move(open); }
+  void SetAskBoxValue(std::function<float(float)> ask) { services_.askBoxValue = std::move(ask); }
 
   // The window was opened: no chart yet. In a run that has not met chart selection, charts are
   // drawn as the settings have them.
@@ -115,12 +156,15 @@ class ChartWindow {
 
   // ---- Which chart
 
-  // Moves on to the next chart with wrap and draws it. ChartIndex is 0 when there is none.
+  // Draws the chart at a place of the list; beyond the last it is the first. ChartIndex is its
+  // place then, and 0 when there is none.
+  bool ShowAt(int index);
+  // Moves on to the next chart with wrap and draws it.
   bool NextChart();
   // One chart forward or backward by ChartDirection, with wrap; under an industry filter the
   // next one of that class.
   bool StepChart();
-  // The current chart once more: one back, then the next.
+  // The current chart once more.
   bool Redraw();
   // The same with every tool left: the tool bar's "ref".
   bool Refresh();
@@ -130,19 +174,25 @@ class ChartWindow {
   bool Resized();
   // Composes the security in hand with its oscillator.
   bool DrawChart();
+  // What the pictures are called to those who can't see them: code, style, period, last date and
+  // close of the chart, and the oscillator below it; "Chart" and "Oscillator" where there is none.
+  std::string ChartName() const;
+  std::string PanelName() const;
   // True when a chart was asked for and stands, or stood until it failed.
   bool HasChart() const { return services_.state.ChartIndex != 0; }
 
   // ---- How it is drawn. Each leaves the tools and draws again.
 
-  bool SetStyle(char style);
-  bool SetPeriod(std::string_view period);
+  bool SetStyle(Style style);
+  bool SetPeriod(Period period);
   bool ToggleGridLines();
   bool ToggleReversals();
   bool ToggleOutsideDays();
   bool ToggleMMA();
   // Moves on to the next chart.
   bool TogglePFAuto();
+  // A swing chart in place of the bars, at least 3 apart, and back to the bars as they were.
+  bool ToggleSwing();
   // A dialog changed what the chart shows: the stop loss.
   bool Recompose();
 
@@ -150,6 +200,8 @@ class ChartWindow {
 
   // A menu entry's code: "DM", "COP", ... "PARA", "PARAV".
   void PickOscillator(std::string_view code, bool slow = false);
+  // Whether an oscillator of the menu stays for the charts that follow, from the one on show on.
+  void ToggleKeepOscillator();
   // Checks the periods of OscCode and draws it. False when nothing was drawn.
   bool ShowOscillator();
 
@@ -159,6 +211,7 @@ class ChartWindow {
   void StartSplitScreen();
   // The second chart was not chosen.
   void DropSecondChart();
+  Arrangement arrangement() const { return arrangement_; }
 
   // ---- Files
 
@@ -169,7 +222,9 @@ class ChartWindow {
                    const std::function<std::string(const std::string&)>& makePicture = {});
   // Trimmed code + ".cht".
   std::string SuggestedName() const;
-  // The script of the chart on show: TCht.Tmp, or the saved chart's file.
+  // The script of the chart on show: the TCht.Tmp that it was composed with, or the saved
+  // chart's file. Empty while no chart stands that was drawn whole: there is nothing to save or
+  // print then.
   std::string ScriptOnShow() const;
   // Before the forms of page set-up and printing: tools left, the script kept as it is.
   void StartPrinting(bool print);
@@ -193,33 +248,53 @@ class ChartWindow {
   void CancelChartTools();
   void SetTB(int button) { view_.TB = button; }
   void ToggleGrid();
-  void MouseMove(double x, double y);
-  void MouseClick();
-  // The cross hair some bars to the right or left; it begins at the last bar.
-  void MoveCross(int bars);
-  void CrossToEnd(bool last);
-  // Takes the cross hair away while `work` reads the pictures.
-  void WithoutCross(const std::function<void()>& work);
-  // Lines of the cross hair, as they are drawn and taken away.
-  std::function<void(const Surface&, double x1, double y1, double x2, double y2)> CrossTouched;
+  // These are for composed charts, the first and the third not for point and figure.
+  void ToggleTrendline();
+  void ToggleFibonacci();
+  void StartText();
+  // Bar and candle charts alone.
+  void ToggleZoom();
+  // What the button to remove a trendline says.
+  void TellHowToErase();
+  // Asks twice, then removes the file of this security and draws it again.
+  void RemoveAllTrendlines();
+  // All charts of the list one after another; asks for the interval. Again, and it stops.
+  void ToggleAutoScroll();
+  // The next chart of the walk.
+  bool AutoScrollTick();
+  // The mouse over a picture; without a tool nothing comes of it.
+  void MouseMove(const ToolPoint& at);
+  void MousePress(const ToolPoint& at, MouseButton button);
+  void MouseRelease(const ToolPoint& at, MouseButton button);
+  // The keys have a point of their own, which goes on from where the mouse left it, or begins at
+  // the last bar: so many bars to the right and units down, to one end, a click there, a character
+  // typed. Without a tool the cross hair comes.
+  void MovePoint(int bars, int down = 0);
+  void PointToEnd(bool last);
+  void ClickPoint();
+  void Type(char32_t character);
+  bool TakesText() const { return tool_ && tool_->TakesText(); }
+  // Takes away what the tool has drawn while `work` reads the pictures.
+  void WithoutTool(const std::function<void()>& work);
+  // What tools draw and take away.
+  TouchedFn Touched;
   // The surfaces are blank: there is nothing to take away.
-  void ForgetCross();
-  bool GridOn() const { return cross_.has_value(); }
+  void ForgetTool();
+  bool ToolOn() const { return tool_ != nullptr; }
+  bool GridOn() const { return IsOn(kTaskGrid); }
+  bool IsOn(std::int16_t task) const { return tool_ && state().ChartTask == task; }
 
-  bool Loading = true;        // no handler composes while it is true
-  bool AnalPageMode = false;  // the multi-oscillator view is open
+  bool Loading = true;         // no handler composes while it is true
+  bool AnalPageMode = false;   // the multi-oscillator view is open
   bool ChartFromFile = false;  // a saved chart is on show
   std::string SavedChartFile;
-  PFBoxes Boxes;              // of a point-and-figure chart
 
   ChartRequest Request;  // of the last composition
   Composition Chart;
 
  private:
-  void EndPair();
-  std::string ScriptPath() const;
-  bool Move(int step, bool filtered);
-  bool FindRecord(int step, bool filtered);
+  bool GoTo(int index, bool filtered);
+  bool FindRecord(int index, bool filtered);
   bool FindNextChtIC(const std::vector<NameRec>& names);
   void EmptyDrawnLines();
   void ShowDateLimit();
@@ -227,34 +302,52 @@ class ChartWindow {
   void TakeChosenLimit();
   void LayOut(bool twoPanes);
   bool Compose();
-  bool Compose(const ChartRequest& request);
+  bool Compose(const ChartRequest& request, ChartPlace place);
   bool DrawAll();
   bool RedrawPair();
   ChartServices Services(Surface& price, Surface* panel, ChartScript* script);
   OscHost Host(std::string_view code, Composition& chart, const ChartRequest& request,
                Surface& price, Surface& panel, ChartScript* script);
   void ShowPanel(std::string_view code);
-  bool PeriodsValid() const;
+  void TellDailyOnly(std::string_view code);
+  void KeepPicked();
   bool CompareFileThere();
   void ClearStatusBar();
   void GridON();
   void GridOFF();
   void FibOFF();
-  void MoveTo(double x, double y, std::int32_t column);
-  void EraseCross();
-  void CrossToColumn(std::int32_t column);
+  void StartTool(std::unique_ptr<ChartTool> tool, ToolButton button, std::int16_t task);
+  void LeaveTool();
+  void After(ToolState state);
+  void PointTo(const ToolPoint& at);
+  void MoveRow(std::int32_t rows);
+  void DropMarker();
+  void HitTrendlines(const ToolPoint& at);
+  void Keep(const DrawnMark& mark);
+  void ReplayMarks(Surface& price, Surface* panel) const;
+  std::function<void(const ChartCanvas&)> MarksOverlay();
 
   ChartWindowServices services_;
   ToldOnce dialogs_;  // through which the window says everything
   ChartWindowView view_;
   std::optional<ChartScript> script_;
-  ChartRequest first_;     // of the first chart of a pair
-  std::string panelCode_;  // the oscillator that was drawn last, empty none
-  bool panelPicked_ = false;  // from the menu: it is not part of the next chart
-  std::int16_t panelTop_ = 0, panelBottom_ = 0;
-  std::optional<CrossHair> cross_;
-  std::int32_t crossColumn_ = 0;
-  bool framePending_ = true;  // the frame's place was not read yet
+  ChartRequest first_;             // of the first chart of a pair
+  std::string panelCode_;          // the oscillator that was drawn last, empty none
+  bool boxKept_ = false;           // the chart to come is the one on show: its box value stands
+  std::int16_t SavedSpacing_ = 2;  // of the bars, while a swing is on
+  bool panelPicked_ = false;       // from the menu: it is not part of the next chart, unless
+  bool panelKept_ = false;         // it is kept
+  PanelFrame panelFrame_;
+  Arrangement arrangement_ = Arrangement::kOne;
+  std::string scriptPath_;  // of the composition on show
+  ToolView toolView_;
+  std::unique_ptr<ChartTool> tool_;
+  std::optional<ToolPoint> point_;     // where mouse or keys have left it
+  std::unique_ptr<CrossHair> marker_;  // shows the point of the keys, for tools that do not
+  SavedMarks savedMarks_;              // as they were when the chart was composed
+  std::vector<TrendlineRow> rows_;     // where its lines stand
+  std::vector<DrawnMark> marks_;       // drawn since
+  bool framePending_ = true;           // the frame's place was not read yet
 };
 
 }  // namespace kora

@@ -39,9 +39,9 @@ ChartDefaults DefaultsFromSettings(const Settings& settings) {
   const OscSettings& osc = settings.osc;
   const ChartSettings& charts = settings.charts;
   ChartDefaults form;
-  for (size_t i = 0; i < form.periods.size(); ++i) {
-    const PeriodPair& pair = osc.*OscKeys()[i].value;
-    form.periods[i] = {Text(pair.daily), Text(pair.twin)};
+  for (const OscKey& key : OscKeys()) {
+    const PeriodPair pair = osc[key];
+    form.periods.push_back({Text(pair.daily), Text(pair.twin)});
   }
   form.CompFile = osc.CompFile;
   form.BCCalTp = osc.BCCalTp;
@@ -66,9 +66,9 @@ DefaultsSaved SaveChartDefaults(SettingsFile& ini, const Files& files, Dialogs& 
   OscSettings& osc = settings.osc;
   ChartSettings& charts = settings.charts;
   KeyWriter keys(ini, "OscDef");
-  for (size_t i = 0; i < typed.periods.size(); ++i) {
+  for (size_t i = 0; i < OscKeys().size(); ++i) {
     const OscKey& key = OscKeys()[i];
-    PeriodPair& live = osc.*key.value;
+    PeriodPair& live = osc[key];
     keys.Put(key.daily, typed.periods[i].daily, live.daily);
     keys.Put(key.twin, typed.periods[i].twin, live.twin);
   }

@@ -1,13 +1,14 @@
 #pragma once
 
-#include <array>
 #include <cstdint>
 #include <string>
+#include <vector>
 
 #include "base/files.h"
+#include "indicators/oscillators.h"
+#include "looks/colours.h"
 #include "platform/dialogs.h"
 #include "settings/settings.h"
-#include "store/colours.h"
 
 // What the form of chart defaults keeps.
 
@@ -18,7 +19,7 @@ struct ChartDefaults {
   struct Twin {
     std::string daily, twin;  // as typed
   };
-  std::array<Twin, 22> periods;  // in the order of OscKeys()
+  std::vector<Twin> periods;  // in the order of OscKeys()
   std::string CompFile;
   bool BCCalTp = false, LCalTp = false, VCalTp = false;  // logarithmic
   bool CutVols = false;
@@ -28,8 +29,8 @@ struct ChartDefaults {
   bool RFAve = false;
   Twin average1, average2;  // Av1D and Av1W, Av2D and Av2W
   bool AvOne = false, AvTwo = false;
-  bool AvCalc = false;    // exponential
-  bool ScMethod = true;   // automatic scales
+  bool AvCalc = false;   // exponential
+  bool ScMethod = true;  // automatic scales
 };
 
 ChartDefaults DefaultsFromSettings(const Settings& settings);

@@ -21,8 +21,7 @@ std::string CompareNameOf(const Files& files, std::string_view path) {
 
 }  // namespace
 
-std::string ValidateCompareFile(const Files& files, Dialogs& dialogs,
-                                const std::string& compFile) {
+std::string ValidateCompareFile(const Files& files, Dialogs& dialogs, const std::string& compFile) {
   std::string name = CompareNameOf(files, Trim(compFile));
   if (name.empty())
     dialogs.Message(

@@ -3,7 +3,6 @@
 #include <algorithm>
 
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 #include "indicators/value_frame.h"
 
 namespace kora {
@@ -19,8 +18,8 @@ CoppockSeries Coppock(const ChartBars& bars, int period) {
     const double longAgo = At(bars, i - period).Close;
     const double lessLongAgo = At(bars, i - (period - 1)).Close;
     if (i > period && close != 0 && longAgo != 0 && lessLongAgo != 0) {
-      const double raw = (close - longAgo) / longAgo * 100.0 +
-                         (close - lessLongAgo) / lessLongAgo * 100.0;
+      const double raw =
+          (close - longAgo) / longAgo * 100.0 + (close - lessLongAgo) / lessLongAgo * 100.0;
       state = CInt(raw * k + (1 - k) * state);
       value = state;
     }
@@ -32,7 +31,7 @@ CoppockSeries Coppock(const ChartBars& bars, int period) {
 
 void ShowCoppock(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&host] {
-    const std::int16_t P = host.Period(&OscSettings::CopD);
+    const std::int16_t P = host.Period(kCopD);
     const ChartBars& bars = host.chart.Bars;
     if (P < 1 || bars.BarCount <= 1) return;
     OscPanel panel(host);
@@ -48,8 +47,7 @@ void ShowCoppock(OscHost& host) {
     OscTrace line(panel.pen, 'H');
     for (int i = 1; i <= bars.BarCount; ++i) {
       const std::int16_t value = At(series.smoothed, i);
-      if (value != 0)
-        line.To(panel.BarX(i), frame.Y(value), panel.colour(kOscLine1), i > P + 2);
+      if (value != 0) line.To(panel.BarX(i), frame.Y(value), panel.colour(kOscLine1), i > P + 2);
     }
   });
 }

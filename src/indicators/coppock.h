@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <vector>
 
+#include "indicators/osc_panel.h"
 #include "store/chart_bars.h"
 
 namespace kora {
@@ -23,5 +24,9 @@ struct CoppockSeries {
 };
 // A period of at least 1. Error 6 where the state leaves 16 bits.
 CoppockSeries Coppock(const ChartBars& bars, int period);
+
+inline constexpr OscKey kCopD{"CopD", "CopW", 14, 14, "Coppock"};
+
+void ShowCoppock(OscHost& host);
 
 }  // namespace kora

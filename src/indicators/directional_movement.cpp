@@ -4,7 +4,6 @@
 #include <cmath>
 
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 
 namespace kora {
 namespace {
@@ -82,8 +81,8 @@ void ShowDirectionalMovement(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&host] {
     // This panel alone has a period of its own where there is none in the settings.
     const auto orTen = [](std::int16_t period) { return period == 0 ? std::int16_t{10} : period; };
-    const std::int16_t N = orTen(host.Period(&OscSettings::DMA));
-    const std::int16_t M = orTen(host.Period(&OscSettings::DMXA));
+    const std::int16_t N = orTen(host.Period(kDMA));
+    const std::int16_t M = orTen(host.Period(kDMXA));
     OscPanel panel(host);
     panel.Frame();
 

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <vector>
 
+#include "indicators/osc_panel.h"
 #include "store/chart_bars.h"
 
 namespace kora {
@@ -32,5 +33,10 @@ struct DmSeries {
 };
 // Error 6 where a value leaves 16 bits.
 DmSeries DirectionalMovement(const ChartBars& bars, int N, int M);
+
+inline constexpr OscKey kDMA{"DMA", "DMW", 14, 14, "Directional Move DX"};
+inline constexpr OscKey kDMXA{"DMXA", "DMXW", 14, 14, "Directional Move ADX"};
+
+void ShowDirectionalMovement(OscHost& host);
 
 }  // namespace kora

@@ -4,7 +4,6 @@
 
 #include "indicators/ema_column.h"
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 
 namespace kora {
 
@@ -34,7 +33,7 @@ ElderRaySeries ElderRay(const ChartBars& bars, int period, std::int16_t recType)
 
 void ShowElderRay(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&host] {
-    const std::int16_t P = host.Period(&OscSettings::ERA);
+    const std::int16_t P = host.Period(kERA);
     if (P < 1) return;
     OscPanel panel(host);
     panel.Frame();
@@ -52,7 +51,7 @@ void ShowElderRay(OscHost& host) {
     const std::int16_t bearY = CInt(height * 0.75);
     panel.Guide(bullY, "0.0");
     panel.Guide(bearY, "0.0");
-    if (!host.SecondPass()) {
+    if (!host.SecondPass) {
       panel.Text(panel.PanelLeft + 1, bullY - 6, "Bull");
       panel.Text(panel.PanelLeft + 1, bearY - 6, "Bear");
     }

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <vector>
 
+#include "indicators/osc_panel.h"
 #include "store/chart_bars.h"
 
 namespace kora {
@@ -21,5 +22,9 @@ struct ElderRaySeries {
 };
 // A period of at least 1. Error 6 where a value leaves 32-bit floats.
 ElderRaySeries ElderRay(const ChartBars& bars, int period, std::int16_t recType);
+
+inline constexpr OscKey kERA{"ERA", "ERW", 14, 14, "Elder Ray  period"};
+
+void ShowElderRay(OscHost& host);
 
 }  // namespace kora

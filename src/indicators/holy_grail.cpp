@@ -4,7 +4,6 @@
 
 #include "base/runtime_error.h"
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 #include "indicators/value_frame.h"
 
 namespace kora {
@@ -53,7 +52,7 @@ HolyGrailSeries HolyGrail(const ChartBars& bars, int period) {
 
 void ShowHolyGrail(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&host] {
-    const std::int16_t P = host.Period(&OscSettings::HolyD);
+    const std::int16_t P = host.Period(kHolyD);
     const ChartBars& bars = host.chart.Bars;
     if (P < 1 || bars.BarCount <= P) return;
     OscPanel panel(host);

@@ -2,6 +2,7 @@
 
 #include <vector>
 
+#include "indicators/osc_panel.h"
 #include "store/chart_bars.h"
 
 namespace kora {
@@ -24,5 +25,9 @@ struct HolyGrailSeries {
 };
 // A period of at least 1.
 HolyGrailSeries HolyGrail(const ChartBars& bars, int period);
+
+inline constexpr OscKey kHolyD{"HolyD", "HolyW", 50, 50, "Jones Holy Grail"};
+
+void ShowHolyGrail(OscHost& host);
 
 }  // namespace kora

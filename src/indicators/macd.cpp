@@ -4,22 +4,16 @@
 
 #include "indicators/ema_column.h"
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 
 namespace kora {
 namespace {
-
-// Only the three periods of a chart have settings; any other letter has none.
-std::int16_t MacdPeriod(const OscHost& host, PeriodPair OscSettings::*pair) {
-  const std::string& period = host.request.ChartPeriod;
-  return period == "A" || period == "W" || period == "M" ? host.Period(pair) : std::int16_t{0};
-}
 
 // The two averages on the price picture. One that starts from a y of 0 has no line yet.
 class PriceAverages {
  public:
   PriceAverages(OscHost& host, const MacdSeries& series)
-      : host_(host), series_(series),
+      : host_(host),
+        series_(series),
         pen_(host.price, host.request.SuppressScript ? nullptr : host.script) {}
 
   void Bar(int i) {
@@ -69,9 +63,9 @@ MacdSeries Macd(const ChartBars& bars, int n1, int n2, int n3) {
 
 void ShowMACD(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&host] {
-    const std::int16_t n1 = MacdPeriod(host, &OscSettings::Md1);
-    const std::int16_t n2 = MacdPeriod(host, &OscSettings::Md2);
-    const std::int16_t n3 = MacdPeriod(host, &OscSettings::Md3);
+    const std::int16_t n1 = host.Period(kMd1);
+    const std::int16_t n2 = host.Period(kMd2);
+    const std::int16_t n3 = host.Period(kMd3);
     const ChartBars& bars = host.chart.Bars;
     if (n1 < 1 || n2 < 1 || n3 < 1 || bars.BarCount < 1) return;
     OscPanel panel(host);
@@ -79,8 +73,8 @@ void ShowMACD(OscHost& host) {
 
     const MacdSeries series = Macd(bars, n1, n2, n3);
     const double base = panel.PanelBottom - 10;
-    const double scale = ScaleOf(double(series.highest) - series.lowest,
-                                 base - (panel.PanelTop + 10));
+    const double scale =
+        ScaleOf(double(series.highest) - series.lowest, base - (panel.PanelTop + 10));
     if (scale == 0) return;
     const auto yOf = [&](double v) { return base - (v - series.lowest) / scale; };
 
@@ -88,8 +82,8 @@ void ShowMACD(OscHost& host) {
     // The middle of the frame's height, counted from the top of the panel and not of the frame.
     const std::int16_t zeroY = CInt((panel.PanelBottom - panel.PanelTop) / 2.0);
     panel.Guide(zeroY, "0.0");
-    for (const double v : {double(series.highest), series.highest * 0.5, double(series.lowest),
-                           series.lowest * 0.5})
+    for (const double v :
+         {double(series.highest), series.highest * 0.5, double(series.lowest), series.lowest * 0.5})
       panel.Guide(yOf(v), Format(v, "####.00"));
 
     PriceAverages averages(host, series);

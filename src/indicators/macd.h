@@ -2,6 +2,7 @@
 
 #include <vector>
 
+#include "indicators/osc_panel.h"
 #include "store/chart_bars.h"
 
 namespace kora {
@@ -21,5 +22,11 @@ struct MacdSeries {
 };
 // Periods of at least 1. Error 6 where a value leaves 32-bit floats.
 MacdSeries Macd(const ChartBars& bars, int n1, int n2, int n3);
+
+inline constexpr OscKey kMd1{"Md1", "Md1W", 12, 12, "MACD EMA 1"};
+inline constexpr OscKey kMd2{"Md2", "Md2W", 26, 26, "MACD EMA 2"};
+inline constexpr OscKey kMd3{"Md3", "Md3W", 9, 9, "MACD EMA 3 signal"};
+
+void ShowMACD(OscHost& host);
 
 }  // namespace kora

@@ -3,7 +3,6 @@
 #include <algorithm>
 
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 
 namespace kora {
 namespace {
@@ -13,11 +12,10 @@ constexpr std::int32_t kStart = 100000;
 // Lines at the quarters of the height with the totals that stand there, from the lowest at the
 // bottom up. The line at the top stops short of its text.
 void DrawScale(OscPanel& panel, const ObvSeries& series, double top, double unit) {
-  if (panel.host.SecondPass()) return;
+  if (panel.host.SecondPass) return;
   for (int level = 100; level >= 0; level -= 25) {
     const double y = top + unit * level;
-    const double total =
-        series.highest - (double(series.highest) - series.lowest) * level / 100.0;
+    const double total = series.highest - (double(series.highest) - series.lowest) * level / 100.0;
     const std::string label = Format(total / 1000.0, "##.#") + "k";
     const double x = panel.PanelLeft + (level == 0 ? panel.TextWidth(label) + 10 : 0);
     panel.Line(level % 50 == 0 ? 'L' : 'E', x, y, panel.PanelRight, y, kBorder);
@@ -27,7 +25,7 @@ void DrawScale(OscPanel& panel, const ObvSeries& series, double top, double unit
 
 void DrawNoVolume(OscPanel& panel) {
   const double x = panel.PanelLeft + 2, y = panel.PanelTop + 30;
-  panel.TextPair(x, panel.host.SecondPass() ? x + 250 : x, y, "No Volume Data");
+  panel.TextPair(x, panel.host.SecondPass ? x + 250 : x, y, "No Volume Data");
 }
 
 }  // namespace
@@ -40,8 +38,10 @@ ObvSeries OnBalanceVolume(const ChartBars& bars, int& bar) {
     const ChartBar& now = At(bars, bar);
     const ChartBar& before = At(bars, bar - 1);
     if (now.Close == 0 || before.Close == 0) continue;
-    if (now.Close > before.Close) out.total = CLng(double(out.total) + now.Volume);
-    else if (now.Close < before.Close) out.total = CLng(double(out.total) - now.Volume);
+    if (now.Close > before.Close)
+      out.total = CLng(double(out.total) + now.Volume);
+    else if (now.Close < before.Close)
+      out.total = CLng(double(out.total) - now.Volume);
     out.highest = std::max(out.highest, out.total);
     out.lowest = std::min(out.lowest, out.total);
     At(out.totals, bar) = out.total;

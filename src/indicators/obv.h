@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <vector>
 
+#include "indicators/osc_panel.h"
 #include "store/chart_bars.h"
 
 namespace kora {
@@ -20,5 +21,7 @@ struct ObvSeries {
 };
 // `bar` is the bar in hand, for the message of a failure. Error 6 where the total leaves 32 bits.
 ObvSeries OnBalanceVolume(const ChartBars& bars, int& bar);
+
+void ShowOBV(OscHost& host);
 
 }  // namespace kora

@@ -60,13 +60,30 @@ void ResumeScript(OscHost& host) {
   host.script->Open(true);
 }
 
-OscPanel::OscPanel(OscHost& hostIn, double units)
+RmxPlace OscHost::PlaceRmx(double units) const {
+  if (InChartWindow()) return {CInt(0.02 * units), CInt(0.98 * units), 20, int(Fix(units / 2))};
+  units = panel.ScaleHeight();
+  constexpr double kTextRoom = 28;
+  const std::int16_t top = CInt(0.02 * units), bottom = CInt(0.98 * units - kTextRoom);
+  return {top, bottom, 0, (top + bottom) / 2};
+}
+
+// The units of a picture in which the frame of a panel of `units`, the second line of text that
+// begins 14 below it, and that line's own height in chart units stand.
+static double UnitsWithTexts(double units, double height) {
+  constexpr double kSecondLine = 14, kLineHeight = 14;
+  const double place = 0.98 * units + kSecondLine;
+  return height > kLineHeight ? place * height / (height - kLineHeight) : units;
+}
+
+OscPanel::OscPanel(OscHost& hostIn, double units, bool textsBelow)
     : host(hostIn), pen(hostIn.panel, hostIn.request.SuppressScript ? nullptr : hostIn.script) {
   Surface& panel = host.panel;
   ResumeScript(host);
-  if (!host.SecondPass()) {
+  if (!host.SecondPass) {
     if (units > 0 && host.InChartWindow())
-      panel.SetScale(0, 0, host.price.ScaleWidth(), units);
+      panel.SetScale(0, 0, host.price.ScaleWidth(),
+                     textsBelow ? UnitsWithTexts(units, panel.Height()) : units);
     panel.SetFont(Font());
     panel.SetBackColour(colour(kBackground));
     panel.SetDrawMode(DrawMode::kCopy);
@@ -74,7 +91,7 @@ OscPanel::OscPanel(OscHost& hostIn, double units)
     panel.SetDrawWidth(1);
     panel.Cls();
   }
-  const double height = panel.ScaleHeight();
+  const double height = textsBelow && host.InChartWindow() ? units : panel.ScaleHeight();
   if (units > 0) {
     PanelTop = CInt(Fix(2 * height / 100));
     PanelBottom = CInt(Fix(98 * height / 100));
@@ -100,20 +117,20 @@ double OscPanel::TextWidth(std::string_view text) {
 }
 
 void OscPanel::Frame() {
-  if (host.SecondPass()) return;
+  if (host.SecondPass) return;
   pen.Box('B', {double(PanelLeft), double(PanelTop), double(PanelRight), double(PanelBottom),
                 colour(kBorder)});
 }
 
 void OscPanel::Title(std::string_view text) {
   const double y = PanelTop + 2.0;
-  const double screenX = PanelLeft + (host.SecondPass() ? 290.0 : 2.0);
-  const double scriptX = PanelLeft + (host.SecondPass() ? 250.0 : 2.0);
+  const double screenX = PanelLeft + (host.SecondPass ? 290.0 : 2.0);
+  const double scriptX = PanelLeft + (host.SecondPass ? 250.0 : 2.0);
   TextPair(screenX, scriptX, y, text);
 }
 
 void OscPanel::Guide(double y, std::string_view label, char letter) {
-  if (host.SecondPass()) return;
+  if (host.SecondPass) return;
   Line(letter, PanelLeft, y, PanelRight, y, kBorder);
   Label(y, label);
 }
@@ -152,8 +169,8 @@ bool RunOscillator(OscHost& host, std::string_view title, bool longForm,
     host.dialogs.SetBusy(false);
     if (longForm && number == kDiskNotReady) {
       if (host.dialogs.Ask("Disk Not ready. Close drive door",
-                           diskTitle.empty() ? title : diskTitle, Buttons::kOkCancel) ==
-          Answer::kOk)
+                           diskTitle.empty() ? title : diskTitle,
+                           Buttons::kOkCancel) == Answer::kOk)
         continue;
       return false;
     }

@@ -9,11 +9,18 @@
 #include "chart/chart_pen.h"
 #include "chart/chart_request.h"
 #include "chart/composition.h"
+#include "looks/colours.h"
 #include "platform/dialogs.h"
 #include "settings/settings.h"
-#include "store/colours.h"
 
 namespace kora {
+
+// Where RMX draws in its panel, in units of it.
+struct RmxPlace {
+  std::int16_t PanelTop = 0, PanelBottom = 0;  // of the frame
+  double inset = 0;                            // from the frame to highest and lowest
+  int middle = 0;                              // the y that the offsets are counted from
+};
 
 // What an oscillator is drawn from and onto. Every routine has the form Show<Name>(OscHost&):
 // it computes from the bars on show, draws one panel and appends the same drawing to the
@@ -23,26 +30,28 @@ struct OscHost {
   Dialogs& dialogs;
   const Settings& settings;
   const ChartColours& colours;
-  const ChartRequest& request;  // period, style and name record of the chart on show
-  Composition& chart;           // its bars and scale; OscPanel is -1 in a second pass
-  Surface& price;               // the price picture
-  Surface& panel;               // the oscillator picture
+  const ChartRequest& request;    // period, style and name record of the chart on show
+  Composition& chart;             // its bars and scale
+  Surface& price;                 // the price picture
+  Surface& panel;                 // the oscillator picture
   ChartScript* script = nullptr;  // null or suppressed: drawn only
 
   std::string OscCode = {};        // "STO", "FX", "R/F", "ROC", ...
   std::string OscCaller = "CHTS";  // "ANAL" for the multi-oscillator view
   bool SlowStochastic = false;
-  bool AnalPageMode = false;       // panels stacked in the multi-oscillator view
-  double PanelOffsetY = 0;         // y of the panel on the script page when not in the chart window
-  double PrintScale = 1;           // panel y is divided by it on its way to the script
+  double PanelOffsetY = 0;  // y of the panel on the script page when not in the chart window
+  double PrintScale = 1;    // panel y is divided by it on its way to the script
+  bool SecondPass = false;  // over the panel that another oscillator drew
 
   std::int16_t PanelTop = 0, PanelBottom = 0;  // of the panel drawn last, for the pointer
 
   bool InChartWindow() const { return OscCaller == "CHTS"; }
-  bool SecondPass() const { return chart.OscPanel == -1; }
-  // The daily period for "A", otherwise its twin.
-  std::int16_t Period(PeriodPair OscSettings::*pair) const {
-    return (settings.osc.*pair).For(request.ChartPeriod);
+  // In the chart window the frame takes the panel, and title and values of RMX stand below it. In
+  // the multi-oscillator view the panel has room for them, since the next one begins at its end.
+  RmxPlace PlaceRmx(double units) const;
+  // The one of the chart period on show.
+  std::int16_t Period(const OscKey& key) const {
+    return settings.osc[key].For(request.ChartPeriod);
   }
   Colour colour(int entry) const { return colours[static_cast<size_t>(entry)]; }
 };
@@ -58,8 +67,9 @@ class OscPanel {
   //   PanelTop = CInt(0.02 * height)   PanelBottom = CInt(0.98 * height)
   // `units`: 0 keeps the panel's own height; otherwise its scale becomes that many units high
   // and as wide as the price picture, and top and bottom are (2 * height) \ 100 and
-  // (98 * height) \ 100.
-  explicit OscPanel(OscHost& host, double units = 0);
+  // (98 * height) \ 100. `textsBelow`: on the screen the units are drawn small enough for two
+  // lines of text below the frame; the script knows nothing of it.
+  explicit OscPanel(OscHost& host, double units = 0, bool textsBelow = false);
 
   std::int16_t PanelTop, PanelBottom;
   std::int16_t PanelLeft = 42;
@@ -67,7 +77,7 @@ class OscPanel {
   double PlotX;  // of the bar being drawn; PanelLeft at the start
 
   OscHost& host;
-  ChartPen pen;       // on the panel; script y carries scale and offset
+  ChartPen pen;  // on the panel; script y carries scale and offset
 
   Colour colour(int entry) const { return host.colour(entry); }
   double TextWidth(std::string_view text);

@@ -29,8 +29,10 @@ inline double ScaleOf(double range, double height) { return height == 0 ? 0 : ra
 // minus `highest`; otherwise `highest` becomes minus `lowest`.
 template <typename T>
 void MakeSymmetric(T& highest, T& lowest) {
-  if (lowest >= -highest) lowest = -highest;
-  else highest = -lowest;
+  if (lowest >= -highest)
+    lowest = -highest;
+  else
+    highest = -lowest;
 }
 
 // Index of the last bar on show, -1 when there is none.

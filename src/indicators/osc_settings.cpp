@@ -1,5 +1,6 @@
 #include "indicators/osc_settings.h"
 
+#include <algorithm>
 #include <vector>
 
 #include "base/numbers.h"
@@ -8,90 +9,75 @@
 namespace kora {
 namespace {
 
-using O = OscSettings;
+constexpr std::string_view kSection = "OscDef";
 
-constexpr OscField kStochastic[] = {{"Period K", &O::StochK, false},
-                                    {"Period D", &O::StochD, true}};
-constexpr OscField kFX[] = {{"Period F", &O::FXF, false}, {"Period X", &O::FXX, true}};
-constexpr OscField kRMX[] = {{"Period RMX", &O::RmxP, false}, {"RMX Ave", &O::RmxA, true}};
-constexpr OscField kRMO[] = {{"Period RMO", &O::RmoP, false}, {"RMO Ave", &O::RmoA, true}};
-constexpr OscField kROC[] = {{"Period ROC", &O::RocP, false}, {"ROC Ave", &O::RocA, true}};
-constexpr OscField kROCFX[] = {{"Period F", &O::FXF, false},
-                               {"Period X", &O::FXX, true},
-                               {"Period ROC", &O::RocP, false},
-                               {"ROC Ave", &O::RocA, true}};
-constexpr OscField kRSI[] = {{"RSI period", &O::RsiP, false}};
-// All three are periods, none may be left out.
-constexpr OscField kMACD[] = {{"EMA 1", &O::Md1, false},
-                              {"EMA 2", &O::Md2, false},
-                              {"EMA 3 signal", &O::Md3, false}};
-constexpr OscField kWilliams[] = {{"Period", &O::WmsA, false}};
-constexpr OscField kDirectional[] = {{"Period", &O::DMA, false}, {"AveDX", &O::DMXA, true}};
-constexpr OscField kMomentum[] = {{"Period ", &O::MMA, false}};
-constexpr OscField kElderRay[] = {{"Period", &O::ERA, false}};
-constexpr OscField kCoppock[] = {{"Period ", &O::CopD, false}};
-constexpr OscField kHolyGrail[] = {{"Period ", &O::HolyD, false}};
-constexpr OscField kVolatility[] = {{"Period ", &O::VtyD, false}};
+int Least(OscRange range) { return range == OscRange::kPeriod ? 1 : 0; }
 
-constexpr OscBox kBoxes[] = {
-    {"STO", "Stochastic", kStochastic, false},
-    {"FX", "FX", kFX, false},
-    {"RMX", "RMX", kRMX, true},
-    {"RMO", "RMO", kRMO, true},
-    {"ROC", "ROC", kROC, false},
-    {"R/F", "ROC & FX", kROCFX, false},
-    {"RSI", "RSI", kRSI, false},
-    {"MACD", "MACD", kMACD, false},
-    {"WMS", "Williams %R", kWilliams, false},
-    {"DM", "Dir.Mvmt", kDirectional, false},
-    {"MOM", "Momentum", kMomentum, false},
-    {"ERY", "Elder Ray", kElderRay, false},
-    {"COP", "Coppock", kCoppock, false},
-    {"JHG", "Jones Holy Grail", kHolyGrail, false},
-    {"VTY", "Volatility", kVolatility, false},
-};
-
-std::int16_t& PeriodOnShow(PeriodPair& pair, const std::string& chartPeriod) {
-  return chartPeriod == "A" ? pair.daily : pair.twin;
+std::int16_t& PeriodOnShow(PeriodPair& pair, Period chartPeriod) {
+  return chartPeriod == Period::kDaily ? pair.daily : pair.twin;
 }
 
 }  // namespace
 
-const OscBox* FindOscBox(std::string_view oscCode) {
-  for (const OscBox& box : kBoxes)
-    if (oscCode == box.code) return &box;
-  return nullptr;
+void ReadOscPeriods(const SettingsFile& ini, OscSettings& osc) {
+  const auto period = [&ini](const char* key) {
+    return SettingCInt(ini.GetSetting(kSection, key));
+  };
+  for (const OscKey& key : OscKeys()) osc[key] = {period(key.daily), period(key.twin)};
 }
 
-void FillOscDefaults(OscSettings& osc, const std::string& chartPeriod) {
+void WriteDefaultOscPeriods(SettingsFile& ini) {
+  const SettingsFile::Batch batch(ini);
   for (const OscKey& key : OscKeys()) {
-    std::int16_t& period = PeriodOnShow(osc.*key.value, chartPeriod);
-    if (period == 0) period = chartPeriod == "A" ? key.defaultDaily : key.defaultTwin;
+    ini.PutSetting(kSection, key.daily, Str(std::int32_t(key.defaultDaily)));
+    ini.PutSetting(kSection, key.twin, Str(std::int32_t(key.defaultTwin)));
   }
 }
 
-bool ReadOscFields(const OscBox& box, std::span<const std::string> typed,
-                   const std::string& chartPeriod, OscSettings& osc, size_t& refused) {
+const Oscillator* FindOscBox(std::string_view oscCode) {
+  const Oscillator* oscillator = FindOscillator(oscCode);
+  return oscillator && oscillator->boxCaption ? oscillator : nullptr;
+}
+
+void FillOscDefaults(OscSettings& osc, Period chartPeriod) {
+  for (const OscKey& key : OscKeys()) {
+    std::int16_t& period = PeriodOnShow(osc[key], chartPeriod);
+    if (period == 0) period = chartPeriod == Period::kDaily ? key.defaultDaily : key.defaultTwin;
+  }
+}
+
+bool ReadOscFields(const Oscillator& box, std::span<const std::string> typed, Period chartPeriod,
+                   OscSettings& osc, size_t& refused) {
   std::vector<std::int16_t> periods;
   for (size_t i = 0; i < box.fields.size(); ++i) {
     const double value = RoundHalfEven(Val(typed[i]));
-    if (value < (box.fields[i].average ? 0 : 1) || value > kMostOscPeriod) {
+    if (value < Least(box.fields[i].range) || value > kMostOscPeriod) {
       refused = i;
       return false;
     }
     periods.push_back(CInt(value));
   }
   for (size_t i = 0; i < periods.size(); ++i)
-    PeriodOnShow(osc.*box.fields[i].value, chartPeriod) = periods[i];
+    PeriodOnShow(osc[box.fields[i].key], chartPeriod) = periods[i];
   return true;
+}
+
+bool PeriodsInRange(const Oscillator& oscillator, const OscSettings& osc, Period chartPeriod) {
+  if (oscillator.checksDaily) chartPeriod = Period::kDaily;
+  return std::all_of(oscillator.fields.begin(), oscillator.fields.end(),
+                     [&](const OscField& field) {
+                       const std::int16_t value = osc[field.key].For(chartPeriod);
+                       return field.range == OscRange::kBoxAverage ||
+                              (value >= Least(field.range) && value <= kMostOscPeriod);
+                     });
 }
 
 CompareFileAnswer TestCompareFile(const Files& files, Dialogs& dialogs, std::string_view typed) {
   const std::string path(Trim(typed));
   if (!path.empty() && files.CheckFile(path)) return CompareFileAnswer::kThere;
-  const Answer answer = dialogs.Ask(
-      path + " is not available. Use your code for the All Ordinaries Index", "RMX Compare ",
-      Buttons::kOkCancel);
+  const Answer answer =
+      dialogs.Ask(path + " is not available. Use your code for the All Ordinaries Index",
+                  "RMX Compare ", Buttons::kOkCancel);
   return answer == Answer::kOk ? CompareFileAnswer::kCorrect : CompareFileAnswer::kGiveUp;
 }
 

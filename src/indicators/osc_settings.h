@@ -5,7 +5,9 @@
 #include <string>
 #include <string_view>
 
+#include "indicators/oscillators.h"
 #include "platform/dialogs.h"
+#include "platform/settings_file.h"
 #include "settings/settings.h"
 
 // What the settings box of an oscillator shows, takes and refuses. Its values hold for this run;
@@ -13,37 +15,33 @@
 
 namespace kora {
 
-struct OscField {
-  const char* label;
-  PeriodPair OscSettings::*value;
-  bool average;  // may be 0, which draws no average
-};
+// The periods of all oscillators in section OscDef: read, and written as a new installation has
+// them.
+void ReadOscPeriods(const SettingsFile& ini, OscSettings& osc);
+void WriteDefaultOscPeriods(SettingsFile& ini);
 
-// The box of one oscillator.
-struct OscBox {
-  const char* code;
-  const char* caption;
-  std::span<const OscField> fields;
-  bool compares;  // the compare file is asked for too, as the last field
-};
+// What the field of the compare file is called; it is the last of a box that has one.
 inline constexpr const char* kCompareLabel = "Compare to:";
 
-// The box of an oscillator code; null for one that has no settings.
-const OscBox* FindOscBox(std::string_view oscCode);
+// The oscillator of a code; null for one that has no settings box.
+const Oscillator* FindOscBox(std::string_view oscCode);
 
 // Gives every period that is zero its default, for the chart period on show only: the twin
 // stays as it is until a chart of its period is on show.
-void FillOscDefaults(OscSettings& osc, const std::string& chartPeriod);
+void FillOscDefaults(OscSettings& osc, Period chartPeriod);
 
 inline constexpr int kMostOscPeriod = 200;
 inline constexpr std::string_view kOscPeriodMessage = " Periods must be between 1 - 200 ";
 inline constexpr std::string_view kOscPeriodTitle = "Oscillator Values";
 
 // Reads the typed fields, one text each, into the periods of the chart period on show. False,
-// with nothing changed and `refused` the number of the field from 0, where one is not within 1
-// to 200, an average not within 0 to 200.
-bool ReadOscFields(const OscBox& box, std::span<const std::string> typed,
-                   const std::string& chartPeriod, OscSettings& osc, size_t& refused);
+// with nothing changed and `refused` the number of the field from 0, where one is out of its
+// range.
+bool ReadOscFields(const Oscillator& box, std::span<const std::string> typed, Period chartPeriod,
+                   OscSettings& osc, size_t& refused);
+
+// True when the periods that the oscillator is drawn with are in their ranges.
+bool PeriodsInRange(const Oscillator& oscillator, const OscSettings& osc, Period chartPeriod);
 
 // The first test of the compare file that stands in the box.
 enum class CompareFileAnswer { kThere, kCorrect, kGiveUp };

@@ -36,8 +36,8 @@ BandTexts StandingBands(BandForm form, const NameRec& record) {
              : BandTexts{text(record.BollPeriods), text(record.BollWidth)};
 }
 
-bool SaveBands(const Files& files, const std::string& dataPath, CurrentName& current,
-               BandForm form, std::string_view first, std::string_view second) {
+bool SaveBands(const Files& files, const std::string& dataPath, CurrentName& current, BandForm form,
+               std::string_view first, std::string_view second) {
   const auto values = ReadBandBoxes(first, second);
   if (!values) return false;
   RewriteCurrentName(files, dataPath, current, [&](NameRec& record) {

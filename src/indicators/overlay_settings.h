@@ -30,7 +30,7 @@ struct BandTexts {
 BandTexts StandingBands(BandForm form, const NameRec& record);
 // Writes both values into the current security's record. False when one is refused. Errors as
 // RewriteCurrentName.
-bool SaveBands(const Files& files, const std::string& dataPath, CurrentName& current,
-               BandForm form, std::string_view first, std::string_view second);
+bool SaveBands(const Files& files, const std::string& dataPath, CurrentName& current, BandForm form,
+               std::string_view first, std::string_view second);
 
 }  // namespace kora

@@ -2,7 +2,6 @@
 
 #include "chart/chart_canvas.h"
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 
 namespace kora {
 namespace {
@@ -144,8 +143,7 @@ class TrailPen {
   }
 
   void LastStop(float stop) {
-    const ChartCanvas canvas{pen_, host_.request, host_.settings.fonts, host_.colours,
-                             host_.chart};
+    const ChartCanvas canvas{pen_, host_.request, host_.settings.fonts, host_.colours, host_.chart};
     const std::string text =
         "Parabolic last stop : " + Format(stop, stop < 0.20 ? "0.000" : "0.00");
     const double width = canvas.TextWidth(canvas.Font1(ChartCanvas::kSmallText), text);
@@ -177,8 +175,7 @@ void ShowParabolic(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&host] {
     const ChartBars& bars = host.chart.Bars;
     std::vector<HighLow> prices(static_cast<size_t>(bars.BarCount) + 1);
-    for (int i = 0; i <= bars.BarCount; ++i)
-      At(prices, i) = {At(bars, i).High, At(bars, i).Low};
+    for (int i = 0; i <= bars.BarCount; ++i) At(prices, i) = {At(bars, i).High, At(bars, i).Low};
     const ParabolicTrail trail = Parabolic(prices);
     if (trail.trend == 'N') return;
 

@@ -3,6 +3,8 @@
 #include <span>
 #include <vector>
 
+#include "indicators/osc_panel.h"
+
 namespace kora {
 
 // A stop-and-reverse trail.
@@ -30,12 +32,15 @@ struct ParabolicStep {
   bool point = false;  // the stop is a point of the trail
 };
 struct ParabolicTrail {
-  char trend = 'N';                  // at the start; 'N': the data ended before a trend
+  char trend = 'N';  // at the start; 'N': the data ended before a trend
   int startBar = 0;
   float startStop = 0;
   std::vector<ParabolicStep> steps;  // by bar; from startBar + 1 on they count
 };
 // Error 6 where a stop leaves 32-bit floats.
 ParabolicTrail Parabolic(std::span<const HighLow> bars);
+
+void ShowParabolic(OscHost& host);
+void ShowParabolicOnAverage(OscHost& host);
 
 }  // namespace kora

@@ -119,8 +119,8 @@ std::optional<double> Number(std::string_view text) {
   text = Trim(text);
   std::string_view rest = text;
   if (!rest.empty() && (rest.front() == '-' || rest.front() == '+')) rest.remove_prefix(1);
-  const auto digits = std::count_if(rest.begin(), rest.end(),
-                                    [](char c) { return c >= '0' && c <= '9'; });
+  const auto digits =
+      std::count_if(rest.begin(), rest.end(), [](char c) { return c >= '0' && c <= '9'; });
   const auto points = std::count(rest.begin(), rest.end(), '.');
   if (digits == 0 || points > 1 || size_t(digits + points) != rest.size()) return std::nullopt;
   return Val(text);
@@ -154,8 +154,7 @@ void ShowBands(const ChartCanvas& canvas) {
 std::vector<std::function<void(const ChartCanvas&)>> PriceOverlays(bool MMAOn,
                                                                    const MmaPeriods& MMASet) {
   std::vector<std::function<void(const ChartCanvas&)>> overlays{ShowBands};
-  if (MMAOn)
-    overlays.emplace_back([MMASet](const ChartCanvas& canvas) { AddMMA(canvas, MMASet); });
+  if (MMAOn) overlays.emplace_back([MMASet](const ChartCanvas& canvas) { AddMMA(canvas, MMASet); });
   return overlays;
 }
 

@@ -14,8 +14,7 @@ namespace {
 constexpr std::int32_t kMostRecords = 30000;
 
 std::vector<RelRec> RelSeriesOf(OscHost& host, const PriceFile& compare) {
-  const PriceFile security(host.files,
-                           host.settings.paths.CurrentDataPath + host.chart.DataFile);
+  const PriceFile security(host.files, host.settings.paths.CurrentDataPath + host.chart.DataFile);
   const std::int32_t n = std::min(security.count(), kMostRecords);
   const std::int32_t pairs = std::min(n, compare.count());
   return PairFromEnd(ReadCloses(security, security.count() - n + 1, n),
@@ -70,8 +69,7 @@ void Draw(OscHost& host, std::int16_t P, std::int16_t A, const std::string& Comp
         panel.Line('L', panel.PlotX - spacing, previousAverageY, panel.PlotX, averageY, kOscLine2);
       previousAverageY = averageY;
     }
-    if (drawn >= 3)
-      panel.Line('H', panel.PlotX - spacing, previousY, panel.PlotX, y, kOscLine1);
+    if (drawn >= 3) panel.Line('H', panel.PlotX - spacing, previousY, panel.PlotX, y, kOscLine1);
     previousY = y;
   }
 }
@@ -99,13 +97,13 @@ void SetRmoValues(std::vector<RelRec>& series, int P) {
 
 void ShowRMO(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&] {
-    const std::int16_t P = host.Period(&OscSettings::RmoP);
-    if (P == 0 || host.request.ChartPeriod != "A") return;
+    const std::int16_t P = host.Period(kRmoP);
+    if (P == 0 || host.request.ChartPeriod != Period::kDaily) return;
     const std::string& compFile = host.settings.osc.CompFile;
     const std::string CompareName = ValidateCompareFile(host.files, host.dialogs, compFile);
     if (CompareName.empty()) return;
     if (const auto compare = OpenCompareFile(host.files, compFile))
-      Draw(host, P, host.Period(&OscSettings::RmoA), CompareName, *compare);
+      Draw(host, P, host.Period(kRmoA), CompareName, *compare);
   });
 }
 

@@ -4,7 +4,7 @@
 #include <span>
 #include <vector>
 
-#include "indicators/oscillators.h"
+#include "indicators/osc_panel.h"
 
 namespace kora {
 
@@ -41,5 +41,10 @@ std::vector<RelRec> PairFromEnd(std::span<const float> security, std::span<const
 
 // Sets the values. Error 9 when P is below 1.
 void SetRmoValues(std::vector<RelRec>& series, int P);
+
+inline constexpr OscKey kRmoP{"RmoP", "RmoPW", 30, 30, "RMO periods"};
+inline constexpr OscKey kRmoA{"RmoA", "RmoAW", 10, 10, "RMO average"};
+
+void ShowRMO(OscHost& host);
 
 }  // namespace kora

@@ -80,26 +80,25 @@ void Lines(OscHost& host, OscPanel& panel, const Form& form, const RmxSeries& se
 }
 
 void Draw(OscHost& host, const Form& form) {
-  OscPanel panel(host, kPanelUnits);
-  const double units = host.panel.ScaleHeight();
-  panel.PanelTop = host.AnalPageMode ? 20 : CInt(0.02 * units);
-  panel.PanelBottom = host.AnalPageMode ? 220 : CInt(0.98 * units);
+  OscPanel panel(host, kPanelUnits, true);
+  const RmxPlace place = host.PlaceRmx(kPanelUnits);
+  panel.PanelTop = place.PanelTop;
+  panel.PanelBottom = place.PanelBottom;
   panel.Frame();
 
   const auto compare = OpenCompareFile(host.files, host.settings.osc.CompFile);
   if (!compare) return;
   const ChartBars& bars = host.chart.Bars;
   const std::int32_t first = std::max<std::int32_t>(compare->count() - bars.BarCount, 1);
-  const RmxSeries series = RmxValues(
-      bars, ReadCloses(*compare, first, compare->count() - first + 1), form.P);
+  const RmxSeries series =
+      RmxValues(bars, ReadCloses(*compare, first, compare->count() - first + 1), form.P);
 
-  const double inset = host.AnalPageMode ? 0 : 20;
-  const Plot plot{panel.PanelBottom - inset,
-                  panel.PanelBottom - inset - (panel.PanelTop + inset)};
+  const double floor = panel.PanelBottom - place.inset;
+  const Plot plot{floor, floor - (panel.PanelTop + place.inset)};
   const double scale = plot.Scale(series.Highest, series.Lowest);
   if (scale == 0) return;
   const auto yOf = [&](double v) { return CInt(plot.Y(v, series.Lowest, scale)); };
-  const int middle = host.AnalPageMode ? 120 : int(Fix(units / 2));
+  const int middle = place.middle;
 
   std::int16_t lastCentre = 0;
   for (const RmxPoint& point : series.Points) lastCentre = plot.Centre(point).value_or(lastCentre);
@@ -147,12 +146,12 @@ RmxSeries RmxValues(const ChartBars& bars, std::span<const float> compare, int P
 
 void ShowRMX(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&] {
-    const std::int16_t P = host.Period(&OscSettings::RmxP);
+    const std::int16_t P = host.Period(kRmxP);
     if (P == 0) return;
     const std::string CompareName =
         ValidateCompareFile(host.files, host.dialogs, host.settings.osc.CompFile);
     if (CompareName.empty()) return;
-    Draw(host, {P, host.Period(&OscSettings::RmxA), CompareName});
+    Draw(host, {P, host.Period(kRmxA), CompareName});
   });
 }
 

@@ -4,7 +4,7 @@
 #include <span>
 #include <vector>
 
-#include "indicators/oscillators.h"
+#include "indicators/osc_panel.h"
 
 namespace kora {
 
@@ -43,5 +43,10 @@ struct RmxSeries {
 // `compare` holds the compare file's closes from the record that goes with bar 0 on; bars beyond
 // it have no value. Error 9 when P is below 1.
 RmxSeries RmxValues(const ChartBars& bars, std::span<const float> compare, int P);
+
+inline constexpr OscKey kRmxP{"RmxP", "RmxPW", 100, 50, "RMX periods"};
+inline constexpr OscKey kRmxA{"RmxA", "RmxAW", 20, 20, "RMX average"};
+
+void ShowRMX(OscHost& host);
 
 }  // namespace kora

@@ -52,8 +52,7 @@ void Draw(OscHost& host, const Form& form) {
   panel.Title(form.title);
   const auto guide = [&](double v, const std::string& label) {
     const double y = yOf(v);
-    const Segment s{double(panel.PanelLeft), y, double(panel.PanelRight), y,
-                    host.colour(kBorder)};
+    const Segment s{double(panel.PanelLeft), y, double(panel.PanelRight), y, host.colour(kBorder)};
     panel.pen.LineStyled(DrawStyle::kDot, s, 'L', s);
     panel.Label(y, label);
   };
@@ -95,9 +94,9 @@ ChangeSeries MomentumSeries(const ChartBars& bars, int P) {
 
 void ShowROC(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&] {
-    const std::int16_t P = host.Period(&OscSettings::RocP);
+    const std::int16_t P = host.Period(kRocP);
     if (P == 0) return;
-    const std::int16_t A = host.Period(&OscSettings::RocA);
+    const std::int16_t A = host.Period(kRocA);
     const bool plain = host.OscCode == "R/F" && !host.settings.osc.RFAve;
     std::string title = "Rate of Change Oscillator (" + Str(std::int32_t(P)) + " Period)";
     if (!plain) title += "  " + Str(std::int32_t(A)) + " Ave";
@@ -107,7 +106,7 @@ void ShowROC(OscHost& host) {
 
 void ShowMomentum(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&] {
-    const std::int16_t P = host.Period(&OscSettings::MMA);
+    const std::int16_t P = host.Period(kMMA);
     if (P == 0) return;
     const std::string title = "Momentum Oscillator (" + Str(std::int32_t(P)) + " Period)  0 Ave";
     Draw(host, {P, MomentumSeries, title, "0%", 0, false});

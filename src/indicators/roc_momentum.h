@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <vector>
 
-#include "indicators/oscillators.h"
+#include "indicators/osc_panel.h"
 
 namespace kora {
 
@@ -24,12 +24,19 @@ namespace kora {
 //
 // The difference of two prices is a 32-bit float as prices are; ratio and percent are 64-bit.
 struct ChangeSeries {
-  std::vector<std::int32_t> V;     // one a bar
+  std::vector<std::int32_t> V;            // one a bar
   double Highest = -100, Lowest = 10000;  // symmetric about zero; wider than V so that -V fits
 };
 
 // P is not 0. Error 6 where a value leaves its range, 9 where a negative P looks past the bars.
 ChangeSeries RocSeries(const ChartBars& bars, int P);
 ChangeSeries MomentumSeries(const ChartBars& bars, int P);
+
+inline constexpr OscKey kRocP{"RocP", "RocPW", 21, 21, "ROC periods"};
+inline constexpr OscKey kRocA{"RocA", "RocAW", 10, 10, "ROC average"};
+inline constexpr OscKey kMMA{"MMA", "MMW", 14, 14, "Momentum  period"};
+
+void ShowROC(OscHost& host);
+void ShowMomentum(OscHost& host);
 
 }  // namespace kora

@@ -1,7 +1,6 @@
 #include "indicators/rsi.h"
 
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 
 namespace kora {
 
@@ -30,7 +29,7 @@ double RsiAt(const ChartBars& bars, int i, int period) {
 
 void ShowRSI(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&host] {
-    const std::int16_t P = host.Period(&OscSettings::RsiP);
+    const std::int16_t P = host.Period(kRsiP);
     if (P < 1) return;
     OscPanel panel(host);
     panel.Frame();

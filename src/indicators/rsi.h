@@ -1,5 +1,6 @@
 #pragma once
 
+#include "indicators/osc_panel.h"
 #include "store/chart_bars.h"
 
 namespace kora {
@@ -17,5 +18,9 @@ namespace kora {
 //   figure that follows the price level: a very steady rise shows as a low RSI.
 // - Before bar P there is nothing to sum and the value is 0.
 double RsiAt(const ChartBars& bars, int i, int period);
+
+inline constexpr OscKey kRsiP{"RsiP", "RsiPW", 14, 14, "RSI periods"};
+
+void ShowRSI(OscHost& host);
 
 }  // namespace kora

@@ -26,8 +26,8 @@ Form FormOf(OscHost& host) {
   const bool overRoc = host.OscCode == "R/F";
   if (!form.stochastic) host.SlowStochastic = false;
   form.slow = host.SlowStochastic;
-  form.K = host.Period(form.stochastic ? &OscSettings::StochK : &OscSettings::FXF);
-  form.D = host.Period(form.stochastic ? &OscSettings::StochD : &OscSettings::FXX);
+  form.K = host.Period(form.stochastic ? kStochK : kFXF);
+  form.D = host.Period(form.stochastic ? kStochD : kFXX);
   form.reversed = !form.stochastic && host.settings.osc.FXRev;
   form.average = form.D > 0 && (!overRoc || host.settings.osc.RFAve);
   form.line1 = overRoc ? kOscLine3 : kOscLine1;
@@ -35,8 +35,8 @@ Form FormOf(OscHost& host) {
   form.line3 = kOscLine3;
   const std::string k = Str(std::int32_t(form.K)), d = Str(std::int32_t(form.D));
   if (form.stochastic)
-    form.title = (form.slow ? "SLOW " : "") + ("Stochastic Oscillator (K=" + k) + " Period  D=" +
-                 d + " Period)";
+    form.title = (form.slow ? "SLOW " : "") + ("Stochastic Oscillator (K=" + k) +
+                 " Period  D=" + d + " Period)";
   else
     form.title = "FX Oscillator (F=" + k + " Period  X=" + d + " Period)";
   return form;
@@ -92,13 +92,12 @@ void Draw(OscHost& host, int& bar) {
   panel.Guide(CInt(yOf(75)), form.reversed ? " 25%" : " 75%");
   const bool signals = host.settings.words.StochSignals;
   const std::int16_t y20 = CInt(yOf(20)), y90 = CInt(yOf(90));
-  if (signals && !host.SecondPass()) {
+  if (signals && !host.SecondPass) {
     for (const double y : {double(CInt(yOf(10))), double(y90)})
       host.panel.Line(panel.PanelLeft, y, panel.PanelRight, y, host.colour(kBorder));
   }
 
-  const std::vector<PriceRange> ranges =
-      StochasticRanges(bars, host.request.Name.RecType, form.K);
+  const std::vector<PriceRange> ranges = StochasticRanges(bars, host.request.Name.RecType, form.K);
   const auto plotY = [&](double v) { return CLng(yOf(form.reversed ? 100 - v : v)); };
   double previousX = 0;
   std::int32_t previousKY = 0, previousDY = 0, previousThirdY = 0;
@@ -146,7 +145,6 @@ void Draw(OscHost& host, int& bar) {
     previousDY = dY;
     previousThirdY = thirdY;
   }
-  host.chart.OscPanel = 0;
 }
 
 }  // namespace

@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <vector>
 
-#include "indicators/oscillators.h"
+#include "indicators/osc_panel.h"
 #include "indicators/sliding_range.h"
 
 namespace kora {
@@ -33,5 +33,12 @@ namespace kora {
 // For each bar the range of bars bar - K to bar; up to bar K, and where K is below 0, the start
 // values.
 std::vector<PriceRange> StochasticRanges(const ChartBars& bars, std::int16_t recType, int K);
+
+inline constexpr OscKey kStochK{"StochK", "StochKW", 10, 10, "Stochastic K"};
+inline constexpr OscKey kStochD{"StochD", "StochDW", 5, 5, "Stochastic D"};
+inline constexpr OscKey kFXF{"FXF", "FXFW", 50, 50, "FX periods"};
+inline constexpr OscKey kFXX{"FXX", "FXXW", 25, 25, "FX average"};
+
+void ShowStochasticFX(OscHost& host);
 
 }  // namespace kora

@@ -4,7 +4,6 @@
 #include <cmath>
 
 #include "indicators/osc_series.h"
-#include "indicators/oscillators.h"
 
 namespace kora {
 
@@ -40,7 +39,7 @@ VolatilitySeries Volatility(const ChartBars& bars, int period) {
 
 void ShowVolatility(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&host] {
-    const std::int16_t P = host.Period(&OscSettings::VtyD);
+    const std::int16_t P = host.Period(kVtyD);
     if (P < 1) return;
     OscPanel panel(host);
     panel.Frame();
@@ -68,8 +67,7 @@ void ShowVolatility(OscHost& host) {
       const double x = panel.BarX(i);
       const double y = yOf(row.value);
       if (y <= base) panel.Line('H', x, base, x, y, kVolatility1);
-      if (row.average != 0)
-        average.To(x, yOf(row.average), panel.colour(kVolatility2));
+      if (row.average != 0) average.To(x, yOf(row.average), panel.colour(kVolatility2));
     }
   });
 }

@@ -2,6 +2,7 @@
 
 #include <vector>
 
+#include "indicators/osc_panel.h"
 #include "store/chart_bars.h"
 
 namespace kora {
@@ -24,5 +25,9 @@ struct VolatilitySeries {
   float lowest = 100000.0f;
 };
 VolatilitySeries Volatility(const ChartBars& bars, int period);
+
+inline constexpr OscKey kVtyD{"VtyD", "VtyW", 3, 3, "Volatility"};
+
+void ShowVolatility(OscHost& host);
 
 }  // namespace kora

@@ -72,7 +72,7 @@ std::vector<WilliamsPoint> WilliamsSeries(const ChartBars& bars, std::int16_t re
 
 void ShowWilliams(OscHost& host) {
   RunOscillator(host, "Chart Display", false, [&] {
-    const std::int16_t P = host.Period(&OscSettings::WmsA);
+    const std::int16_t P = host.Period(kWmsA);
     if (P != 0) Draw(host, P);
   });
 }

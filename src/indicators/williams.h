@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <vector>
 
-#include "indicators/oscillators.h"
+#include "indicators/osc_panel.h"
 
 namespace kora {
 
@@ -31,5 +31,9 @@ struct WilliamsPoint {
 
 // The bars that are not passed over, in order.
 std::vector<WilliamsPoint> WilliamsSeries(const ChartBars& bars, std::int16_t recType, int P);
+
+inline constexpr OscKey kWmsA{"WmsA", "WmsW", 7, 7, "Williams %R period"};
+
+void ShowWilliams(OscHost& host);
 
 }  // namespace kora

@@ -20,7 +20,7 @@ struct BarsOptions {
 constexpr std::string_view kTitle = "Chart Display";
 
 void CheckSlice(Run& run, const BarsOptions& options, std::int32_t count, ChartBars& bars) {
-  const std::string name = run.DataFileName();
+  const std::string name = run.session.current.PriceFileName;
   if (count == 0) run.Abandon("No Data for " + name, kTitle);
   const std::int32_t first = options.first.value_or(1);
   const std::int32_t last = options.last.value_or(count);
@@ -34,12 +34,13 @@ void CheckSlice(Run& run, const BarsOptions& options, std::int32_t count, ChartB
 
 void LoadSlice(Run& run, const BarsOptions& options, ChartBars& bars) {
   const std::int16_t kind = run.session.current.Rec.RecType;
-  ChartFailure at{.file = run.DataFileName(), .RecType = kind};
+  ChartFailure at{.file = run.session.current.PriceFileName, .RecType = kind};
   try {
-    const PriceFile file(run.session.files, run.session.current.CurrentDataFile);
+    const PriceFile file(run.session.files, run.PriceFilePath());
     CheckSlice(run, options, file.count(), bars);
     try {
-      LoadChartBars(file, options.period, options.volume == "on", kind, bars);
+      LoadChartBars(file, ParsePeriod(options.period).value_or(Period::kDaily),
+                    options.volume == "on", kind, bars);
     } catch (const RunTimeError&) {
       at.record = bars.CurrentDataRec;
       at.date = DateForMessage(file, at.record);
@@ -86,7 +87,8 @@ void AddBars(CLI::App& app, CommandLine& line) {
   command->add_option("--first", options->first, "First record (default: 1)");
   command->add_option("--last", options->last, "Last record (default: the last of the file)");
   AddVolume(*command, options->volume);
-  command->callback([&line, options] { line.run = [&line, options] { return Bars(line, *options); }; });
+  command->callback(
+      [&line, options] { line.run = [&line, options] { return Bars(line, *options); }; });
 }
 
 }  // namespace kora

@@ -17,7 +17,7 @@ void AddFind(CLI::App& app, CommandLine& line) {
       const CurrentName& found = run.session.current;
       Table table("Rec Code File");
       table.Number(found.NameRecNo).Text(found.Rec.Code.raw());
-      table.Text(ToAnsi(found.CurrentDataFile)).EndRow();
+      table.Text(ToAnsi(run.PriceFilePath())).EndRow();
       table.Print();
       return kDone;
     };

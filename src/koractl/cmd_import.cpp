@@ -23,22 +23,16 @@ void CheckName(const std::string& name) {
 int Import(const CommandLine& line, const std::vector<std::string>& sources,
            const ImportOptions& options) {
   if (!options.Code.empty() && !IsFileCode(KeptCode(UCase(Trim(options.Code)))))
-    throw UsageError("--code: \"" + options.Code + "\" is no code; it has 1 to 6 letters and digits");
+    throw UsageError("--code: \"" + options.Code +
+                     "\" is no code; it has 1 to 6 letters and digits");
   CheckName(options.Name);
   if (!options.Name.empty() && sources.size() > 1 && options.Code.empty())
     throw UsageError("--name: several files take one name only with --code");
   Run run(line);
   run.Open();
   ImportCounts counts;
-  bool all = true;
-  {
-    const auto progress = run.dialogs.StartProgress("Import");
-    int done = 0;
-    for (const std::string& file : sources) {
-      all &= ImportHistory(run.session.files, run.dataPath(), file, options, run.dialogs, counts);
-      progress->Step(++done, int(sources.size()));
-    }
-  }
+  const bool all =
+      ImportHistory(run.session.files, run.dataPath(), sources, options, run.dialogs, counts);
   WriteOut(std::to_string(counts.Codes.size()) + " securities, " + std::to_string(counts.Added) +
            " rows added, " + std::to_string(counts.Replaced) + " replaced, " +
            std::to_string(counts.Refused) + " refused\n");
@@ -55,11 +49,13 @@ void AddImport(CLI::App& app, CommandLine& line) {
   const auto dates = std::make_shared<std::string>();
   AddChoice(*command, "--dates", *dates, {"yyyymmdd", "yyyy-mm-dd", "d/m/yyyy"},
             "Form of the dates (default: the first two, told by their shape)");
-  command->add_option("--code", options->Code, "Code of the security (default: the code in the "
-                                               "file, else the file's name)");
-  command->add_option("--type", options->Type,
-                      "Kind of new securities: 1 close with volume, 2 close, 3 advance/decline, "
-                      "4 share (default), 5 index")
+  command->add_option("--code", options->Code,
+                      "Code of the security (default: the code in the "
+                      "file, else the file's name)");
+  command
+      ->add_option("--type", options->Type,
+                   "Kind of new securities: 1 close with volume, 2 close, 3 advance/decline, "
+                   "4 share (default), 5 index")
       ->check(CLI::Range(1, 5));
   command->add_option("--name", options->Name, "Name of a new security");
   command->add_flag("--skip-bad", options->SkipBad, "Leave out rows that can't be read");

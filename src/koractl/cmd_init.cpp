@@ -1,4 +1,5 @@
 #include "base/runtime_error.h"
+#include "indicators/osc_settings.h"
 #include "koractl/run.h"
 
 namespace kora {
@@ -12,11 +13,14 @@ void MakeFolders(const Files& files, const Paths& paths) {
     files.MakeFolder(folder);
   files.Open(NameFilePath(paths.CurrentDataPath), OpenMode::kCreate);
   files.Open(paths.SystemPath + "IndClass.dat", OpenMode::kCreate);
+  WriteColourVariants(files, paths.SystemPath);
 }
 
 int Init(const CommandLine& line) {
   Run run(line);
   Session& session = run.session;
+  session.files.MakeFolder("c:\\");  // a home that is not there yet can't be locked
+  const auto held = session.files.lock().Hold();
   if (session.ini.Exists()) {
     // The program with windows, started on an empty home, leaves settings alone.
     run.Open();
@@ -29,7 +33,11 @@ int Init(const CommandLine& line) {
   SetDefaultPaths(paths, "C:");
   MakeFolders(session.files, paths);
   // The settings file last: it is what makes a folder an installation.
-  WriteDefaultSettings(session.ini);
+  {
+    const SettingsFile::Batch batch(session.ini);
+    WriteDefaultSettings(session.ini);
+    WriteDefaultOscPeriods(session.ini);
+  }
   if (!session.ini.Exists())
     throw RunTimeError(kPathAccess, "Kora.ini can't be written in " + session.files.home());
   run.Open();  // makes the folders of saved charts and notes

@@ -1,10 +1,9 @@
-#include <filesystem>
 #include <memory>
 
 #include "chart/script_player.h"
 #include "koractl/options.h"
-#include "koractl/picture_app.h"
 #include "koractl/picture_output.h"
+#include "koractl/pictures/pictures.h"
 
 namespace kora {
 namespace {
@@ -23,10 +22,10 @@ int Play(const CommandLine& line, const PlayOptions& o) {
   Run run(line);
   run.Open();
   Session& s = run.session;
-  const std::string file = s.files.DosPath(std::filesystem::absolute(o.file).string());
-  const PictureApp app;
+  const std::string file = s.files.DosPath(run.HostPathOf(o.file));
+  const auto pictures = LoadPictures();
   const std::string bytes =
-      MakePicture(PictureKindOf(o.out), size, [&](Surface& surface, Surface*) {
+      pictures->Make(PictureKindOf(o.out), size, [&](Surface& surface, Surface*) {
         surface.SetBackColour(s.colours[kBackground]);
         if (!ShowSavedChart(s.files, run.dialogs, surface, s.settings.fonts, s.colours, file))
           throw Abandoned();

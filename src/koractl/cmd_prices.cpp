@@ -13,7 +13,7 @@ int Prices(const CommandLine& line, const std::string& code) {
   run.Locate(code);
   Table table("Rec Date Open High Low Close Volume AdjFactor AdjDesc");
   try {
-    const PriceFile file(run.session.files, run.session.current.CurrentDataFile);
+    const PriceFile file(run.session.files, run.PriceFilePath());
     std::int32_t number = 0;
     for (const PriceRec& rec : file.ReadAll()) {
       table.Number(++number).Text(rec.RecDate.raw());
@@ -22,7 +22,7 @@ int Prices(const CommandLine& line, const std::string& code) {
       table.Number(float(rec.AdjFactor)).Text(rec.AdjDesc.raw()).EndRow();
     }
   } catch (const RunTimeError& e) {
-    run.AbandonFile(e, {.file = run.DataFileName()});
+    run.AbandonFile(e, {.file = run.session.current.PriceFileName});
   }
   table.Print();
   return kDone;

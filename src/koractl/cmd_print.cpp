@@ -1,18 +1,17 @@
-#include <filesystem>
 #include <memory>
 
 #include "base/host_files.h"
 #include "base/text.h"
 #include "chart/chart_printing.h"
 #include "koractl/chart_options.h"
-#include "koractl/picture_app.h"
 #include "koractl/picture_output.h"
-#include "platform/qt/qt_printer.h"
+#include "koractl/pictures/pictures.h"
 
 namespace kora {
 namespace {
 
 struct PrintOptions : ChartOptions {
+  std::string code;  // or the name of a saved chart
   std::string out;
 };
 
@@ -28,15 +27,17 @@ int Print(const CommandLine& line, const PrintOptions& o) {
   std::string file;
   if (IsSavedChart(o.code)) {
     run.Open(Words(o));
-    file = s.files.DosPath(std::filesystem::absolute(o.code).string());
+    file = s.files.DosPath(run.HostPathOf(o.code));
   } else {
-    ComposeScript(run, o, OpenChart(run, o), size, script);
+    OpenCharts(run, o);
+    ComposeScript(run, o, FindChart(run, o, o.code), size, script);
   }
 
-  const PictureApp app;
-  QtPrinter printer([&](const std::string& bytes) { WriteHostFile(s.files.io(), o.out, bytes); });
-  printer.SetDevice(QtPrinter::kPdfPrinter);
-  const ChartPrintServices services{s.files, run.dialogs, printer, s.settings.fonts, s.colours, {}};
+  const auto pictures = LoadPictures();
+  const auto printer = pictures->PdfPrinter(
+      [&](const std::string& bytes) { WriteHostFile(s.files.io(), o.out, bytes); });
+  const ChartPrintServices services{s.files,          run.dialogs, *printer,
+                                    s.settings.fonts, s.colours,   {}};
   const PrintSetup setup = PrintSetupFrom(s.settings, s.printer);
   const ChartSize chart{size.width, size.height + size.panel};
   const bool printed = file.empty() ? PrintChartScript(services, setup, chart, script.text())

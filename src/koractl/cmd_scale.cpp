@@ -50,7 +50,8 @@ void AddScale(CLI::App& app, CommandLine& line) {
   auto* top = command->add_option("--top", options->top, "Manual scale top")->type_name("T");
   base->needs(top);
   top->needs(base);
-  command->callback([&line, options] { line.run = [&line, options] { return Scale(line, *options); }; });
+  command->callback(
+      [&line, options] { line.run = [&line, options] { return Scale(line, *options); }; });
 }
 
 }  // namespace kora

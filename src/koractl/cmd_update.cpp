@@ -1,6 +1,8 @@
 #include <algorithm>
 #include <memory>
+#include <optional>
 
+#include "adjust/bulletins.h"
 #include "base/text.h"
 #include "koractl/run.h"
 #include "koractl/table.h"
@@ -13,8 +15,8 @@ int Downloads(const CommandLine& line) {
   Run run(line);
   run.Open();
   DownloadEntries entries;
-  const ListResult result = BuildDownloadList(run.session.files, run.session.settings.download,
-                                              run.dialogs, entries);
+  const ListResult result =
+      BuildDownloadList(run.session.files, run.session.settings.download, run.dialogs, entries);
   if (result == ListResult::kStopped) return kAbandoned;
   Table table("File");
   for (const std::string& entry : entries) table.Text(ToAnsi(entry)).EndRow();
@@ -22,7 +24,7 @@ int Downloads(const CommandLine& line) {
   return kDone;
 }
 
-int Update(const CommandLine& line, const std::string& name, bool all) {
+int Update(const CommandLine& line, const std::optional<std::string>& name, bool all) {
   Run run(line);
   run.Open();
   Session& session = run.session;
@@ -30,20 +32,22 @@ int Update(const CommandLine& line, const std::string& name, bool all) {
   if (BuildDownloadList(session.files, session.settings.download, run.dialogs, entries) !=
       ListResult::kFilled)
     return kAbandoned;
-  UpdateProgress display(run.dialogs);
+  const auto display = run.dialogs.StartProgress("Update");
+  bool AdjustListGrew = false;
   const UpdateRun update{session.files, session.settings, session.current,
-                         run.dialogs,   session.clock,    display};
+                         run.dialogs,   session.clock,    *display};
   UpdateEnd end;
   if (all) {
     end = UpdateAllDays(update, entries);
   } else {
     auto entry = entries.begin();
-    if (!name.empty())
+    if (name)
       entry = std::find_if(entries.begin(), entries.end(),
-                           [&](const std::string& e) { return EqualNoCase(e, Trim(name)); });
-    if (entry == entries.end()) run.Abandon("File does not exist", "Update");
+                           [&](const std::string& e) { return EqualNoCase(e, Trim(*name)); });
+    if (entry == entries.end()) run.Abandon("File does not exist\n" + *name, "Update");
     end = UpdateOneDay(update, entries, size_t(entry - entries.begin()));
   }
+  if (AdjustListGrew) run.dialogs.Message(kAdjustListGrew, kAdjustListGrewTitle);
   return end == UpdateEnd::kUpdated ? kDone : kAbandoned;
 }
 
@@ -56,15 +60,16 @@ void AddDownloads(CLI::App& app, CommandLine& line) {
 }
 
 void AddUpdate(CLI::App& app, CommandLine& line) {
-  const auto name = std::make_shared<std::string>();
+  const auto name = std::make_shared<std::optional<std::string>>();
   const auto all = std::make_shared<bool>(false);
   CLI::App* command = app.add_subcommand("update", "Take in downloaded files");
-  CLI::Option* entry =
-      command->add_option("NAME", *name, "Entry of the list (default: the first)");
+  // An empty name is a name, not the default.
+  CLI::Option* entry = command->add_option_function<std::string>(
+      "NAME", [name](const std::string& text) { *name = text; },
+      "Entry of the list (default: the first)");
   command->add_flag("--all", *all, "Every entry, in the order of the list")->excludes(entry);
-  command->callback([&line, name, all] {
-    line.run = [&line, name, all] { return Update(line, *name, *all); };
-  });
+  command->callback(
+      [&line, name, all] { line.run = [&line, name, all] { return Update(line, *name, *all); }; });
 }
 
 }  // namespace kora

@@ -1,4 +1,6 @@
 #include <cstdio>
+#include <cstdlib>
+#include <exception>
 #include <new>
 
 #include "base/runtime_error.h"
@@ -11,6 +13,21 @@ namespace {
 
 void Say(const std::string& text) { std::fprintf(stderr, "[KORA] %s\n", text.c_str()); }
 
+// What is thrown where nobody can catch it, in a library's destructor: nearly always that memory
+// gave out. Files are replaced whole, so that an end here leaves none half-written.
+[[noreturn]] void EndAbandoned() {
+  try {
+    if (const auto thrown = std::current_exception()) std::rethrow_exception(thrown);
+  } catch (const std::bad_alloc&) {
+    std::fprintf(stderr, "[KORA] %s\n", ErrorText(kOutOfMemory));
+  } catch (const std::exception& e) {
+    std::fprintf(stderr, "[KORA] %s\n", e.what());
+  } catch (...) {
+    std::fprintf(stderr, "[KORA] Unexpected end\n");
+  }
+  std::_Exit(kAbandoned);
+}
+
 int Usage(const CLI::App& app, const std::string& what) {
   const auto chosen = app.get_subcommands();
   std::fprintf(stderr, "%s\n\n%s", what.c_str(),
@@ -21,6 +38,7 @@ int Usage(const CLI::App& app, const std::string& what) {
 }  // namespace
 
 int main(int argc, char** argv) {
+  std::set_terminate(EndAbandoned);
   CLI::App app("KORA Charting without its windows", "koractl");
   CommandLine line;
   app.require_subcommand(1);
@@ -33,12 +51,53 @@ int main(int argc, char** argv) {
       ->type_name("SECTION.KEY=VALUE")
       ->expected(1)
       ->take_all();
+  app.add_option("--wait", line.wait, "Seconds to wait while another program writes the store")
+      ->type_name("SECONDS")
+      ->capture_default_str()
+      ->check(CLI::Range(0.0, 86400.0));
   std::string answer;
   AddChoice(app, "--answer", answer, {"yes", "no", "ok", "cancel"},
             "Answer to every question that offers it");
-  for (const auto add : {AddInit, AddDemo, AddNames, AddFind, AddPrices, AddBars, AddScale,
-                         AddChart, AddPlay, AddPrint, AddImport, AddDownloads, AddUpdate,
-                         AddMaster})
+  // clang-format off
+  for (const auto add : {
+           AddInit,
+           AddDemo,
+           AddNames,
+           AddFind,
+           AddPrices,
+           AddBars,
+           AddScale,
+           AddChart,
+           AddLines,
+           AddNotes,
+           AddZoom,
+           AddMulti,
+           AddPlay,
+           AddPrint,
+           AddImport,
+           AddDownloads,
+           AddUpdate,
+           AddMaster,
+           AddBulletins,
+           AddAdjust,
+           AddAdjustments,
+           AddScan1,
+           AddScan2,
+           AddScan3,
+           AddStats,
+           AddEnter,
+           AddCheck,
+           AddChangeCode,
+           AddMove,
+           AddBackup,
+           AddRestore,
+           AddExport,
+           AddRemoveDate,
+           AddEditNames,
+           AddCompany,
+           AddSnapshot,
+       })
+    // clang-format on
     add(app, line);
 
   try {
@@ -65,6 +124,8 @@ int main(int argc, char** argv) {
     Say(e.what());
   } catch (const std::bad_alloc&) {
     Say(ErrorText(kOutOfMemory));
+  } catch (const std::exception& e) {
+    Say(e.what());  // of a library: nobody nearer knew better words
   }
   return kAbandoned;
 }

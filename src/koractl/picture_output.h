@@ -3,7 +3,7 @@
 #include <string>
 
 #include "koractl/run.h"
-#include "platform/qt/picture.h"
+#include "platform/picture.h"
 
 // Where a chart goes: the options --size, --scale and --out.
 

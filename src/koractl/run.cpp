@@ -2,6 +2,7 @@
 
 #include <filesystem>
 
+#include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "shell/program_arguments.h"
@@ -10,7 +11,8 @@ namespace kora {
 namespace {
 
 std::string HomeOf(const CommandLine& line) {
-  const std::string home = line.home.empty() ? DefaultHome() : line.home;
+  if (line.home && line.home->empty()) throw UsageError("--home: an empty name is no folder");
+  const std::string home = line.home.value_or(DefaultHome());
   std::error_code error;
   const auto path = std::filesystem::absolute(home, error);
   return error ? home : path.lexically_normal().string();
@@ -19,9 +21,14 @@ std::string HomeOf(const CommandLine& line) {
 }  // namespace
 
 Run::Run(const CommandLine& line) : dialogs(line.answer), session(HomeOf(line), dialogs) {
+  HomeLock& lock = session.files.lock();
+  lock.program = "koractl";
+  lock.wait = std::chrono::milliseconds(CLng(line.wait * 1000));
   for (const std::string& text : line.sets) {
     const auto setting = ParseOverride(text);
     if (!setting) throw UsageError("--set: \"" + text + "\" is no SECTION.KEY=VALUE");
+    if (const std::string why = WhyNotKept(setting->value); !why.empty())
+      throw UsageError("--set: the value of \"" + text + "\" " + why);
     session.ini.Override(setting->section, setting->key, setting->value);
   }
 }
@@ -40,6 +47,14 @@ void Run::Open(const std::string& words) {
   if (!ReadAllSettings(session, words, false)) throw Abandoned();
 }
 
+std::string Run::HostPathOf(const std::string& file) {
+  if (file.empty()) throw UsageError("An empty name is no file");
+  std::error_code error;
+  const auto path = std::filesystem::absolute(file, error);
+  if (error) Abandon(file + ": the working folder is gone", "KORA");
+  return path.string();
+}
+
 void Run::Locate(const std::string& code) {
   session.current.CurrentCode = Trim(code);
   try {
@@ -49,12 +64,7 @@ void Run::Locate(const std::string& code) {
   }
 }
 
-std::string Run::DataFileName() const {
-  return CodeFileName(session.current.Rec.Code.trimmed(), ".WDT");
-}
-
-void Run::AbandonFile(const RunTimeError& error, const ChartFailure& at,
-                      std::string_view title) {
+void Run::AbandonFile(const RunTimeError& error, const ChartFailure& at, std::string_view title) {
   Abandon(ChartFailureText(error.number(), error.what(), at), title);
 }
 

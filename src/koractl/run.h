@@ -28,10 +28,14 @@ struct Run {
 
   const std::string& dataPath() const { return session.settings.paths.CurrentDataPath; }
 
+  // The absolute path of a host file that the user names. An empty name is a usage error; a
+  // working folder that is gone ends the operation.
+  std::string HostPathOf(const std::string& file);
+
   // Finds the security, in any case, or ends the operation: session.current is set.
   void Locate(const std::string& code);
-  // "ORE.WDT" of the security found.
-  std::string DataFileName() const;
+  // DOS path of the price file of the security found.
+  std::string PriceFilePath() const { return dataPath() + session.current.PriceFileName; }
   // Ends the operation in the words that a chart has for a failure with a file.
   [[noreturn]] void AbandonFile(const RunTimeError& error, const ChartFailure& at,
                                 std::string_view title = "KORA");

@@ -16,6 +16,11 @@ Table::Table(std::string_view columns) : text_(columns) {
   text_ += '\n';
 }
 
+Table::Table(const std::vector<std::string>& columns) {
+  for (const std::string& column : columns) Text(ToAnsi(column));
+  EndRow();
+}
+
 void Table::Separate() {
   if (!first_) text_ += '\t';
   first_ = false;

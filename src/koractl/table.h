@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace kora {
 
@@ -12,6 +13,8 @@ class Table {
  public:
   // Column names with blanks between.
   explicit Table(std::string_view columns);
+  // Names that have blanks themselves.
+  explicit Table(const std::vector<std::string>& columns);
 
   // ANSI text of a file: right blanks cut, what would break the line made a blank.
   Table& Text(std::string_view ansi);

@@ -20,9 +20,7 @@ char LetterOf(std::int16_t ChartListNo) {
   return kLetters[size_t(ChartListNo - kFirstChartList)];
 }
 
-std::string Key(std::int16_t ChartListNo) {
-  return std::string("SubList") + LetterOf(ChartListNo);
-}
+std::string Key(std::int16_t ChartListNo) { return std::string("SubList") + LetterOf(ChartListNo); }
 
 std::string OwnName(std::int16_t ChartListNo) {
   return std::string("Chart List ") + LetterOf(ChartListNo);
@@ -124,6 +122,7 @@ std::vector<ListRec> ReadList(const Files& files, const std::string& dataPath,
 void WriteList(const Files& files, const std::string& dataPath, std::int16_t ChartListNo,
                std::span<const ListRec> records) {
   CInt(double(records.size()));
+  const auto held = files.lock().Hold();
   files.WriteAll(ListFilePath(dataPath, ChartListNo), BytesOf(records));
 }
 
@@ -138,12 +137,14 @@ ListCodes CodesOf(std::span<const ListRec> records) {
 
 ListCodes SaveSubList(const Files& files, const std::string& dataPath, std::int16_t ChartListNo,
                       std::span<const std::string> codes) {
+  const auto held = files.lock().Hold();
   ListCodes dropped;
   WriteList(files, dataPath, ChartListNo, NameIndex(files, dataPath).Refreshed(codes, dropped));
   return dropped;
 }
 
 ListCheck CheckAllLists(const Files& files, const std::string& dataPath, std::int16_t last) {
+  const auto held = files.lock().Hold();
   const NameIndex index(files, dataPath);
   ListCheck check;
   for (std::int16_t number = kFirstChartList; number <= last; ++number) {
@@ -179,9 +180,7 @@ void DeleteItems(ListCodes& list, std::span<const size_t> places) {
     list.erase(list.begin() + std::ptrdiff_t(*place));
 }
 
-std::string DeleteQuestion(std::string_view code) {
-  return "Delete " + std::string(code) + "  ?";
-}
+std::string DeleteQuestion(std::string_view code) { return "Delete " + std::string(code) + "  ?"; }
 
 std::string DeleteAllFromQuestion(std::string_view listName) {
   return "Delete all items from " + std::string(listName);

@@ -21,7 +21,7 @@ class SettingsFile;
 
 // Values of ChartListNo.
 enum ChartListNumber : std::int16_t {
-  kFullList = 1,       // all of Names.dat, no list
+  kFullList = 1,  // all of Names.dat, no list
   kFirstChartList = 2,
   kLastUserList = 11,
   kResultList = 12,
@@ -56,7 +56,8 @@ UserListNames GetSubLists(const SettingsFile& user);
 // can't be written.
 bool SaveSLNames(SettingsFile& user, const UserListNames& names);
 
-// ---- List files
+// ---- List files. What writes one holds the home's lock: error 70 (HomeIsHeld) while another
+// program writes the store.
 
 // All records as they stand, with stale and impossible record numbers. A torn record at the end
 // does not count; no file is an empty list. Error 6 for more records than 16 bits number.
@@ -92,16 +93,18 @@ ListCheck CheckAllLists(const Files& files, const std::string& dataPath,
 bool AddCode(ListCodes& list, std::string_view code);
 // The place of a typed code, in any case, among the name file's; nothing when it is not there,
 // which is told as kCodeNotFound.
-std::optional<size_t> FindTypedCode(std::span<const std::string> nameCodes,
-                                    std::string_view typed);
+std::optional<size_t> FindTypedCode(std::span<const std::string> nameCodes, std::string_view typed);
 // Takes out the items at these places; places that are not there are passed over.
 void DeleteItems(ListCodes& list, std::span<const size_t> places);
 
 inline constexpr std::string_view kCodeNotFound = "Code not found";
 inline constexpr std::string_view kDeleteAllItems = "Delete all items ?";
 inline constexpr std::string_view kSaveChanges = "Save changes ?";
-std::string DeleteQuestion(std::string_view code);            // "Delete BHP  ?"
+std::string DeleteQuestion(std::string_view code);             // "Delete BHP  ?"
 std::string DeleteAllFromQuestion(std::string_view listName);  // "Delete all items from " + name
+// Put before a list is replaced that another program wrote since it was shown.
+inline constexpr std::string_view kListChangedOutside =
+    "The list was changed by another program. Save over these changes ?";
 // Asked when a changed list is left: by name, or "List has changed..." where it has none.
 std::string ChangedQuestion(std::string_view listName);
 

@@ -6,18 +6,13 @@
 #include <string>
 #include <string_view>
 
+#include "platform/progress.h"
+
 namespace kora {
 
-enum class Buttons { kOk, kOkCancel, kYesNo, kYesNoCancel, kRetryCancel };
+// kNoYes is Yes and No with No standing: who just goes on has said No.
+enum class Buttons { kOk, kOkCancel, kYesNo, kNoYes, kYesNoCancel, kRetryCancel };
 enum class Answer { kOk, kCancel, kYes, kNo, kRetry };
-
-// How far a long pass has come. Destroying it ends the display.
-class Progress {
- public:
-  virtual ~Progress() = default;
-  // `done` of `total` steps. Lets the window live meanwhile. False when the user asks to stop.
-  virtual bool Step(int done, int total) = 0;
-};
 
 // What the program says to the user and asks of him. One place, so that a command without
 // windows and the tests can answer. Texts are UTF-8 and show as they are, line ends too.
@@ -31,7 +26,7 @@ class Dialogs {
   // Nothing when cancelled; an empty answer counts as cancelled too.
   virtual std::optional<std::string> Prompt(std::string_view text, std::string_view title,
                                             std::string_view standing) = 0;
-  // May be null: nothing is shown, and nobody stops it.
+  // A display of its own, until it is destroyed. Never null.
   virtual std::unique_ptr<Progress> StartProgress(std::string_view title) = 0;
   // The busy pointer. Calls do not nest.
   virtual void SetBusy(bool busy) = 0;

@@ -1,45 +1,20 @@
 #include "platform/processes.h"
 
-#include <filesystem>
-
-#include "base/runtime_error.h"
-
-#ifdef _WIN32
-#include <windows.h>
-#else
-#include <cerrno>
 #include <spawn.h>
 #include <sys/wait.h>
 #include <time.h>
+
+#include <cerrno>
+#include <filesystem>
+
+#include "base/runtime_error.h"
 extern char** environ;
-#endif
 
 namespace kora {
 namespace {
 
 class HostProcesses : public Processes {
  public:
-#ifdef _WIN32
-  int RunAndWait(const std::string& program, const std::vector<std::string>& arguments,
-                 const std::function<void()>& idle) override {
-    std::string line = "\"" + program + "\"";
-    const std::string folder = std::filesystem::path(program).parent_path().string();
-    for (const std::string& a : arguments) line += " \"" + a + "\"";
-    STARTUPINFOA start{};
-    start.cb = sizeof start;
-    PROCESS_INFORMATION process{};
-    if (!CreateProcessA(nullptr, line.data(), nullptr, nullptr, FALSE, 0, nullptr,
-                        folder.empty() ? nullptr : folder.c_str(), &start, &process))
-      throw RunTimeError(kFileNotFound);
-    while (WaitForSingleObject(process.hProcess, 20) == WAIT_TIMEOUT)
-      if (idle) idle();
-    DWORD code = 0;
-    GetExitCodeProcess(process.hProcess, &code);
-    CloseHandle(process.hThread);
-    CloseHandle(process.hProcess);
-    return int(code);
-  }
-#else
   int RunAndWait(const std::string& program, const std::vector<std::string>& arguments,
                  const std::function<void()>& idle) override {
     std::error_code error;
@@ -70,7 +45,6 @@ class HostProcesses : public Processes {
     }
     return WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
   }
-#endif
 };
 
 }  // namespace

@@ -1,5 +1,6 @@
 #include "platform/settings_file.h"
 
+#include <algorithm>
 #include <memory>
 
 #include "base/runtime_error.h"
@@ -8,7 +9,6 @@
 namespace kora {
 namespace {
 
-constexpr size_t kLongestValue = 60;
 constexpr std::uint64_t kLargestFile = 4u << 20;
 
 std::string MapKey(std::string_view section, std::string_view key) {
@@ -40,10 +40,25 @@ bool SameValue(std::string_view a, std::string_view b) {
 
 }  // namespace
 
-SettingsFile::SettingsFile(const Files& files, std::string path)
-    : files_(files), path_(std::move(path)) {}
+std::string WhyNotKept(std::string_view value, size_t longest) {
+  const std::string kept = OneLine(value);
+  if (kept.size() > longest) return "is longer than " + std::to_string(longest) + " characters";
+  std::string line(value);
+  std::replace_if(
+      line.begin(), line.end(), [](char c) { return c == '\r' || c == '\n' || c == '\0'; }, ' ');
+  if (FromAnsi(kept) != Trim(line)) return "has characters that the settings can't hold";
+  return {};
+}
+
+SettingsFile::SettingsFile(const Files& files, std::string path, size_t longestValue)
+    : files_(files), path_(std::move(path)), longest_(longestValue) {}
 
 bool SettingsFile::Exists() const { return files_.CheckFile(path_); }
+
+std::string SettingsFile::Fault() const {
+  Load();
+  return readable_ ? std::string() : fault_;
+}
 
 void SettingsFile::Load() const {
   if (dirty_) return;  // a batch goes on with what it gathered
@@ -67,8 +82,9 @@ void SettingsFile::Load() const {
   std::string text;
   try {
     text = files_.ReadAll(path_, kLargestFile);
-  } catch (const RunTimeError&) {
+  } catch (const RunTimeError& e) {
     readable_ = false;  // it has no keys, and must not be replaced by the few that are written
+    fault_ = status.size > kLargestFile && !status.folder ? "The file is too large" : e.what();
     return;
   }
   LineReader reader(text);
@@ -101,7 +117,7 @@ std::string SettingsFile::GetSetting(std::string_view section, std::string_view 
     const std::string_view line = lines_[it->second];
     value = Trim(line.substr(line.find('=') + 1));
   }
-  value = Trim(value.substr(0, kLongestValue));
+  value = Trim(value.substr(0, longest_));
   return value.empty() ? std::string(kUnknown) : FromAnsi(value);
 }
 
@@ -119,8 +135,10 @@ bool SettingsFile::PutSetting(std::string_view section, std::string_view key,
   const std::string line = keyName + "=" + OneLine(value);
   if (const auto it = index_.find(mapKey); it != index_.end()) {
     if (lines_[it->second] == line) return true;
+    if (!WhyNotKept(value, longest_).empty()) return false;
     lines_[it->second] = line;
   } else {
+    if (!WhyNotKept(value, longest_).empty()) return false;
     const std::string name = LCase(sectionName);
     size_t at;
     if (const auto s = sections_.find(name); s != sections_.end()) {

@@ -28,8 +28,10 @@ std::vector<std::string> Drives(const Files& files) {
   for (char letter = 'A'; letter <= 'Z'; ++letter) {
     const std::string drive{letter, ':'};
     if (!IsFolder(files, drive + "\\")) continue;
-    if (letter == 'C') drives.insert(drives.begin(), drive);
-    else drives.push_back(drive);
+    if (letter == 'C')
+      drives.insert(drives.begin(), drive);
+    else
+      drives.push_back(drive);
   }
   return drives;
 }

@@ -33,9 +33,8 @@ class Section {
   }
   float Single(std::string_view key) const {
     const double value = Number(key);
-    return std::fabs(value) <= double(std::numeric_limits<float>::max())
-               ? static_cast<float>(value)
-               : 0;
+    return std::fabs(value) <= double(std::numeric_limits<float>::max()) ? static_cast<float>(value)
+                                                                         : 0;
   }
   bool Flag(std::string_view key, bool whenOther = false) const {
     return SettingBool(Raw(key), whenOther);
@@ -96,6 +95,8 @@ void ReadCharts(const SettingsFile& file, ChartSettings& charts) {
   charts.WeekFactor = section.Number("WeekFactor");
   if (charts.WeekFactor < 4 || charts.WeekFactor > 5.2) charts.WeekFactor = 4.75;
   charts.StopLoss = section.Flag("StopLoss");
+  charts.DarkPaper = section.Flag("DarkPaper");
+  charts.FitSide = section.Flag("FitSide");
   charts.StopLossPct = section.Single("SL Percent");
 }
 
@@ -130,8 +131,6 @@ void ReadMovingAverageSet(std::string_view list, std::array<std::int16_t, 12>& s
 
 void ReadOscillators(const SettingsFile& file, OscSettings& osc) {
   const Section section(file, "OscDef");
-  for (const OscKey& key : OscKeys())
-    osc.*key.value = {section.Short(key.daily), section.Short(key.twin)};
   osc.CompFile = section.Text("CompFile");
   osc.BCCalTp = section.Flag("BCCalTp");
   osc.LCalTp = section.Flag("LCalTp");
@@ -206,7 +205,12 @@ CommandWords ParseCommandWords(std::string_view commandLine) {
   return words;
 }
 
-bool ReadPaths(SettingsFile& file, const Files& files, Dialogs& dialogs, Settings& settings) {
+bool ReadSettings(SettingsFile& file, const Files& files, Dialogs& dialogs, Settings& settings) {
+  if (const std::string fault = file.Fault(); !fault.empty()) {
+    // Without its settings the program would work on, on the data of some other folder.
+    dialogs.Message("Kora.ini in " + files.home() + " can't be read: " + fault, "KORA");
+    return false;
+  }
   ReadDownload(file, settings.download);
   ReadCharts(file, settings.charts);
   ReadFonts(file, settings.fonts);
@@ -246,8 +250,7 @@ void SavePaths(SettingsFile& file, Settings& settings) {
   file.PutSetting("Download", "DLPath", settings.download.DLPath);
 }
 
-bool FindSystemDrive(SettingsFile& file, const Files& files, Dialogs& dialogs,
-                     Settings& settings) {
+bool FindSystemDrive(SettingsFile& file, const Files& files, Dialogs& dialogs, Settings& settings) {
   std::string drive = settings.paths.WindowsPath.substr(0, 2);
   if (!files.CheckFile(drive + "\\korawin\\kora32.exe")) {
     do {
@@ -274,8 +277,14 @@ void SetDefaultPaths(Paths& paths, const std::string& drive) {
   DeriveFolders(paths);
 }
 
+void WriteEasings(SettingsFile& file) {
+  const SettingsFile::Batch batch(file);
+  for (const char* key : {"DarkPaper", "FitSide"}) file.PutSetting("Charts", key, "True");
+}
+
 void WriteDefaultSettings(SettingsFile& file) {
   const SettingsFile::Batch batch(file);
+  WriteEasings(file);
   Paths paths;
   SetDefaultPaths(paths, "c:");
   WritePaths(file, paths);
@@ -299,6 +308,7 @@ void WriteDefaultSettings(SettingsFile& file) {
       {"Charts", "Spacing", "2"},
       {"Charts", "Bands", "0"},
       {"Charts", "AutoOsc", "False"},
+      {"Charts", "KeepOsc", "True"},
       {"Charts", "List", "1"},
       {"Charts", "AvOne", "False"},
       {"Charts", "AvTwo", "False"},
@@ -332,10 +342,6 @@ void WriteDefaultSettings(SettingsFile& file) {
   };
   for (const Default& d : kDefaults) file.PutSetting(d.section, d.key, d.value);
 
-  for (const OscKey& key : OscKeys()) {
-    file.PutSetting("OscDef", key.daily, Str(std::int32_t(key.defaultDaily)));
-    file.PutSetting("OscDef", key.twin, Str(std::int32_t(key.defaultTwin)));
-  }
   for (const char* flag :
        {"BCCalTp", "LCalTp", "VCalTp", "CutVols", "ShowOsc", "FXRev", "FillIn", "RFAve"})
     file.PutSetting("OscDef", flag, "False");

@@ -4,6 +4,7 @@
 #include <array>
 
 #include "base/numbers.h"
+#include "base/version.h"
 
 namespace kora {
 namespace {
@@ -86,7 +87,7 @@ bool DisabledByLongTask(std::string_view menu) {
 }
 
 std::string MainTitle(const Paths& paths) {
-  return "KORA Charting 7F   -   Current Data Folder " + paths.CurrentDataPath;
+  return std::string(kProgramTitle) + "   -   Current Data Folder " + paths.CurrentDataPath;
 }
 
 MainSize MainWindowSize(std::string_view height, std::string_view width) {

@@ -1,5 +1,7 @@
 #include "shell/program_arguments.h"
 
+#include "platform/settings_file.h"
+
 namespace kora {
 
 std::optional<ProgramArguments::Override> ParseOverride(std::string_view text) {
@@ -29,12 +31,16 @@ std::optional<ProgramArguments> ParseProgramArguments(const std::vector<std::str
       return std::nullopt;
     }
     std::string value;
-    if (equals != argument.npos) value = argument.substr(equals + 1);
-    else if (i + 1 < arguments.size()) value = arguments[++i];
+    if (equals != argument.npos)
+      value = argument.substr(equals + 1);
+    else if (i + 1 < arguments.size())
+      value = arguments[++i];
     if (name == "--home") {
       out.home = value;
       if (value.empty()) fault = "--home needs a folder";
     } else if (auto override = ParseOverride(value)) {
+      const std::string why = WhyNotKept(override->value);
+      if (!why.empty()) fault = "--set: the value of \"" + value + "\" " + why;
       out.overrides.push_back(*override);
     } else {
       fault = "--set needs SECTION.KEY=VALUE";

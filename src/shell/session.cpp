@@ -2,12 +2,36 @@
 
 #include <cstdlib>
 
+#include "base/host_file_set.h"
 #include "base/runtime_error.h"
+#include "indicators/osc_settings.h"
 
 namespace kora {
 namespace {
 
 constexpr std::string_view kWindowsPath = "C:\\WINDOWS\\";
+
+// Files that a program changed together when it died. While another writes them, or where they
+// can't be written, they wait for the next who writes.
+void FinishInterruptedSet(const Files& files) {
+  try {
+    if (files.io().Status(SetJournalOf(files.home())).exists) {
+      const auto held = files.lock().Hold();
+    }
+  } catch (const RunTimeError&) {
+  }
+}
+
+// What a new installation has besides its folders.
+void MakeFirst(Session& session) {
+  WriteEasings(session.ini);
+  session.settings.charts.DarkPaper = session.settings.charts.FitSide = true;
+  try {
+    WriteColourVariants(session.files, session.settings.paths.SystemPath);
+  } catch (const RunTimeError&) {
+    // A program folder that can't be written still shows charts.
+  }
+}
 
 }  // namespace
 
@@ -15,7 +39,7 @@ Session::Session(std::string home, Dialogs& dialogsIn, Io& io, const Clock& cloc
                  Processes& processesIn)
     : files(std::move(home), io),
       ini(files, std::string(kWindowsPath) + "Kora.ini"),
-      user(files, std::string(kWindowsPath) + "KoraUser.ini"),
+      user(files, std::string(kWindowsPath) + "KoraUser.ini", kLongestUserValue),
       dialogs(dialogsIn),
       clock(clockIn),
       processes(processesIn) {
@@ -37,27 +61,31 @@ std::string DefaultHome() {
     return std::string(value ? value : "");
   };
   if (const std::string home = variable("KORA_HOME"); !home.empty()) return home;
-#ifdef _WIN32
-  return variable("LOCALAPPDATA") + "\\kora";
-#else
   if (const std::string data = variable("XDG_DATA_HOME"); !data.empty()) return data + "/kora";
   return variable("HOME") + "/.local/share/kora";
-#endif
+}
+
+bool ReadSettingsAnew(Session& session) {
+  if (!ReadSettings(session.ini, session.files, session.dialogs, session.settings)) return false;
+  ReadOscPeriods(session.ini, session.settings.osc);
+  return true;
 }
 
 bool ReadAllSettings(Session& session, std::string_view commandLine, bool askPrinter) {
   Settings& settings = session.settings;
   settings.words = ParseCommandWords(commandLine);
   settings.paths.WindowsPath = kWindowsPath;
-  if (!ReadPaths(session.ini, session.files, session.dialogs, settings)) return false;
-  for (const std::string* folder :
-       {&settings.paths.ChartMiscPath, &settings.paths.ChartSavePath}) {
+  FinishInterruptedSet(session.files);
+  const bool first = !session.ini.Exists();
+  if (!ReadSettingsAnew(session)) return false;
+  for (const std::string* folder : {&settings.paths.ChartMiscPath, &settings.paths.ChartSavePath}) {
     try {
       if (!session.files.IsFolder(*folder)) session.files.MakeFolder(*folder);
     } catch (const RunTimeError&) {
       // A program folder that can't be written still shows charts.
     }
   }
+  if (first) MakeFirst(session);
   LoadUserColours(session.files, settings.paths.SystemPath, session.colours);
   session.printer = ReadPrinterColours(session.files, settings.paths.SystemPath);
   if (!session.printer.asked && askPrinter)

@@ -20,21 +20,19 @@ const char* QuestionFor(int service) {
   }
 }
 
-bool EndsWith(std::string_view name, std::string_view ending) {
-  return name.size() > ending.size() &&
-         EqualNoCase(name.substr(name.size() - ending.size()), ending);
-}
-
 }  // namespace
 
-std::optional<std::string> WaitingDownloads(const Files& files,
-                                            const DownloadSettings& download) {
+std::optional<std::string> WaitingDownloads(const Files& files, const DownloadSettings& download) {
   const char* question = QuestionFor(download.DataService);
   if (!question || Trim(download.DLPath).empty()) return std::nullopt;
   // Internet data may come under its own ending and is renamed when it is taken in.
-  const bool asx = download.DataService == 4 && EndsWith(download.InternetDLfmt, ".ASX");
-  for (const std::string& name : files.List(WithBackslash(download.DLPath)))
-    if (EndsWith(name, ".d") || (asx && EndsWith(name, ".asx"))) return question;
+  const bool asx = download.DataService == 4 && EndsNoCase(download.InternetDLfmt, ".ASX");
+  for (const std::string& name : files.List(WithBackslash(download.DLPath))) {
+    const auto is = [&name](std::string_view ending) {
+      return name.size() > ending.size() && EndsNoCase(name, ending);
+    };
+    if (is(".d") || (asx && is(".asx"))) return question;
+  }
   return std::nullopt;
 }
 

@@ -16,7 +16,6 @@ std::optional<std::string> WaitingDownloads(const Files& files, const DownloadSe
 
 // Looks for waiting files and asks whether to take them in. True when the user wants to. A
 // folder that is missing or can't be read is passed over; another failure is told.
-bool AskForWaitingDownloads(const Files& files, const DownloadSettings& download,
-                            Dialogs& dialogs);
+bool AskForWaitingDownloads(const Files& files, const DownloadSettings& download, Dialogs& dialogs);
 
 }  // namespace kora

@@ -134,7 +134,7 @@ class Loader {
  private:
   static constexpr float kNoLow = 100000;
 
-  struct Period {
+  struct OpenPeriod {
     float Open = 0, High = 0, Low = kNoLow, Close = 0;
     float LastGoodClose = 0;
     std::int64_t Volume = 0;
@@ -230,7 +230,7 @@ class Loader {
   std::int64_t volumeSum_ = 0;  // exact: 32767 bars of 32 bits are far from 64
   std::int32_t volumeCount_ = 0;
 
-  Period period_;
+  OpenPeriod period_;
   CalendarMonth month_;
   int weekday_ = 0;  // of the record in hand; stays 0 where periods are months
   std::uint64_t lastMonth_ = 0;
@@ -277,20 +277,18 @@ std::int16_t OverflowRecord(const PriceFile& file, Loader loader, decltype(&Take
 
 }  // namespace
 
-void LoadChartBars(const PriceFile& file, std::string_view chartPeriod, bool volumeOption,
+void LoadChartBars(const PriceFile& file, Period chartPeriod, bool volumeOption,
                    std::int16_t recType, ChartBars& out) {
-  if (chartPeriod != "A" && chartPeriod != "W" && chartPeriod != "M") throw RunTimeError(kBadCall);
   out.CurrentDataRec = 0;
-  if (out.FirstDataRec < 1 || out.LastDataRec < out.FirstDataRec ||
-      out.LastDataRec > file.count())
+  if (out.FirstDataRec < 1 || out.LastDataRec < out.FirstDataRec || out.LastDataRec > file.count())
     throw RunTimeError(kBadRecordNumber);
   out.BarCount = CInt(out.LastDataRec - out.FirstDataRec);
   out.bars.resize(size_t(out.BarCount) + 1);
 
   Loader loader(out, out.bars.data(), volumeOption, recType);
-  const auto takeRun = chartPeriod == "A"   ? TakeDays
-                       : chartPeriod == "W" ? TakePeriods<&Loader::Week>
-                                            : TakePeriods<&Loader::Month>;
+  const auto takeRun = chartPeriod == Period::kDaily    ? TakeDays
+                       : chartPeriod == Period::kWeekly ? TakePeriods<&Loader::Week>
+                                                        : TakePeriods<&Loader::Month>;
   std::array<PriceRec, kRecordsPerRead> buffer;
   std::span<PriceRec> run;
   const std::int32_t last = out.LastDataRec;
@@ -300,15 +298,24 @@ void LoadChartBars(const PriceFile& file, std::string_view chartPeriod, bool vol
       file.ReadRun(first, run);
       loader = takeRun(loader, run, first, out.CurrentDataRec);
     }
-    if (chartPeriod != "A") loader.EndPeriods(run.back().RecDate);
+    if (chartPeriod != Period::kDaily) loader.EndPeriods(run.back().RecDate);
   } catch (const RunTimeError& e) {
     if (e.number() == kOverflow)
-      out.CurrentDataRec =
-          OverflowRecord(file, Loader(out, out.bars.data(), volumeOption, recType), takeRun,
-                         out.FirstDataRec, out.LastDataRec);
+      out.CurrentDataRec = OverflowRecord(file, Loader(out, out.bars.data(), volumeOption, recType),
+                                          takeRun, out.FirstDataRec, out.LastDataRec);
     throw;
   }
   loader.Finish(out);
+}
+
+void LoadDailyBars(std::span<const PriceRec> records, std::int32_t first, std::int16_t recType,
+                   ChartBars& out) {
+  if (records.empty()) throw RunTimeError(kBadRecordNumber);
+  out.FirstDataRec = CInt(first);
+  out.LastDataRec = CInt(double(first) + double(records.size()) - 1);
+  out.bars.resize(records.size());
+  TakeDays(Loader(out, out.bars.data(), false, recType), records, first, out.CurrentDataRec)
+      .Finish(out);
 }
 
 }  // namespace kora

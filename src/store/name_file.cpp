@@ -26,7 +26,12 @@ class Busy {
 };
 
 // The count as the 16-bit value that every handle of a record is. Error 6 beyond.
-std::int16_t CountOf(const NameFile& names) { return CInt(names.count()); }
+std::int16_t CountOf(const NameFile& names) {
+  if (names.count() > kMostNames)
+    throw RunTimeError(kOverflow,
+                       Str(names.count()) + " names, and " + Str(kMostNames) + " at most");
+  return CInt(names.count());
+}
 
 }  // namespace
 
@@ -44,7 +49,8 @@ std::int16_t FindCode(const NameFile& names, std::string_view paddedCode, NameRe
   const std::int32_t count = CountOf(names);
   std::array<NameRec, kRecordsPerRead> buffer;
   for (std::int32_t first = 1; first <= count; first += kRecordsPerRead) {
-    const std::span<NameRec> run(buffer.data(), size_t(std::min(kRecordsPerRead, count - first + 1)));
+    const std::span<NameRec> run(buffer.data(),
+                                 size_t(std::min(kRecordsPerRead, count - first + 1)));
     names.ReadRun(first, run);
     for (size_t i = 0; i < run.size(); ++i) {
       if (run[i].Code.raw() != paddedCode) continue;
@@ -55,8 +61,8 @@ std::int16_t FindCode(const NameFile& names, std::string_view paddedCode, NameRe
   return 0;
 }
 
-NameAndClass FindNameByCode(const Files& files, const std::string& dataPath,
-                            std::string_view code, NameRec& record) {
+NameAndClass FindNameByCode(const Files& files, const std::string& dataPath, std::string_view code,
+                            NameRec& record) {
   const std::string path = NameFilePath(dataPath);
   if (!files.CheckFile(path)) return {};
   const NameFile names(files, path);
@@ -68,28 +74,28 @@ bool LocateCurrentCode(const Files& files, const std::string& dataPath, Dialogs&
                        CurrentName& current) {
   if (current.CurrentCode.size() < 6) current.CurrentCode = PadRight(current.CurrentCode, 6);
   current.CurrentCode = UCase(current.CurrentCode);
-  current.CurrentDataFile.clear();
+  current.PriceFileName.clear();
   std::int16_t number = 0;
   {
     const Busy busy(dialogs);
     const NameFile names(files, NameFilePath(dataPath));
     current.NameCount = CountOf(names);
     // A code that can name no file of its own has none, whatever the name file holds.
-    if (IsFileCode(current.CurrentCode))
-      number = FindCode(names, current.CurrentCode, current.Rec);
+    if (IsFileCode(current.CurrentCode)) number = FindCode(names, current.CurrentCode, current.Rec);
   }
   if (number == 0) {
     dialogs.Message("No File For That Name", "Name File");
     return false;
   }
   current.NameRecNo = number;
-  current.CurrentDataFile = dataPath + CodeFileName(current.CurrentCode, ".WDT");
+  current.PriceFileName = CodeFileName(current.CurrentCode, ".WDT");
   return true;
 }
 
 void RewriteCurrentName(const Files& files, const std::string& dataPath, CurrentName& current,
                         const std::function<void(NameRec&)>& change) {
   if (current.NameRecNo < 1) throw RunTimeError(kBadRecordNumber);
+  const auto held = files.lock().Hold();
   NameFile names(files, NameFilePath(dataPath), OpenMode::kReadWrite);
   std::int16_t number = current.NameRecNo;
   NameRec record{};

@@ -17,6 +17,9 @@ class Dialogs;
 
 using NameFile = RecordFile<NameRec>;
 
+// Names that 16 bits number.
+inline constexpr std::int32_t kMostNames = 32767;
+
 // Names.dat of a data folder. It is opened for each operation and closed at once.
 std::string NameFilePath(const std::string& dataPath);
 
@@ -35,23 +38,22 @@ struct NameAndClass {
 // For a title at chart time: the first record whose Code equals the given six bytes, compared
 // as given, so that lower case finds nothing. `record` is filled when found; both texts are
 // empty when not, or when there is no file.
-NameAndClass FindNameByCode(const Files& files, const std::string& dataPath,
-                            std::string_view code, NameRec& record);
+NameAndClass FindNameByCode(const Files& files, const std::string& dataPath, std::string_view code,
+                            NameRec& record);
 
 // The security that stands for every chart routine.
 struct CurrentName {
-  NameRec Rec{};                 // NameRec
-  std::int16_t NameRecNo = 0;    // record last found
-  std::int16_t NameCount = 0;    // records in the file at the last open
+  NameRec Rec{};               // NameRec
+  std::int16_t NameRecNo = 0;  // record last found
+  std::int16_t NameCount = 0;  // records in the file at the last open
   std::string CurrentCode;
-  // The price file: its full DOS path after LocateCurrentCode, its name alone ("ORE.WDT") where
-  // chart selection or chart window chose the security; empty when not found.
-  std::string CurrentDataFile;
+  // The price file within the data folder ("ORE.WDT"); empty when no security was found.
+  std::string PriceFileName;
 };
 
-// Pads and upper-cases CurrentCode, finds its record and sets CurrentDataFile to data folder +
-// code + ".WDT". Not found, or a code that can name no file (IsFileCode): the message "No File
-// For That Name" and an empty CurrentDataFile; the record last found stays.
+// Pads and upper-cases CurrentCode, finds its record and sets PriceFileName to the code
+// + ".WDT". Not found, or a code that can name no file (IsFileCode): the message "No File
+// For That Name" and an empty PriceFileName; the record last found stays.
 // Also returns whether it was found. Errors 53, 75, 76 when Names.dat can't be opened.
 bool LocateCurrentCode(const Files& files, const std::string& dataPath, Dialogs& dialogs,
                        CurrentName& current);
@@ -59,7 +61,8 @@ bool LocateCurrentCode(const Files& files, const std::string& dataPath, Dialogs&
 // Writes the current security's record in its place, with what `change` does to it; the rest
 // stays as the file has it now, and current.Rec becomes what was written. A record that has
 // moved meanwhile is found by its code. Error 63 when the security is no longer in the file, or
-// none is current; 53, 75, 76 when the file can't be opened.
+// none is current; 53, 75, 76 when the file can't be opened, 70 (HomeIsHeld) while another program
+// writes the store.
 void RewriteCurrentName(const Files& files, const std::string& dataPath, CurrentName& current,
                         const std::function<void(NameRec&)>& change);
 
@@ -81,11 +84,15 @@ std::string SortKey(const NameRec& record, NameSort mode);
 // The records in sorted order, those with NameStatus 1 left out.
 std::vector<NameRec> SortedNames(std::span<const NameRec> records, NameSort mode);
 
+// Replaces a name file as a whole. Error 6 for more records than 16 bits number.
+void WriteNames(const Files& files, const std::string& path, std::span<const NameRec> records);
+
 // Sorts the file, dropping records with NameStatus 1. With fewer than two records the file is
-// left as it is. Works over TEMP.WK1 and renames it to Names.DAT; a failure leaves the old file.
+// left as it is. A failure leaves the old file. Error 70 (HomeIsHeld) while another program writes
+// the store.
 void SortNameFile(const Files& files, const std::string& dataPath, NameSort mode);
 
-// The editor's sort of its own copy: Temp.Wk2 by way of Temp.Wk1.
+// The editor's sort of its own copy, Temp.Wk2.
 void SortEditorCopy(const Files& files, const std::string& dataPath, NameSort mode);
 
 // What is wrong with a row of the editor, or nothing.

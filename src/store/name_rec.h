@@ -9,7 +9,7 @@ namespace kora {
 
 // Kinds of data a price file holds.
 enum RecTypeValue : std::int16_t {
-  kCloseVolume = 1,     // close with volume
+  kCloseVolume = 1,  // close with volume
   kCloseOnly = 2,
   kAdvanceDecline = 3,  // High is Rises, Low is Falls, Close the cumulative total
   kShare = 4,           // dollars
@@ -19,23 +19,23 @@ enum RecTypeValue : std::int16_t {
 #pragma pack(push, 1)
 // One record of Names.dat, 96 bytes, little-endian, texts ANSI and blank padded.
 struct NameRec {
-  std::int16_t NameStatus;   // 0 normal, 1 deleted, 9 marked by the adjustment list
-  FixedText<6> Code;         // upper case
-  std::int16_t RecType;      // 1 to 5
-  FixedText<35> Name;        // title on the chart
+  std::int16_t NameStatus;  // 0 normal, 1 deleted, 9 marked by the adjustment list
+  FixedText<6> Code;        // upper case
+  std::int16_t RecType;     // 1 to 5
+  FixedText<35> Name;       // title on the chart
   FixedText<15> OtherDetails;
-  float Base;                // manual scale; 0 none set
+  float Base;  // manual scale; 0 none set
   float Top;
-  float PFInc;               // point-and-figure box; 0 compute one
-  float MinMove;             // always written as 0.05
-  std::int16_t BandUp;       // percent; outside 1 to 100 means 5
+  float PFInc;          // point-and-figure box; 0 compute one
+  float MinMove;        // always written as 0.05
+  std::int16_t BandUp;  // percent; outside 1 to 100 means 5
   std::int16_t BandDown;
   std::int16_t BollPeriods;
   std::int16_t BollWidth;
-  std::int16_t Category;     // 0 to 99
-  FixedText<1> Id;           // source letter
-  FixedText<3> IndClass;     // three digits
-  FixedText<6> NameSpare;    // copied unchanged
+  std::int16_t Category;   // 0 to 99
+  FixedText<1> Id;         // source letter
+  FixedText<3> IndClass;   // three digits
+  FixedText<6> NameSpare;  // copied unchanged
 };
 #pragma pack(pop)
 

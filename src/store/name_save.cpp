@@ -3,7 +3,6 @@
 #include "base/text.h"
 #include "platform/dialogs.h"
 #include "store/name_file.h"
-#include "store/work_file.h"
 
 namespace kora {
 namespace {
@@ -43,9 +42,8 @@ bool TakeBackup(const Files& files, const std::string& dataPath, Dialogs& dialog
                                                              : "Drive door open";
         if (dialogs.Ask(text, kSaveTitle, Buttons::kRetryCancel) == Answer::kRetry) continue;
       } else {
-        dialogs.Message(
-            FailureText(e.number(), Str(std::int32_t(e.number())) + " Cannot continue"),
-            kSaveTitle);
+        dialogs.Message(FailureText(e.number(), Str(std::int32_t(e.number())) + " Cannot continue"),
+                        kSaveTitle);
       }
       return false;
     }
@@ -67,8 +65,9 @@ std::optional<RowFault> CheckRows(std::span<NameRec> rows) {
 
 bool SaveNames(const Files& files, const std::string& dataPath, std::span<const NameRec> rows,
                Dialogs& dialogs) {
-  if (!TakeBackup(files, dataPath, dialogs)) return false;
   try {
+    const auto held = files.lock().Hold();
+    if (!TakeBackup(files, dataPath, dialogs)) return false;
     std::vector<NameRec> records;
     records.reserve(rows.size());
     for (const NameRec& row : rows) {
@@ -80,9 +79,11 @@ bool SaveNames(const Files& files, const std::string& dataPath, std::span<const 
     CInt(double(records.size()));  // record numbers are 16 bits
     // The rows are put in order before they are written, once, beside the old file: until the
     // new one is whole the old one is in its place, and a failure has nothing to bring back.
-    ReplaceThrough(files, dataPath + "TEMP.WK1", NameFilePath(dataPath),
-                   SortedNames(records, NameSort::kCategory));
+    WriteNames(files, NameFilePath(dataPath), SortedNames(records, NameSort::kCategory));
     return true;
+  } catch (const HomeIsHeld& e) {
+    dialogs.Message(e.what(), kSaveTitle);
+    return false;
   } catch (const RunTimeError& e) {
     dialogs.Message(FailureText(e.number(), "Unable to save data"), kSaveTitle);
     return false;

@@ -1,24 +1,20 @@
 #include "base/numbers.h"
-#include "base/runtime_error.h"
 #include "base/text.h"
 #include "store/name_file.h"
-#include "store/work_file.h"
 
 namespace kora {
 namespace {
 
 constexpr size_t kKeySize = 12;
 
-// Sorts the records of `path` through the work file.
-void SortFile(const Files& files, const std::string& path, const std::string& workPath,
-              NameSort mode) {
+void SortFile(const Files& files, const std::string& path, NameSort mode) {
   std::vector<NameRec> records;
   {
     const NameFile names(files, path);
     if (CInt(names.count()) < 2) return;
     records = names.ReadAll();
   }
-  ReplaceThrough(files, workPath, path, SortedNames(records, mode));
+  WriteNames(files, path, SortedNames(records, mode));
 }
 
 }  // namespace
@@ -68,31 +64,18 @@ std::vector<NameRec> SortedNames(std::span<const NameRec> records, NameSort mode
   return out;
 }
 
-void ReplaceThrough(const Files& files, const std::string& workPath, const std::string& path,
-                    std::span<const NameRec> records) {
-  try {
-    {
-      NameFile work(files, workPath, OpenMode::kReplace);
-      work.WriteRun(1, records);
-      work.Flush();
-    }
-    files.Rename(workPath, path);
-  } catch (const RunTimeError&) {
-    try {
-      if (files.CheckFile(workPath) && !files.IsFolder(workPath)) files.Remove(workPath);
-    } catch (const RunTimeError&) {
-      // The first failure is the one to tell.
-    }
-    throw;
-  }
+void WriteNames(const Files& files, const std::string& path, std::span<const NameRec> records) {
+  CInt(double(records.size()));
+  files.WriteAll(path, {reinterpret_cast<const char*>(records.data()), records.size_bytes()});
 }
 
 void SortNameFile(const Files& files, const std::string& dataPath, NameSort mode) {
-  SortFile(files, NameFilePath(dataPath), dataPath + "TEMP.WK1", mode);
+  const auto held = files.lock().Hold();
+  SortFile(files, NameFilePath(dataPath), mode);
 }
 
 void SortEditorCopy(const Files& files, const std::string& dataPath, NameSort mode) {
-  SortFile(files, dataPath + "Temp.Wk2", dataPath + "Temp.Wk1", mode);
+  SortFile(files, dataPath + "Temp.Wk2", mode);
 }
 
 }  // namespace kora

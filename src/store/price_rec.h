@@ -11,11 +11,11 @@ namespace kora {
 #pragma pack(push, 1)
 // One trading day of a .WDT price file, 50 bytes, little-endian; oldest first.
 struct PriceRec {
-  FixedText<8> RecDate;   // "yyyymmdd"
+  FixedText<8> RecDate;  // "yyyymmdd"
   float Open;
-  float High;             // RecType 3: Rises
-  float Low;              // RecType 3: Falls
-  float Close;            // RecType 3: Cum.Total
+  float High;   // RecType 3: Rises
+  float Low;    // RecType 3: Falls
+  float Close;  // RecType 3: Cum.Total
   std::int32_t Volume;
   float AdjFactor;        // not 0: an adjustment was applied at this date
   FixedText<14> AdjDesc;  // its text, printed on the chart

@@ -32,13 +32,32 @@ bool IsExpiry(const CalendarDate& date, std::int32_t days) {
   return number >= DayNumber({1, 1, 1}) && number <= DayNumber({9999, 12, 31});
 }
 
+// Blanks, a sign, digits and one point: what Val reads to its end.
+bool IsNumber(std::string_view text) {
+  text = Trim(text);
+  if (!text.empty() && (text.front() == '+' || text.front() == '-')) text.remove_prefix(1);
+  bool digits = false, point = false;
+  for (const char c : text) {
+    if (c >= '0' && c <= '9') {
+      digits = true;
+    } else if (c == '.' && !point) {
+      point = true;
+    } else {
+      return false;
+    }
+  }
+  return digits;
+}
+
 }  // namespace
 
 std::string ReadDayLine(std::string_view line, bool options, DayLine& day) {
   if (line.find('\0') != std::string_view::npos) return " The line is no text";
   const Fields fields = FieldsOf(line);
   day = {};
-  day.code = KeptCode(UCase(Trim(Trim(fields[0]).substr(0, 6))));
+  day.code = Trim(Trim(fields[0]).substr(0, 6));
+  if (const std::string upper = UCase(day.code); KeptCode(upper) != upper)
+    day.code = KeptCode(upper);
   if (day.code.empty()) return {};
   if (!IsFileCode(day.code)) return " The code cannot be the name of a file";
   day.date = Trim(fields[1]);
@@ -63,6 +82,20 @@ std::string ReadDayLine(std::string_view line, bool options, DayLine& day) {
     return " A number is too large";
   }
   return {};
+}
+
+std::vector<std::string> MisreadFields(std::string_view line, bool options) {
+  constexpr std::array<std::string_view, kOptionCommas> names{"",    "",      "Open",   "High",
+                                                              "Low", "Close", "Volume", "spare"};
+  constexpr size_t kClose = 5;
+  std::vector<std::string> out;
+  const Fields fields = FieldsOf(line);
+  for (size_t i = 2; i < names.size(); ++i) {
+    if (IsNumber(fields[i]) || (i != kClose && Trim(fields[i]).empty())) continue;
+    out.push_back(std::string(options && i == 7 ? "days" : names[i]) + " \"" +
+                  ShownLine(fields[i]) + "\" read as " + Str(Val(fields[i])));
+  }
+  return out;
 }
 
 std::string ShownLine(std::string_view line) {

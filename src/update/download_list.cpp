@@ -14,11 +14,6 @@ namespace {
 constexpr std::array<std::string_view, 12> kMonths{"JAN", "FEB", "MAR", "APR", "MAY", "JUN",
                                                    "JUL", "AUG", "SEP", "OCT", "NOV", "DEC"};
 
-bool EndsWith(std::string_view name, std::string_view ending) {
-  return name.size() >= ending.size() &&
-         EqualNoCase(name.substr(name.size() - ending.size()), ending);
-}
-
 std::string_view Part(std::string_view text, size_t from, size_t size) {  // from 1
   return from > text.size() ? std::string_view() : text.substr(from - 1, size);
 }
@@ -28,7 +23,7 @@ std::vector<std::string> FilesEndingIn(const Files& files, const std::string& fo
   std::vector<std::string> out;
   for (const std::string& name : files.List(folder))
     // A host's name may hold what parts the folders of a path: it would name another file.
-    if (EndsWith(name, ending) && name.find('\\') == std::string::npos &&
+    if (EndsNoCase(name, ending) && name.find('\\') == std::string::npos &&
         !files.IsFolder(folder + name))
       out.push_back(name);
   return out;
@@ -73,8 +68,10 @@ std::string EntryKey(std::string_view name) {
   std::string key = year > -1 && year < 30 ? "20" : "19";
   key += Part(name, 6, 2);
   const int month = MonthOfName(Part(name, 3, 3));
-  if (month > 0) key += Format(double(month), "00");
-  else key += Part(name, 3, 3);
+  if (month > 0)
+    key += Format(double(month), "00");
+  else
+    key += Part(name, 3, 3);
   key += Part(name, 1, 2);
   key += Part(name, 8, 4);
   return key;
@@ -100,6 +97,7 @@ int MonthOfName(std::string_view name) {
 }
 
 std::string DownloadErrorText(const RunTimeError& error) {
+  if (dynamic_cast<const HomeIsHeld*>(&error)) return error.what();
   switch (error.number()) {
     case kOutOfMemory:
     case kOutOfTextSpace:
@@ -110,8 +108,7 @@ std::string DownloadErrorText(const RunTimeError& error) {
     case kBadRecordNumber:
     case 64:
     case kPathAccess:
-    case kPathNotFound:
-      return "There is a file access problem. Check directory paths option.";
+    case kPathNotFound: return "There is a file access problem. Check directory paths option.";
     case kDeviceError:
     case kTooManyFiles:
     case kDeviceNotAvailable:
@@ -147,8 +144,7 @@ void RenameInternetFiles(const Files& files, const std::string& folder, int form
 
 DownloadEntries SortedEntries(const std::vector<std::string>& names) {
   std::vector<SortEntry> keys;
-  for (size_t i = 0; i < names.size(); ++i)
-    keys.push_back({std::int32_t(i), EntryKey(names[i])});
+  for (size_t i = 0; i < names.size(); ++i) keys.push_back({std::int32_t(i), EntryKey(names[i])});
   ShellSort(keys);
   DownloadEntries out;
   for (const SortEntry& item : keys) {
@@ -160,8 +156,8 @@ DownloadEntries SortedEntries(const std::vector<std::string>& names) {
   return out;
 }
 
-ListResult BuildDownloadList(const Files& files, const DownloadSettings& download,
-                             Dialogs& dialogs, DownloadEntries& entries) {
+ListResult BuildDownloadList(const Files& files, const DownloadSettings& download, Dialogs& dialogs,
+                             DownloadEntries& entries) {
   entries.clear();
   try {
     const std::string folder = WithBackslash(Trim(download.DLPath));

@@ -25,14 +25,13 @@ enum class ListResult {
 
 // Lists what waits. Files of service 4 whose names have another form are renamed first. Failures
 // are told by number and end the listing.
-ListResult BuildDownloadList(const Files& files, const DownloadSettings& download,
-                             Dialogs& dialogs, DownloadEntries& entries);
+ListResult BuildDownloadList(const Files& files, const DownloadSettings& download, Dialogs& dialogs,
+                             DownloadEntries& entries);
 
 // Renames the files of service 4 to the form "15SEP98.d". `form` is 1 to 6: "YYMMDD.D",
 // "YYMMDD.ASX", "DDMMYY.D", "DDMMYY.ASX", "DDMMYYYY.D", "YYYYMMDD.D". What can't be renamed
 // stays; another form is told.
-void RenameInternetFiles(const Files& files, const std::string& folder, int form,
-                         Dialogs& dialogs);
+void RenameInternetFiles(const Files& files, const std::string& folder, int form, Dialogs& dialogs);
 
 // Sorts names of the list's form by date. Years 0 to 29 are of the 2000s. A name whose month
 // is none is kept as it stands.

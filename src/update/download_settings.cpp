@@ -45,8 +45,8 @@ std::string FolderOnLine(const Files& files, const std::string& path, int number
     while (lines.Next(line)) {
       if (lines.number() != number) continue;
       const std::string_view folder = Trim(line);
-      const bool odd = folder.size() > kLongestFolder ||
-                       std::any_of(folder.begin(), folder.end(), IsControl);
+      const bool odd =
+          folder.size() > kLongestFolder || std::any_of(folder.begin(), folder.end(), IsControl);
       return odd ? std::string() : FromAnsi(folder);
     }
   } catch (const RunTimeError&) {
@@ -56,12 +56,19 @@ std::string FolderOnLine(const Files& files, const std::string& path, int number
 }
 
 // Closes the folders and asks for those that are not there. False while one is empty.
-bool PrepareFolders(const Files& files, std::array<std::string, 6>& folders,
-                    std::string_view title, std::string_view question, Dialogs& dialogs) {
+bool PrepareFolders(const Files& files, std::array<std::string, 6>& folders, std::string_view title,
+                    std::string_view question, Dialogs& dialogs) {
   for (std::string& folder : folders) {
     folder = WithBackslash(Trim(folder));
     if (folder.empty()) {
       dialogs.Message("Paths must be entered for all sections", title);
+      return false;
+    }
+  }
+  for (const std::string& folder : folders) {
+    // Any of them may become the data folder of the settings.
+    if (const std::string why = WhyNotKept(folder); !why.empty()) {
+      dialogs.Message(folder + " " + why, title);
       return false;
     }
   }
@@ -90,52 +97,15 @@ std::array<std::string, 6> Copied(std::span<const std::string, 6> folders) {
 
 }  // namespace
 
-std::string WmPathsFile(const std::string& systemPath) { return systemPath + "WMPaths.lst"; }
-
-WmPaths ReadWmPaths(const Files& files, const std::string& systemPath) {
-  WmPaths out;
-  try {
-    const std::string text = files.ReadAll(WmPathsFile(systemPath), kLargestList);
-    LineReader lines(text);
-    std::string_view line;
-    for (std::string& value : out) {
-      if (!lines.Next(line)) break;
-      value = FromAnsi(Trim(line));
-    }
-  } catch (const RunTimeError&) {
-    // Read as if nothing had been defined, which the user is told where it matters.
-  }
-  return out;
-}
-
-void WriteWmPaths(const Files& files, const std::string& systemPath, const WmPaths& lines) {
-  std::string text;
-  for (const std::string& line : lines) text += ToAnsi(line) + "\r\n";
-  files.WriteAll(WmPathsFile(systemPath), text);
-}
-
-bool WmPathsComplete(const WmPaths& lines) {
-  for (size_t i = 0; i < lines.size(); ++i)
-    if (i != kWmChosen && Trim(lines[i]).empty()) return false;
-  return true;
-}
-
-std::string WmChosenFolder(const WmPaths& lines) {
-  const std::string_view text = Trim(lines[kWmChosen]);
-  if (text.size() != 1 || text[0] < '0' || text[0] > '5') return {};
-  const size_t index = size_t(text[0] - '0');
-  return WithBackslash(Trim(lines[index == 5 ? size_t(kWmSum) : index]));
-}
-
 bool SaveWmPaths(const Files& files, const std::string& systemPath,
                  std::span<const std::string, 6> folders, int chosen, Dialogs& dialogs) {
   auto boxes = Copied(folders);
   if (!PrepareFolders(files, boxes, "W/M Paths", " does not exist. Create this directory ?",
                       dialogs))
     return false;
-  WriteWmPaths(files, systemPath,
-               {boxes[0], boxes[1], boxes[2], boxes[3], boxes[4], Str(std::int32_t(chosen)),
-                boxes[5]});
+  WriteWmPaths(
+      files, systemPath,
+      {boxes[0], boxes[1], boxes[2], boxes[3], boxes[4], Str(std::int32_t(chosen)), boxes[5]});
   return true;
 }
 
@@ -162,9 +132,9 @@ bool SaveWizardFolders(const Files& files, const std::string& systemPath,
 }
 
 LocateCase WizardLocate(const WmPaths& lines, int index, const Paths& paths) {
-  static constexpr const char* kPurposes[] = {
-      "ASX stocks", "Aust Indices", "SFE Futures", "Overseas Data", "Put / Call Options",
-      "Extra stocks"};
+  static constexpr const char* kPurposes[] = {"ASX stocks",         "Aust Indices",
+                                              "SFE Futures",        "Overseas Data",
+                                              "Put / Call Options", "Extra stocks"};
   const auto at = size_t(index);
   const std::string folder = WizardFolders(lines).at(at);
   return {kPurposes[at], folder.size() > 2 ? folder : paths.CurrentDataPath};
@@ -238,6 +208,10 @@ bool SaveServiceChoice(const ServiceChoice& choice, SettingsFile& ini, DownloadS
     dialogs.Message("Path must end with a backslash \\ ", "Download");
     return false;
   }
+  if (const std::string why = WhyNotKept(path); !why.empty()) {
+    dialogs.Message(path + " " + why, "Download");
+    return false;
+  }
   download.DataService = ServiceOfIndex(choice.index);
   download.DLPath = path;
   download.InternetDLfmt = download.DataService == 4 ? choice.InternetDLfmt : "";
@@ -282,6 +256,14 @@ UpdateChoice UpdateChoiceOf(const DownloadSettings& download) {
   return download.NoWarrants ? UpdateChoice::kNoWarrants : UpdateChoice::kAll;
 }
 
+void SaveUpdateChoice(UpdateChoice choice, SettingsFile& ini, DownloadSettings& download) {
+  download.UpdateAll = choice != UpdateChoice::kListed;
+  download.NoWarrants = choice == UpdateChoice::kNoWarrants;
+  const SettingsFile::Batch batch(ini);
+  ini.PutSetting(kSection, "UpdateAll ", download.UpdateAll ? "True" : "False");
+  ini.PutSetting(kSection, "NoWarrants", download.NoWarrants ? "True" : "False");
+}
+
 bool SaveUpdateList(const Files& files, const std::string& systemPath,
                     std::span<const UpdateRow> rows, UpdateChoice& choice, SettingsFile& ini,
                     DownloadSettings& download, Dialogs& dialogs) {
@@ -293,11 +275,14 @@ bool SaveUpdateList(const Files& files, const std::string& systemPath,
     text += code + "," + Str(std::int32_t(inRange ? row.category : 0)) + "," +
             AsField(row.name, true) + "\r\n";
   }
+  const auto held = files.lock().Hold();
   const std::string path = UpdateListFile(systemPath), backup = systemPath + "Update.Bak";
   try {
     // The old list stays in its place until the new one replaces it.
-    if (text.empty()) files.Rename(path, backup);
-    else files.WriteAll(backup, files.ReadAll(path));
+    if (text.empty())
+      files.Rename(path, backup);
+    else
+      files.WriteAll(backup, files.ReadAll(path));
   } catch (const RunTimeError&) {
     // There was no list yet, or its copy has to wait for the next save.
   }
@@ -310,11 +295,7 @@ bool SaveUpdateList(const Files& files, const std::string& systemPath,
         "Update List");
     choice = UpdateChoice::kAll;
   }
-  download.UpdateAll = choice != UpdateChoice::kListed;
-  download.NoWarrants = choice == UpdateChoice::kNoWarrants;
-  const SettingsFile::Batch batch(ini);
-  ini.PutSetting(kSection, "UpdateAll ", download.UpdateAll ? "True" : "False");
-  ini.PutSetting(kSection, "NoWarrants", download.NoWarrants ? "True" : "False");
+  SaveUpdateChoice(choice, ini, download);
   return !text.empty();
 }
 

@@ -11,6 +11,7 @@
 #include "base/files.h"
 #include "settings/locate.h"
 #include "settings/settings.h"
+#include "store/market_folders.h"
 
 // Which data service is in use, where its files land and where the prices are to go.
 
@@ -18,27 +19,7 @@ namespace kora {
 
 class Dialogs;
 
-// ---- Folders of the whole market: WMPaths.lst of the program folder, a value a line
-
-enum WmLine : size_t {
-  kWmAsx = 0,      // all ASX, or Top 500 and 150
-  kWmIndices = 1,
-  kWmFutures = 2,
-  kWmOverseas = 3,
-  kWmOptions = 4,
-  kWmChosen = 5,   // no path: 0 to 5, which folder to view charts from
-  kWmSum = 6,      // extra stocks
-};
-using WmPaths = std::array<std::string, 7>;
-
-std::string WmPathsFile(const std::string& systemPath);
-// Lines that are not there, or a file that can't be read, are empty.
-WmPaths ReadWmPaths(const Files& files, const std::string& systemPath);
-void WriteWmPaths(const Files& files, const std::string& systemPath, const WmPaths& lines);
-// True when all six folders are there, trimmed.
-bool WmPathsComplete(const WmPaths& lines);
-// The folder that line 6 chooses; empty when it is no number from 0 to 5.
-std::string WmChosenFolder(const WmPaths& lines);
+// ---- Folders of the whole market
 
 // Saves the form `WMPath`: `folders` are its boxes 1 to 6 in order (ASX, IDX, SFE, OVS, OPT,
 // SUM), `chosen` 0 to 5. Asks before a folder is made; No leaves it out and goes on. False,
@@ -91,9 +72,9 @@ inline constexpr std::string_view kBadDivisor =
 std::optional<std::int32_t> VolumeDivisorOf(std::string_view text);
 
 struct ServiceChoice {
-  int index = 0;               // of Combo1
-  std::string DLPath;          // may be empty, else ends with "\"
-  std::string InternetDLfmt;   // of service 4 alone
+  int index = 0;              // of Combo1
+  std::string DLPath;         // may be empty, else ends with "\"
+  std::string InternetDLfmt;  // of service 4 alone
   std::int32_t VolumeDivisor = 1;
 };
 // Writes the choice to the settings file and `download`, whose service folders follow. False,
@@ -104,9 +85,9 @@ bool SaveServiceChoice(const ServiceChoice& choice, SettingsFile& ini, DownloadS
 // ---- Which securities an update takes: Update.Lst of the program folder
 
 struct UpdateRow {
-  std::string code;      // upper case
+  std::string code;  // upper case
   std::int16_t category = 0;
-  std::string name;      // UTF-8
+  std::string name;  // UTF-8
 };
 std::string UpdateListFile(const std::string& systemPath);
 // Rows with a code; empty when there is no file. Error 7 beyond 4 MB or 100,000 rows.
@@ -114,6 +95,7 @@ std::vector<UpdateRow> ReadUpdateList(const Files& files, const std::string& sys
 
 enum class UpdateChoice { kAll = 0, kListed = 1, kNoWarrants = 2 };  // Option1 of `INUpList`
 UpdateChoice UpdateChoiceOf(const DownloadSettings& download);
+void SaveUpdateChoice(UpdateChoice choice, SettingsFile& ini, DownloadSettings& download);
 
 // Saves the form `INUpList`: Update.Bak takes the old list, rows with a code are written, and
 // the choice goes to the settings. A failure leaves the old list. An empty list with kListed is

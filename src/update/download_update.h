@@ -1,7 +1,6 @@
 #pragma once
 
 #include <functional>
-#include <memory>
 #include <string>
 #include <string_view>
 
@@ -15,36 +14,6 @@ namespace kora {
 
 class Clock;
 
-// What the update shows while it runs. Nothing, unless a form or a command says where.
-class UpdateDisplay {
- public:
-  virtual ~UpdateDisplay() = default;
-  virtual void ShowState(std::string_view) {}   // Label2
-  virtual void ShowDate(std::string_view) {}    // Label3
-  virtual void ShowTarget(std::string_view) {}  // Label5, the folder that is written to
-  virtual void ShowFirst(std::string_view) {}   // the two progress texts
-  virtual void ShowSecond(std::string_view) {}
-  // Red state, busy pointer, no buttons; and back.
-  virtual void SetRunning(bool) {}
-  // ProgressBar1; the bar hides when SetRunning(false) comes. False when the user wants to stop.
-  virtual bool Step(int, int) { return true; }
-};
-
-// Shows the bar alone, as every long pass has it.
-class UpdateProgress : public UpdateDisplay {
- public:
-  explicit UpdateProgress(Dialogs& dialogs) : dialogs_(dialogs) {}
-  void SetRunning(bool running) override {
-    if (running) bar_ = dialogs_.StartProgress("Update");
-    else bar_.reset();
-  }
-  bool Step(int done, int total) override { return !bar_ || bar_->Step(done, total); }
-
- private:
-  Dialogs& dialogs_;
-  std::unique_ptr<Progress> bar_;
-};
-
 // What an update works with.
 struct UpdateRun {
   const Files& files;
@@ -52,25 +21,38 @@ struct UpdateRun {
   CurrentName& current;  // Rec drives the write of files whose codes are not looked up
   Dialogs& dialogs;
   const Clock& clock;
-  UpdateDisplay& display;
+  Progress& display;  // gets all five lines
   // Merges the bulletins of services 1 and 3 at the end of a day: the folder of Adjust.Lst and
   // the last 7 characters of the base name, empty in service 1.
   std::function<void(const std::string& path, const std::string& baseName)> CheckBulletins = {};
+  // Changes of about so many bytes are held in memory before they are made, as one.
+  size_t mostHeld = 32u << 20;
 };
 
 enum class UpdateEnd {
   kUpdated,
-  kAbandoned,  // told; some or all of the day's files were not taken
-  kNotBegun,   // told; the file is not there, or service 3 lacks a folder: the form stays
-  kStopped,    // by the user, or by a failure that was told; what was written stays
+  kUpdatedInPart,  // off the list; told what was left out of it
+  kAbandoned,      // told; some or all of the day's files were not taken
+  kNotBegun,       // told; the file is not there, service 3 lacks a folder, or another program
+                   // writes the store: the form stays
+  kStopped,        // by the user, or by a failure that was told: the file in hand waits as before
 };
+// Whether the entry is off the list.
+inline bool IsTaken(UpdateEnd end) {
+  return end == UpdateEnd::kUpdated || end == UpdateEnd::kUpdatedInPart;
+}
 
 // Update 1 Day: takes in the entry at `selected` and, unless it was abandoned, takes it off the
 // list.
 //
-// A line that can't be taken refuses its file before anything is written. From then on records
-// are written line by line, each file old or new at any moment; when the run dies the
-// downloaded file is still there, and taking it in again replaces its date throughout.
+// A line that can't be taken refuses its file before anything is written. The day is worked out
+// in memory, written to a journal (Update.Jnl of the program folder) and then made; it is on the
+// disk before the downloaded file leaves the list. A run that is stopped or fails leaves a file
+// as it was; one that dies is finished by the next run, whatever that takes in, in the mode in
+// which it began.
+//
+// Securities that can't take the day (a full price file, a full name file) are left out, and the
+// rest is taken. What was refused, left out or misread is told in one message at the end.
 UpdateEnd UpdateOneDay(const UpdateRun& run, DownloadEntries& entries, size_t selected);
 
 // Update All: every entry in the order of the list, which stays as it was. A file that is

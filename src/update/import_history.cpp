@@ -13,13 +13,14 @@
 
 #include "base/dates.h"
 #include "base/file_set.h"
+#include "base/home_lock.h"
 #include "base/host_files.h"
 #include "base/numbers.h"
 #include "base/record_file.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
-#include "platform/dialogs.h"
 #include "lists/chart_list.h"
+#include "platform/dialogs.h"
 #include "store/name_file.h"
 #include "store/price_rec.h"
 
@@ -29,7 +30,10 @@ namespace {
 constexpr const char* kTitle = "Import";
 constexpr std::uint64_t kLargestFile = 256u << 20;
 constexpr size_t kLongestLine = 4096;
-constexpr int kMostTold = 20;  // bad rows of a file that are told one by one
+// Rows in memory; what is more goes in several steps, each of which is put in place whole.
+constexpr size_t kMostRows = 512u << 20;
+constexpr size_t kMostHeld = 64u << 20;  // bytes of new files in memory
+constexpr int kMostTold = 20;            // bad rows of a file that are told one by one
 
 // What ends the import of a file, in words for the user.
 struct Refused : std::runtime_error {
@@ -48,8 +52,8 @@ constexpr std::array<const char*, kColumns> kColumnNames{"Date",  "Open",   "Hig
 struct Layout {
   char separator = ',';
   std::array<int, kColumns> place{};
-  size_t fields = 0;    // that a row must have
-  bool exact = false;   // and no more
+  size_t fields = 0;   // that a row must have
+  bool exact = false;  // and no more
 };
 
 // The rows of one security.
@@ -118,9 +122,9 @@ bool SplitFields(std::string_view line, char separator, std::vector<std::string_
 
 int ColumnOf(std::string_view name) {
   constexpr std::pair<const char*, Column> names[] = {
-      {"Date", kDate},   {"Open", kOpen},     {"High", kHigh},     {"Low", kLow},
-      {"Close", kClose}, {"Volume", kVolume}, {"Code", kCode},     {"Symbol", kCode},
-      {"Ticker", kCode}, {"Rises", kHigh},    {"Falls", kLow},     {"Cum.Total", kClose}};
+      {"Date", kDate},   {"Open", kOpen},     {"High", kHigh}, {"Low", kLow},
+      {"Close", kClose}, {"Volume", kVolume}, {"Code", kCode}, {"Symbol", kCode},
+      {"Ticker", kCode}, {"Rises", kHigh},    {"Falls", kLow}, {"Cum.Total", kClose}};
   for (const auto& [text, column] : names)
     if (EqualNoCase(name, text)) return column;
   return -1;
@@ -184,8 +188,7 @@ std::string ReadDate(std::string_view text, ImportDates form) {
 float ReadPrice(std::string_view text, Column column, bool negative) {
   const auto value = ParseFloat(text);
   if (!value || (*value < 0 && !negative))
-    throw BadRow("the " + std::string(kColumnNames[column]) + " " + Shown(text) +
-                 " is no price");
+    throw BadRow("the " + std::string(kColumnNames[column]) + " " + Shown(text) + " is no price");
   return *value + 0.0f;  // no negative zero
 }
 
@@ -197,8 +200,7 @@ std::int32_t ReadVolume(std::string_view text) {
       value < 0)
     throw BadRow("the Volume " + Shown(text) + " is no volume");
   value = RoundHalfEven(value);
-  if (value > 2147483647.0)
-    throw BadRow("the Volume " + Shown(text) + " is above 2147483647");
+  if (value > 2147483647.0) throw BadRow("the Volume " + Shown(text) + " is above 2147483647");
   return CLng(value);
 }
 
@@ -220,8 +222,8 @@ PriceRec ReadRow(const Layout& layout, const std::vector<std::string_view>& fiel
     rec.Low = price(kLow, 0);
   } else {
     rec.Open = price(kOpen, rec.Close);
-    rec.High = price(kHigh, std::max(rec.Open, rec.Close));
-    rec.Low = price(kLow, std::min(rec.Open, rec.Close));
+    rec.High = price(kHigh, std::max(float(rec.Open), float(rec.Close)));
+    rec.Low = price(kLow, std::min(float(rec.Open), float(rec.Close)));
   }
   if (has(kVolume) && recType != kCloseOnly) rec.Volume = ReadVolume(field(kVolume));
   return rec;
@@ -272,9 +274,8 @@ class Reader {
     if (fields_.size() < layout_.fields || (layout_.exact && fields_.size() != layout_.fields))
       throw BadRow(std::to_string(fields_.size()) + " fields where " +
                    std::to_string(layout_.fields) + " are wanted");
-    Group& group = GroupFor(layout_.place[kCode] >= 0
-                                ? fields_[size_t(layout_.place[kCode])]
-                                : std::string_view());
+    Group& group = GroupFor(layout_.place[kCode] >= 0 ? fields_[size_t(layout_.place[kCode])]
+                                                      : std::string_view());
     group.rows.push_back(ReadRow(layout_, fields_, options_.Dates, group.recType));
   }
 
@@ -363,15 +364,13 @@ std::string_view BytesOf(const std::vector<T>& records) {
 }
 
 // The file's own name, for messages.
-std::string_view NameOf(std::string_view path) { return path.substr(path.rfind('\\') + 1); }
-
 // Failures of the store's files are told with the file they befell.
 template <typename Work>
 auto Told(const std::string& path, Work work) {
   try {
     return work();
   } catch (const RunTimeError& e) {
-    throw Refused(std::string(NameOf(path)) + ": " + e.what());
+    throw Refused(std::string(FileNameOf(path)) + ": " + e.what());
   }
 }
 
@@ -381,28 +380,15 @@ std::vector<T> ReadRecords(const Files& files, const std::string& path) {
     if (!files.CheckFile(path)) return std::vector<T>();
     const RecordFile<T> file(files, path);
     if (file.count() > kMostRecords)
-      throw Refused(std::string(NameOf(path)) + ": more than " + std::to_string(kMostRecords) +
+      throw Refused(std::string(FileNameOf(path)) + ": more than " + std::to_string(kMostRecords) +
                     " records");
     return file.ReadAll();
   });
 }
 
-void StagePrices(const Files& files, const std::string& dataPath, const std::string& code,
-                 Group& group, FileSet& set, ImportCounts& counts) {
-  const std::string path = dataPath + CodeFileName(code, ".WDT");
-  const auto old = ReadRecords<PriceRec>(files, path);
-  if (!std::is_sorted(old.begin(), old.end(), Earlier))
-    throw Refused(std::string(NameOf(path)) + ": the dates in the file are not in order");
-  const auto merged = Merge(old, std::move(group.rows), counts);
-  if (merged.size() > size_t(kMostRecords))
-    throw Refused(std::string(NameOf(path)) + ": more than " + std::to_string(kMostRecords) +
-                  " records");
-  Told(path, [&] { set.Add(path, std::string(BytesOf(merged))); });
-}
-
 // Record numbers go stale by the sort, and a list shows what stands at its numbers.
-void StageLists(const Files& files, const std::string& dataPath,
-                const std::vector<NameRec>& names, FileSet& set) {
+void StageLists(const Files& files, const std::string& dataPath, const std::vector<NameRec>& names,
+                FileSet& set) {
   std::map<std::string_view, std::int16_t> numbers;
   for (size_t i = 0; i < names.size(); ++i)
     numbers.try_emplace(names[i].Code.raw(), std::int16_t(i + 1));
@@ -421,74 +407,204 @@ void StageLists(const Files& files, const std::string& dataPath,
   }
 }
 
-void Import(const Files& files, const std::string& dataPath, const std::string& hostFile,
-            const ImportOptions& options, Dialogs& dialogs, Parsed& parsed,
-            ImportCounts& counts) {
-  const std::string namePath = NameFilePath(dataPath);
-  auto names = ReadRecords<NameRec>(files, namePath);
-  std::map<std::string, std::int16_t> known;
-  for (const NameRec& rec : names)
-    if (rec.NameStatus != 1) known.try_emplace(std::string(rec.Code.trimmed()), rec.RecType);
+// What a command's text files come to.
+class Importer {
+ public:
+  Importer(const Files& files, const std::string& dataPath, const ImportOptions& options,
+           Dialogs& dialogs)
+      : files_(files),
+        dataPath_(dataPath),
+        options_(options),
+        dialogs_(dialogs),
+        names_(ReadRecords<NameRec>(files, NameFilePath(dataPath))),
+        set_(files) {
+    for (const NameRec& rec : names_)
+      if (rec.NameStatus != 1) {
+        known_.try_emplace(std::string(rec.Code.trimmed()), rec.RecType);
+        ++living_;
+      }
+  }
 
-  const std::string text = ReadHostFile(files.io(), hostFile, kLargestFile);
-  parsed = Reader(hostFile, options, known, dialogs).Read(text);
-  if (parsed.rows == 0) throw Refused("no rows of prices");
-  if (parsed.bad > 0 && !options.SkipBad)
-    throw Refused("not imported, " + std::to_string(parsed.bad) +
-                  (parsed.bad == 1 ? " row" : " rows") + " can't be read");
-  if (parsed.bad == parsed.rows) throw Refused("no row can be read");
-  if (!options.Code.empty() && parsed.columnCodes.size() > 1)
-    throw Refused("holds more than one security, and so can't be taken under the one code " +
-                  UCase(options.Code));
-  if (!options.Name.empty() && parsed.groups.size() > 1)
-    throw Refused("holds more than one security, and so can't be taken under the one name " +
-                  options.Name);
+  // Takes a text file, or refuses it and leaves everything as it was.
+  void Take(const std::string& hostFile, ImportCounts& counts);
+  // Puts what was taken in place. The user can stop it as long as it lasts.
+  void Finish(Progress& progress, int done, ImportCounts& counts);
+  size_t bytes() const { return bytes_; }  // of rows that are held
 
-  FileSet set(files);
-  bool added = false;
+ private:
+  void Check(const std::string& code, const Group& group);
+  std::vector<PriceRec> OldRecords(const std::string& code) const;
+
+  const Files& files_;
+  const std::string& dataPath_;
+  const ImportOptions& options_;
+  Dialogs& dialogs_;
+  std::vector<NameRec> names_;
+  std::map<std::string, std::int16_t> known_;  // kinds by code
+  size_t living_ = 0;                          // names that are not deleted
+  bool added_ = false;
+  std::map<std::string, std::vector<PriceRec>> rows_;  // by code, as the files have them
+  std::map<std::string, size_t> onFile_;               // records of the price files of those
+  size_t bytes_ = 0;
+  FileSet set_;
+};
+
+std::vector<PriceRec> Importer::OldRecords(const std::string& code) const {
+  const std::string path = dataPath_ + CodeFileName(code, ".WDT");
+  auto old = ReadRecords<PriceRec>(files_, path);
+  if (!std::is_sorted(old.begin(), old.end(), Earlier))
+    throw Refused(std::string(FileNameOf(path)) + ": the dates in the file are not in order");
+  return old;
+}
+
+// Whether the security can take the rows.
+void Importer::Check(const std::string& code, const Group& group) {
+  const auto [known, first] = onFile_.try_emplace(code, 0);
+  if (first) known->second = OldRecords(code).size();
+  const auto held = rows_.find(code);
+  const size_t before = held == rows_.end() ? 0 : held->second.size();
+  if (known->second + before + group.rows.size() <= size_t(kMostRecords)) return;
+  // Some of them may have one date.
+  ImportCounts ignored;
+  std::vector<PriceRec> all = before > 0 ? held->second : std::vector<PriceRec>();
+  all.insert(all.end(), group.rows.begin(), group.rows.end());
+  if (Merge(OldRecords(code), std::move(all), ignored).size() > size_t(kMostRecords))
+    throw Refused(CodeFileName(code, ".WDT") + ": more than " + std::to_string(kMostRecords) +
+                  " records");
+}
+
+void Importer::Take(const std::string& hostFile, ImportCounts& counts) {
+  Parsed parsed;
+  try {
+    const std::string text = ReadHostFile(files_.io(), hostFile, kLargestFile);
+    parsed = Reader(hostFile, options_, known_, dialogs_).Read(text);
+    if (parsed.rows == 0) throw Refused("no rows of prices");
+    if (parsed.bad > 0 && !options_.SkipBad)
+      throw Refused("not imported, " + std::to_string(parsed.bad) +
+                    (parsed.bad == 1 ? " row" : " rows") + " can't be read");
+    if (parsed.bad == parsed.rows) throw Refused("no row can be read");
+    if (!options_.Code.empty() && parsed.columnCodes.size() > 1)
+      throw Refused("holds more than one security, and so can't be taken under the one code " +
+                    UCase(options_.Code));
+    if (!options_.Name.empty() && parsed.groups.size() > 1)
+      throw Refused("holds more than one security, and so can't be taken under the one name " +
+                    options_.Name);
+    size_t fresh = 0;
+    for (const auto& [code, group] : parsed.groups) {
+      if (group.rows.empty()) continue;
+      Check(code, group);
+      fresh += group.isNew;
+    }
+    if (fresh > 0 && living_ + fresh > size_t(kMostRecords))
+      throw Refused("the name file would have more than " + std::to_string(kMostRecords) +
+                    " records");
+  } catch (...) {
+    counts.Refused += parsed.rows;
+    throw;
+  }
   for (auto& [code, group] : parsed.groups) {
     if (group.rows.empty()) continue;
-    StagePrices(files, dataPath, code, group, set, counts);
-    counts.Codes.insert(code);
+    auto& rows = rows_[code];
+    bytes_ += group.rows.size() * sizeof(PriceRec);
+    if (rows.empty())
+      rows = std::move(group.rows);
+    else
+      rows.insert(rows.end(), group.rows.begin(), group.rows.end());
     if (!group.isNew) continue;
     NameRec rec = NewNameRec(code);
     rec.RecType = group.recType;
-    rec.Name.set(ToAnsi(options.Name));
-    names.push_back(rec);
-    added = true;
+    rec.Name.set(ToAnsi(options_.Name));
+    names_.push_back(rec);
+    known_.emplace(code, rec.RecType);
+    ++living_;
+    added_ = true;
   }
-  // Names behind prices: a name without a price file would fail to chart.
-  if (added) {
-    const auto sorted = SortedNames(names, NameSort::kCategory);
-    if (sorted.size() > size_t(kMostRecords))
-      throw Refused("the name file would have more than " + std::to_string(kMostRecords) +
-                    " records");
-    Told(namePath, [&] { set.Add(namePath, std::string(BytesOf(sorted))); });
-    StageLists(files, dataPath, sorted, set);
+  counts.Refused += parsed.bad;
+}
+
+void Importer::Finish(Progress& progress, int done, ImportCounts& counts) {
+  if (rows_.empty()) return;
+  ImportCounts mine;
+  std::int64_t rows = 0;
+  try {
+    const int total = done + int(rows_.size());
+    size_t held = 0;  // bytes that wait for their temporary files
+    for (auto& [code, fresh] : rows_) {
+      rows += std::int64_t(fresh.size());
+      if (!progress.Step(done++, total)) throw Refused("stopped; every file is as it was");
+      const std::string path = dataPath_ + CodeFileName(code, ".WDT");
+      const auto merged = Merge(OldRecords(code), std::move(fresh), mine);
+      fresh = {};
+      Told(path, [&] { set_.Add(path, std::string(BytesOf(merged))); });
+      mine.Codes.insert(code);
+      held += merged.size() * sizeof(PriceRec);
+      if (held < kMostHeld) continue;
+      set_.Stage();
+      held = 0;
+    }
+    // Names behind prices: a name without a price file would fail to chart.
+    if (added_) {
+      const std::string path = NameFilePath(dataPath_);
+      names_ = SortedNames(names_, NameSort::kCategory);
+      Told(path, [&] { set_.Add(path, std::string(BytesOf(names_))); });
+    }
+    StageLists(files_, dataPath_, names_, set_);
+    set_.Commit();
+    progress.Step(total, total);
+  } catch (...) {
+    for (const auto& [code, fresh] : rows_) rows += std::int64_t(fresh.size());
+    counts.Refused += rows;
+    throw;
   }
-  set.Commit();
+  rows_.clear();
+  onFile_.clear();
+  bytes_ = 0;
+  added_ = false;
+  counts.Codes.merge(mine.Codes);
+  counts.Added += mine.Added;
+  counts.Replaced += mine.Replaced;
+}
+
+// False, and told, where `work` fails.
+template <typename Work>
+bool TellFailure(Dialogs& dialogs, const std::string& about, Work work) {
+  const std::string prefix = about.empty() ? about : about + ": ";
+  try {
+    work();
+    return true;
+  } catch (const Refused& e) {
+    dialogs.Message(prefix + e.what(), kTitle);
+  } catch (const RunTimeError& e) {
+    dialogs.Message(prefix + e.what(), kTitle);
+  } catch (const std::bad_alloc&) {
+    dialogs.Message(prefix + ErrorText(kOutOfMemory), kTitle);
+  }
+  return false;
 }
 
 }  // namespace
 
-bool ImportHistory(const Files& files, const std::string& dataPath, const std::string& hostFile,
-                   const ImportOptions& options, Dialogs& dialogs, ImportCounts& counts) {
-  ImportCounts mine = counts;
-  Parsed parsed;
-  try {
-    Import(files, dataPath, hostFile, options, dialogs, parsed, mine);
-    mine.Refused += parsed.bad;
-    counts = std::move(mine);
-    return true;
-  } catch (const Refused& e) {
-    dialogs.Message(hostFile + ": " + e.what(), kTitle);
-  } catch (const RunTimeError& e) {
-    dialogs.Message(hostFile + ": " + e.what(), kTitle);
-  } catch (const std::bad_alloc&) {
-    dialogs.Message(hostFile + ": " + ErrorText(kOutOfMemory), kTitle);
-  }
-  counts.Refused += parsed.rows;
-  return false;
+bool ImportHistory(const Files& files, const std::string& dataPath,
+                   std::span<const std::string> hostFiles, const ImportOptions& options,
+                   Dialogs& dialogs, ImportCounts& counts) {
+  bool all = true;
+  return TellFailure(dialogs, {},
+                     [&] {
+                       const auto held = files.lock().Hold();
+                       const auto progress = dialogs.StartProgress(kTitle);
+                       Importer importer(files, dataPath, options, dialogs);
+                       int done = 0;
+                       for (const std::string& file : hostFiles) {
+                         // The securities count as much as the files.
+                         if (!progress->Step(done++, 2 * int(hostFiles.size())))
+                           throw Refused("stopped; every file is as it was");
+                         all &= TellFailure(dialogs, file, [&] { importer.Take(file, counts); });
+                         if (importer.bytes() >= kMostRows)
+                           importer.Finish(*progress, done, counts);
+                       }
+                       importer.Finish(*progress, done, counts);
+                     }) &&
+         all;
 }
 
 }  // namespace kora

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <optional>
 #include <set>
+#include <span>
 #include <string>
 
 #include "base/files.h"
@@ -31,29 +32,33 @@ struct ImportOptions {
 struct ImportCounts {
   std::set<std::string> Codes;  // securities that took rows
   std::int64_t Added = 0;
-  std::int64_t Replaced = 0;    // rows in place of one with the same date
-  std::int64_t Refused = 0;     // rows that were not taken, all those of a refused file too
+  std::int64_t Replaced = 0;  // rows in place of one with the same date
+  std::int64_t Refused = 0;   // rows that were not taken, all those of a refused file too
 };
 
 // Rows that a price file, and records that the name file, can number.
 inline constexpr std::int32_t kMostRecords = 32767;
 
-// Takes one text file, named by its path on the machine, into the data folder `dataPath`.
+// Takes text files, named by their paths on the machine, into the data folder `dataPath`.
 //
-// The file holds lines "CODE,yyyymmdd,open,high,low,close,volume,spare", or a header that names
+// A file holds lines "CODE,yyyymmdd,open,high,low,close,volume,spare", or a header that names
 // its columns in any order and case (Date and Close; Open, High, Low, Volume; Code, Symbol or
 // Ticker; others are passed over) and rows under it. Fields stand between commas, semicolons
 // or tabs, as the first line has them, and may be quoted.
 //
 // The code is that of the row, else Code, else the file's name. Rows are merged by date into
-// the price file, in place of a row with the same date, whose adjustment mark stays. A code that
-// is new to the name file gets a record; the file is then sorted as after a save, and the
-// chart lists are given the new record numbers.
+// the price file, in place of a row with the same date, whose adjustment mark stays; those of a
+// later file in place of those of an earlier one. A code that is new to the name file gets a
+// record; the file is then sorted as after a save. Every import gives each chart list the record
+// numbers that its codes have, and takes those out that left the name file.
 //
-// All files change together, or none does: a row that can't be read leaves them as they were
-// unless SkipBad, and so does a full disk. Every failure is told by a message titled "Import",
-// rows with file and line number. Returns whether the rows were taken.
-bool ImportHistory(const Files& files, const std::string& dataPath, const std::string& hostFile,
-                   const ImportOptions& options, Dialogs& dialogs, ImportCounts& counts);
+// A text file is taken whole or not at all: a row that can't be read leaves it out unless
+// SkipBad. What the others hold changes together at the end, price files before the name file,
+// and that before the lists; a failure, as a full disk, and a user who stops it leave every file
+// as it was. Every failure is told by a message titled "Import", rows with file and line number.
+// Returns whether all rows were taken.
+bool ImportHistory(const Files& files, const std::string& dataPath,
+                   std::span<const std::string> hostFiles, const ImportOptions& options,
+                   Dialogs& dialogs, ImportCounts& counts);
 
 }  // namespace kora

@@ -5,6 +5,7 @@
 #include <stdexcept>
 
 #include "base/file_set.h"
+#include "base/home_lock.h"
 #include "base/host_files.h"
 #include "base/numbers.h"
 #include "base/record_file.h"
@@ -109,7 +110,8 @@ std::string MasterFile(const std::string& systemPath) { return systemPath + "Kor
 
 MasterTable LoadMasterTable(const Files& files, const std::string& systemPath) {
   MasterTable table;
-  for (size_t i = 0; i < table.size(); ++i) table[i] = static_cast<unsigned char>(kFirstInTable + i);
+  for (size_t i = 0; i < table.size(); ++i)
+    table[i] = static_cast<unsigned char>(kFirstInTable + i);
   const std::string path = systemPath + "KoraName.Tab";
   if (!files.CheckFile(path)) return table;
   const std::string text = files.ReadAll(path, 1u << 20);
@@ -163,9 +165,12 @@ std::int32_t MasterList::StartOf(std::string_view code) const {
 
 MasterEntry MasterList::Entry(std::int32_t record) const {
   const MasterRec& rec = Records.at(size_t(record - 1));
-  return {std::string(rec.Code.trimmed()), Field(rec, 7, 7),
-          Field(rec, 8, 9),                Field(rec, 10, 12),
-          FromAnsi(Field(rec, 13, 47)),    FromAnsi(Field(rec, 47, 61))};
+  return {std::string(rec.Code.trimmed()),
+          Field(rec, 7, 7),
+          Field(rec, 8, 9),
+          Field(rec, 10, 12),
+          FromAnsi(Field(rec, 13, 47)),
+          FromAnsi(Field(rec, 47, 61))};
 }
 
 MasterEntry FindMaster(const MasterList& list, std::string_view code, std::int32_t startRec) {
@@ -187,8 +192,8 @@ std::span<const std::string_view> MasterMissingLines() {
 
 std::int32_t LookUpStart(std::int32_t place) { return place <= 3 ? 1 : place - 3; }
 
-bool UpdateFromMaster(const Files& files, const std::string& systemPath,
-                      std::span<EditorRow> rows, const KeepTicks& keep, Dialogs& dialogs) {
+bool UpdateFromMaster(const Files& files, const std::string& systemPath, std::span<EditorRow> rows,
+                      const KeepTicks& keep, Dialogs& dialogs) {
   if (!files.CheckFile(MasterFile(systemPath))) {
     dialogs.Message("There is no master list (KoraName.Mas) in folder " + systemPath +
                         "Either download a current file from the KORA web page or ring KORA ",
@@ -228,6 +233,7 @@ bool UpdateFromMaster(const Files& files, const std::string& systemPath,
 std::optional<std::int32_t> MakeMasterList(const Files& files, const std::string& systemPath,
                                            const std::string& hostFile, Dialogs& dialogs) {
   int number = 0;
+  std::string atFault = hostFile;
   try {
     const MasterTable table = LoadMasterTable(files, systemPath);
     const std::string text = ReadHostFile(files.io(), hostFile, kLargestSource);
@@ -257,6 +263,9 @@ std::optional<std::int32_t> MakeMasterList(const Files& files, const std::string
       if (first == 0) first = count;
     }
     for (const std::int32_t first : letters) index += (index.empty() ? "" : ",") + Str(first);
+    // From here on a failure is the list's, not the input's.
+    atFault = MasterFile(systemPath);
+    const auto held = files.lock().Hold();
     FileSet set(files);
     set.Add(MasterFile(systemPath), std::move(bytes));
     set.Add(IndexFile(systemPath), index + "\r\n");
@@ -265,7 +274,7 @@ std::optional<std::int32_t> MakeMasterList(const Files& files, const std::string
   } catch (const BadLine& e) {
     dialogs.Message(hostFile + " line " + Str(std::int32_t(number)) + ": " + e.what(), kMakeTitle);
   } catch (const RunTimeError& e) {
-    dialogs.Message(hostFile + ": " + e.what(), kMakeTitle);
+    dialogs.Message(atFault + ": " + e.what(), kMakeTitle);
   }
   return std::nullopt;
 }

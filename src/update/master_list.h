@@ -45,7 +45,7 @@ struct MasterEntry {
 };
 
 struct MasterList {
-  std::vector<MasterRec> Records;         // ordered by code, readable
+  std::vector<MasterRec> Records;          // ordered by code, readable
   std::array<std::int32_t, 26> Letters{};  // KoraName.idx: first record of A to Z, 0 none
 
   // Where the codes that begin with the letter of `code` start; 0 where there is none.
@@ -81,8 +81,8 @@ using KeepTicks = std::array<bool, 5>;
 
 // Takes what the master list has into the rows. Empty items are filled whatever is ticked. The
 // rows stay as they were when the list can't be used, which is told, or the user stops.
-bool UpdateFromMaster(const Files& files, const std::string& systemPath,
-                      std::span<EditorRow> rows, const KeepTicks& keep, Dialogs& dialogs);
+bool UpdateFromMaster(const Files& files, const std::string& systemPath, std::span<EditorRow> rows,
+                      const KeepTicks& keep, Dialogs& dialogs);
 
 // ---- Making a list
 

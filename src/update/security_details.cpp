@@ -71,9 +71,7 @@ std::string HeaderText(std::string_view header, char delimiter) {
   return text;
 }
 
-bool IsFolderSet(std::string_view folder) {
-  return !Trim(folder).empty() && folder != kUnknown;
-}
+bool IsFolderSet(std::string_view folder) { return !Trim(folder).empty() && folder != kUnknown; }
 
 }  // namespace
 

@@ -13,8 +13,8 @@ using kora::test::ErrorOf;
 TEST(CurrencyTest, KeepsFourDecimalsAndRoundsHalfToEven) {
   EXPECT_EQ(Currency(1.2345).units(), 12345);
   // Halves of a unit that a double holds exactly: n / 32 of a ten-thousandth's multiple.
-  EXPECT_EQ(Currency(0.03125).units(), 312);   // 312.5
-  EXPECT_EQ(Currency(0.09375).units(), 938);   // 937.5
+  EXPECT_EQ(Currency(0.03125).units(), 312);  // 312.5
+  EXPECT_EQ(Currency(0.09375).units(), 938);  // 937.5
   EXPECT_EQ(Currency(-0.03125).units(), -312);
   EXPECT_EQ(Currency(-0.09375).units(), -938);
   EXPECT_EQ(Currency(0.00004).units(), 0);
@@ -23,8 +23,7 @@ TEST(CurrencyTest, KeepsFourDecimalsAndRoundsHalfToEven) {
 
 TEST(CurrencyTest, WholeNumbersAreExact) {
   EXPECT_EQ(Currency::FromWhole(-7).units(), -70000);
-  EXPECT_EQ(Currency::FromWhole(std::numeric_limits<std::int32_t>::min()).units(),
-            -21474836480000);
+  EXPECT_EQ(Currency::FromWhole(std::numeric_limits<std::int32_t>::min()).units(), -21474836480000);
   EXPECT_EQ(Currency::FromUnits(12345).ToDouble(), 1.2345);
   EXPECT_EQ(Currency(), Currency::FromWhole(0));
 }

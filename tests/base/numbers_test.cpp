@@ -26,7 +26,8 @@ TEST(ParseFloatTest, TakesWholeNumbersTextsAlone) {
   EXPECT_EQ(ParseFloat("2.1936"), 2.1936f);
   EXPECT_EQ(ParseFloat("-5"), -5.0f);
   EXPECT_EQ(ParseFloat("1e3"), 1000.0f);
-  for (const char* text : {"", " 1", "1 ", "1x", "x", "nan", "inf", "-inf", "1e39", "1e-60", "0x1", "1,5"})
+  for (const char* text :
+       {"", " 1", "1 ", "1x", "x", "nan", "inf", "-inf", "1e39", "1e-60", "0x1", "1,5"})
     EXPECT_FALSE(ParseFloat(text).has_value()) << text;
 }
 
@@ -72,7 +73,8 @@ TEST(ValTest, TakesTheLeadingNumericPart) {
 }
 
 TEST(ValTest, TextWithNoNumberIsZero) {
-  for (const char* text : {"", "unknown", "-", ".", "+", "abc1", "-.", "+-1"}) EXPECT_EQ(Val(text), 0) << text;
+  for (const char* text : {"", "unknown", "-", ".", "+", "abc1", "-.", "+-1"})
+    EXPECT_EQ(Val(text), 0) << text;
 }
 
 TEST(ValTest, HundredsOfDigitsDoNotOverflowTheReader) {

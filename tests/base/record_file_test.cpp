@@ -38,7 +38,9 @@ TEST(RecordFileTest, CountTruncates) {
 
 TEST(RecordFileTest, RecordsAreNumberedFromOne) {
   TempHome home;
-  home.Put("drive_c/p.dat", std::string("abc\x01\x02" "def\x03\x04", 10));
+  home.Put("drive_c/p.dat", std::string("abc\x01\x02"
+                                        "def\x03\x04",
+                                        10));
   const PairFile file(home.files(), kPath);
   EXPECT_EQ(int(file.Read(1).value), 0x0201);  // little-endian
   EXPECT_EQ(std::string_view(file.Read(2).name, 3), "def");

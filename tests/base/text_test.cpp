@@ -41,10 +41,10 @@ TEST(AnsiTest, CharacterThatTheCodePageLacksIsAQuestionMark) {
 }
 
 TEST(AnsiTest, BadUtf8IsAQuestionMarkAByte) {
-  EXPECT_EQ(ToAnsi("\x80"), "?");          // a continuation alone
-  EXPECT_EQ(ToAnsi("a\xC3"), "a?");        // cut at the end
-  EXPECT_EQ(ToAnsi("\xC3(x"), "?(x");      // no continuation behind
-  EXPECT_EQ(ToAnsi("\xE2\x82"), "??");     // cut within three
+  EXPECT_EQ(ToAnsi("\x80"), "?");       // a continuation alone
+  EXPECT_EQ(ToAnsi("a\xC3"), "a?");     // cut at the end
+  EXPECT_EQ(ToAnsi("\xC3(x"), "?(x");   // no continuation behind
+  EXPECT_EQ(ToAnsi("\xE2\x82"), "??");  // cut within three
   EXPECT_EQ(ToAnsi("\xFF\xFE"), "??");
   EXPECT_EQ(ToAnsi("\xF8\x88\x80\x80\x80"), "?????");  // five-byte form
   EXPECT_EQ(ToAnsi("\xE0\x82\xA9"), "???");            // (c) in a longer form than it needs

@@ -10,6 +10,8 @@
 using namespace kora;
 using kora::test::ErrorOf;
 using kora::test::FailingIo;
+using kora::test::ForwardingFile;
+using kora::test::ForwardingIo;
 using kora::test::TempHome;
 
 namespace {
@@ -42,12 +44,15 @@ TEST(WriteAllTest, FailureAtAnyCallLeavesTheOldFileAndNoTrash) {
     EXPECT_EQ(home.Get("drive_c/Names.dat"), "old") << at;
     EXPECT_EQ(home.files().List("c:\\").size(), 1u) << at;
   });
-  EXPECT_EQ(calls, 4);  // open, write, flush, rename
+  // The temporary file opened, given the old one's access, written and flushed, the old one kept
+  // aside, the new one renamed over it, the folder flushed.
+  EXPECT_EQ(calls, 7);
 }
 
-TEST(WriteAllTest, DiskThatStaysBrokenLeavesTheOldFile) {
+TEST(WriteAllTest, DiskThatStaysBrokenLeavesTheOldFileOrTheNewOne) {
   FailAtEveryCall(true, true, "old", [](TempHome& home, int at) {
-    EXPECT_EQ(home.Get("drive_c/Names.dat"), "old") << at;
+    // Behind the renaming nothing can be brought back any more: the new file is whole.
+    EXPECT_EQ(home.Get("drive_c/Names.dat"), at < 7 ? "old" : "new content") << at;
   });
 }
 
@@ -58,11 +63,11 @@ TEST(WriteAllTest, FailureWhereThereWasNoFileLeavesNone) {
   });
 }
 
-TEST(WriteAllTest, NextWriteGoesOverWhatACrashLeft) {
+TEST(WriteAllTest, NextWriteClearsAwayWhatACrashLeft) {
   FailingIo io;
   TempHome home(io);
   home.Put("drive_c/a.txt", "old");
-  io.Reset(2);
+  io.Reset(3);
   io.lasting = io.torn = true;
   EXPECT_EQ(ErrorOf([&] { home.files().WriteAll("c:\\a.txt", "a longer text"); }), 61);
   EXPECT_EQ(home.files().List("c:\\").size(), 2u);  // the torn temporary file could not be removed
@@ -72,55 +77,116 @@ TEST(WriteAllTest, NextWriteGoesOverWhatACrashLeft) {
   EXPECT_EQ(home.files().List("c:\\").size(), 1u);
 }
 
+TEST(WriteAllTest, AFileThatAnotherWriterIsMakingIsLeftAlone) {
+  TempHome home;
+  home.Put("drive_c/a.txt", "old");
+  const std::string beside = home.path() + "/drive_c/a.txt.tmp~";
+  const auto another = MachineIo().Open(beside, OpenMode::kNew);
+  another->WriteAt(0, "another's", 9);
+  home.files().WriteAll("c:\\a.txt", "new");
+  EXPECT_EQ(home.Get("drive_c/a.txt"), "new");
+  EXPECT_EQ(home.Get("drive_c/a.txt.tmp~"), "another's");
+  EXPECT_EQ(home.files().List("c:\\").size(), 2u);
+}
+
+TEST(WriteAllTest, ALinkUnderTheTemporaryNameIsNotFollowed) {
+  TempHome home;
+  home.Put("drive_c/a.txt", "old");
+  home.Put("precious", "kept");
+  std::filesystem::create_symlink(home.path() + "/precious", home.path() + "/drive_c/a.txt.tmp~");
+  home.files().WriteAll("c:\\a.txt", "new");
+  EXPECT_EQ(home.Get("drive_c/a.txt"), "new");
+  EXPECT_EQ(home.Get("precious"), "kept");
+  EXPECT_TRUE(std::filesystem::is_symlink(home.path() + "/drive_c/a.txt.tmp~"));
+}
+
+TEST(WriteAllTest, ALinkedFileIsReplacedAtItsTarget) {
+  TempHome home;
+  home.Put("elsewhere/real.txt", "old");
+  home.Put("drive_c/b.txt", "");
+  std::filesystem::create_symlink("../elsewhere/real.txt", home.path() + "/drive_c/a.txt");
+  std::filesystem::create_symlink("a.txt", home.path() + "/drive_c/c.txt");
+  home.files().WriteAll("c:\\c.txt", "new");
+  EXPECT_EQ(home.Get("elsewhere/real.txt"), "new");
+  EXPECT_TRUE(std::filesystem::is_symlink(home.path() + "/drive_c/a.txt"));
+  EXPECT_TRUE(std::filesystem::is_symlink(home.path() + "/drive_c/c.txt"));
+  EXPECT_EQ(std::distance(std::filesystem::directory_iterator(home.path() + "/elsewhere"), {}), 1);
+}
+
+TEST(WriteAllTest, LinksInACircleAreError75) {
+  TempHome home;
+  std::filesystem::create_symlink("b.txt", home.path() + "/drive_c/a.txt");
+  std::filesystem::create_symlink("a.txt", home.path() + "/drive_c/b.txt");
+  EXPECT_EQ(ErrorOf([&] { home.files().WriteAll("c:\\a.txt", "new"); }), 75);
+}
+
+TEST(WriteAllTest, TheNewFileHasTheModeOfTheOldOne) {
+  TempHome home;
+  home.Put("drive_c/a.txt", "old");
+  const std::filesystem::path path = home.path() + "/drive_c/a.txt";
+  for (const unsigned mode : {0600u, 0664u, 0640u}) {
+    std::filesystem::permissions(path, std::filesystem::perms(mode));
+    home.files().WriteAll("c:\\a.txt", "new");
+    EXPECT_EQ(unsigned(std::filesystem::status(path).permissions()), mode);
+  }
+}
+
+TEST(WriteAllTest, AReadOnlyFileIsRefusedByName) {
+  TempHome home;
+  home.Put("drive_c/a.txt", "old");
+  std::filesystem::permissions(home.path() + "/drive_c/a.txt", std::filesystem::perms(0444));
+  try {
+    home.files().WriteAll("c:\\A.TXT", "new");
+    FAIL() << "written";
+  } catch (const RunTimeError& e) {
+    EXPECT_EQ(e.number(), kPathAccess);
+    EXPECT_STREQ(e.what(), "a.txt is read-only");
+  }
+  EXPECT_EQ(home.Get("drive_c/a.txt"), "old");
+  EXPECT_EQ(home.files().List("c:\\").size(), 1u);
+}
+
 TEST(WriteAllTest, BytesAreOnTheDiskBeforeTheNameIs) {
   // The order is what makes a crash harmless: a rename before the flush could leave an empty file.
-  struct Recording : Io {
+  struct Recording : ForwardingIo {
     std::string calls;
-    struct File : HostFile {
-      File(std::unique_ptr<HostFile> f, std::string& c) : base(std::move(f)), calls(c) {}
+    struct File : ForwardingFile {
+      File(std::unique_ptr<HostFile> f, std::string& c) : ForwardingFile(std::move(f)), calls(c) {}
       ~File() override { calls += "close "; }
-      size_t ReadAt(std::uint64_t o, void* d, size_t n) override { return base->ReadAt(o, d, n); }
       void WriteAt(std::uint64_t o, const void* d, size_t n) override {
         calls += "write ";
-        base->WriteAt(o, d, n);
+        base_->WriteAt(o, d, n);
       }
-      std::uint64_t Size() override { return base->Size(); }
-      void Truncate(std::uint64_t n) override { base->Truncate(n); }
       void Flush() override {
         calls += "flush ";
-        base->Flush();
+        base_->Flush();
       }
-      std::unique_ptr<HostFile> base;
       std::string& calls;
     };
     std::unique_ptr<HostFile> Open(const std::string& path, OpenMode mode) override {
       calls += "open ";
       return std::make_unique<File>(MachineIo().Open(path, mode), calls);
     }
-    HostStatus Status(const std::string& path) override { return MachineIo().Status(path); }
-    std::vector<std::string> List(const std::string& f) override { return MachineIo().List(f); }
-    void MakeFolder(const std::string& path) override { MachineIo().MakeFolder(path); }
-    void Remove(const std::string& path) override { MachineIo().Remove(path); }
     void Rename(const std::string& from, const std::string& to) override {
       calls += "rename ";
       MachineIo().Rename(from, to);
     }
+    void FlushFolder(const std::string& folder) override {
+      calls += "folder ";
+      MachineIo().FlushFolder(folder);
+    }
   } io;
   TempHome home(io);
   home.files().WriteAll("c:\\a.txt", "x");
-  EXPECT_EQ(io.calls, "open write flush close rename ");
+  EXPECT_EQ(io.calls, "open write flush rename close folder ");
 }
 
-TEST(WriteAllTest, FolderInThePlaceOfTheFileOrOfItsTemporaryIsError75) {
+TEST(WriteAllTest, AFolderInThePlaceOfTheFileIsError75) {
   TempHome home;
   home.Put("drive_c/folder/x", "x");
-  home.Put("drive_c/a.txt", "old");
-  home.Put("drive_c/a.txt.tmp~/x", "x");
   EXPECT_EQ(ErrorOf([&] { home.files().WriteAll("c:\\folder", "f"); }), 75);
-  EXPECT_EQ(ErrorOf([&] { home.files().WriteAll("c:\\a.txt", "f"); }), 75);
-  EXPECT_EQ(home.Get("drive_c/a.txt"), "old");
   EXPECT_EQ(home.Get("drive_c/folder/x"), "x");
-  EXPECT_EQ(home.files().List("c:\\").size(), 3u);
+  EXPECT_EQ(home.files().List("c:\\").size(), 1u);
 }
 
 TEST(WriteAllTest, EmptyTextEmptiesTheFile) {

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "store/colours.h"
+#include "looks/colours.h"
 
 using namespace kora;
 

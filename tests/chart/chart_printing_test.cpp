@@ -69,6 +69,25 @@ struct PrintFixture {
   }
 };
 
+TEST(PaperColours, LightOnesAreDarkenedToReadOnWhiteAndDarkOnesStay) {
+  for (const Colour dark : {0x000000, 0x800000, 0x0000C0, 0x006000})
+    EXPECT_EQ(ForWhitePaper(dark), dark) << dark;
+  // Yellow, cyan, white: each part gets less, and none of another comes in.
+  const Colour yellow = ForWhitePaper(0x00FFFF);
+  EXPECT_EQ(yellow >> 16, 0);
+  EXPECT_EQ(yellow & 0xFF, yellow >> 8 & 0xFF);
+  EXPECT_LT(yellow & 0xFF, 0xA0);  // contrast 3 with white is at 158 of 255
+  EXPECT_GT(yellow & 0xFF, 0x90);
+  const Colour white = ForWhitePaper(0xFFFFFF);
+  EXPECT_EQ(white & 0xFF, white >> 16 & 0xFF);
+  EXPECT_LT(white & 0xFF, 0x96);
+}
+
+TEST(PaperSide, IsTheOneOnWhichTheChartIsLarger) {
+  EXPECT_EQ(BetterSide({638, 452}), kLandscape);
+  EXPECT_EQ(BetterSide({638, 700}), kPortrait);
+}
+
 }  // namespace
 
 TEST(ChartPrintingTest, LinesOfEachLetterHaveTheirStyleAndWeight) {
@@ -117,8 +136,8 @@ TEST(ChartPrintingTest, WeightOutsideOneToTenIsTwo) {
   PrintFixture f;
   for (const auto& [line, weight] : {std::pair{0, 2}, {1, 1}, {10, 10}, {11, 2}, {-3, 2}}) {
     f.setup.PrintLine = std::int16_t(line);
-    EXPECT_EQ(f.Page("H,0,0,1,1,5\r\n"), (Ops{"line solid " + std::to_string(weight) +
-                                              " 0,0,30,30 5"}));
+    EXPECT_EQ(f.Page("H,0,0,1,1,5\r\n"),
+              (Ops{"line solid " + std::to_string(weight) + " 0,0,30,30 5"}));
   }
 }
 
@@ -167,9 +186,9 @@ TEST(ChartPrintingTest, Font1sBoldIsForTitlesAndNotForScales) {
 TEST(ChartPrintingTest, PrintModeSetsTextsInBold) {
   PrintFixture f;
   f.setup.ScriptPrintMode = true;
-  EXPECT_EQ(f.Page("S,8,1,1,A,5\r\nT,8,1,1,B,5\r\nS,8,1,1,C,5\r\nS,8,1,1,D,5\r\n"),
-            (Ops{"text 8 30,30 A 5", "text 8 b 30,30 B 5", "text 8 b 30,30 C 5",
-                 "text 8 30,30 D 5"}));
+  EXPECT_EQ(
+      f.Page("S,8,1,1,A,5\r\nT,8,1,1,B,5\r\nS,8,1,1,C,5\r\nS,8,1,1,D,5\r\n"),
+      (Ops{"text 8 30,30 A 5", "text 8 b 30,30 B 5", "text 8 b 30,30 C 5", "text 8 30,30 D 5"}));
 }
 
 TEST(ChartPrintingTest, BothWhitesAreBlackWhereAskedFor) {
@@ -181,9 +200,8 @@ TEST(ChartPrintingTest, BothWhitesAreBlackWhereAskedFor) {
   EXPECT_EQ(f.Page(script), (Ops{"line solid 1 0,0,30,30 0", "line solid 4 0,0,0,0 0",
                                  "text 8 0,0 A 0", "line solid 1 0,0,30,30 8388608"}));
   f.setup.PrintWhiteBlack = 0;
-  EXPECT_EQ(f.Page(script),
-            (Ops{"line solid 1 0,0,30,30 16777215", "line solid 4 0,0,0,0 12632256",
-                 "text 8 0,0 A 16777215", "line solid 1 0,0,30,30 8388608"}));
+  EXPECT_EQ(f.Page(script), (Ops{"line solid 1 0,0,30,30 16777215", "line solid 4 0,0,0,0 12632256",
+                                 "text 8 0,0 A 16777215", "line solid 1 0,0,30,30 8388608"}));
 }
 
 TEST(ChartPrintingTest, BlackAndWhiteTurnsEveryColourToTheFirstEntry) {
@@ -278,10 +296,10 @@ TEST(ChartPrintingTest, AChartIsOnThePageWhenNoEdgeLeavesIt) {
   PrintFixture f;
   ChartFrame frame{18, 18, 11506, 16438, 0, 0};
   EXPECT_TRUE(IsOnPage(f.printer, frame));
-  for (ChartFrame off : {ChartFrame{18, 18, 11507, 100, 0, 0}, ChartFrame{18, 18, 100, 16439, 0, 0},
-                         ChartFrame{18, 18, 100, 100, 1, -5}, ChartFrame{18, 18, 100, 100, -5, 1},
-                         ChartFrame{18, 18, 100, 100, -11407, -5},
-                         ChartFrame{18, 18, 100, 100, -5, -16339}})
+  for (ChartFrame off :
+       {ChartFrame{18, 18, 11507, 100, 0, 0}, ChartFrame{18, 18, 100, 16439, 0, 0},
+        ChartFrame{18, 18, 100, 100, 1, -5}, ChartFrame{18, 18, 100, 100, -5, 1},
+        ChartFrame{18, 18, 100, 100, -11407, -5}, ChartFrame{18, 18, 100, 100, -5, -16339}})
     EXPECT_FALSE(IsOnPage(f.printer, off));
 }
 
@@ -302,10 +320,10 @@ TEST(ChartPrintingTest, AScriptThatBreaksSendsNoPageAndTellsTheNumber) {
                   "There is an unexpected error No. 6\nOverflow");
   f.ExpectFailure(good + "L,100000000,2,3,4,5\r\n", "Chart Printing",  // times 30
                   "There is an unexpected error No. 6\nOverflow");
-  for (const std::string& broken : {good + "X,1,2,3", good + "K,1,2", std::string(),
-                                    std::string("Q,1\r\n")})
-    f.ExpectFailure(broken, "Chart Printing", std::string("There is an unexpected error No. 5\n") +
-                                                  ErrorText(kBadCall));
+  for (const std::string& broken :
+       {good + "X,1,2,3", good + "K,1,2", std::string(), std::string("Q,1\r\n")})
+    f.ExpectFailure(broken, "Chart Printing",
+                    std::string("There is an unexpected error No. 5\n") + ErrorText(kBadCall));
   EXPECT_EQ(f.printer.started, f.printer.killed);
 }
 
@@ -327,9 +345,9 @@ TEST(ChartPrintingTest, AFontThatIsRefusedIsNamedByItsLabel) {
 TEST(ChartPrintingTest, APrinterThatFailsAtTheEndIsTold) {
   PrintFixture f;
   f.printer.failAtEnd = kDeviceNotAvailable;
-  f.ExpectFailure("L,1,2,3,4,5\r\n", "Chart Printing",
-                  std::string("There is an unexpected error No. 68\n") +
-                      ErrorText(kDeviceNotAvailable));
+  f.ExpectFailure(
+      "L,1,2,3,4,5\r\n", "Chart Printing",
+      std::string("There is an unexpected error No. 68\n") + ErrorText(kDeviceNotAvailable));
   f.printer.failAtEnd = kDiskFull;
   f.ExpectFailure("L,1,2,3,4,5\r\n", "Chart Printing",
                   "There is an unexpected error No. 61\nDisk full");
@@ -404,9 +422,12 @@ TEST(ChartPrintingTest, SetupComesFromTheSettingsAndGoesBackToTheirKeys) {
   s.PrintEnlarge = 1.7f;
   s.PrintOrient = 1;
   SavePrintSetup(file, settings, s);
-  for (const auto& [section, key, value] :
-       {std::tuple{"Charts", "Cw", "9000"}, {"Charts", "Ch", "6000"}, {"Charts", "SW", "-50"},
-        {"Charts", "SH", "-800"}, {"Charts", "EFact", "1.7"}, {"ChtPage", "Orient", "1"}})
+  for (const auto& [section, key, value] : {std::tuple{"Charts", "Cw", "9000"},
+                                            {"Charts", "Ch", "6000"},
+                                            {"Charts", "SW", "-50"},
+                                            {"Charts", "SH", "-800"},
+                                            {"Charts", "EFact", "1.7"},
+                                            {"ChtPage", "Orient", "1"}})
     EXPECT_EQ(file.GetSetting(section, key), value) << key;
   EXPECT_EQ(settings.charts.SW, -50);
   EXPECT_EQ(settings.charts.EFact, 1.7);

@@ -53,15 +53,15 @@ TEST(LogVolumeTest, VolumesStandByTheirLogarithmsFromTheLeastToTheLargest) {
 
 // VolHeight and the factor of 3 of a line belong to the arithmetic panel.
 TEST(LogVolumeTest, MultipleOfTheMeanHasNoPartInIt) {
-  for (const char style : {'B', 'C', 'L'}) {
+  for (const Style style : {Style::kBar, Style::kCandlestick, Style::kLine}) {
     ComposerFixture f;
     f.request.ChartStyle = style;
     f.request.LogBars = f.request.LogLines = f.request.LogVolume = true;
     f.request.VolHeight = 3;
     SetVolumes(f, {1, 100, 1000, 10000});
     ASSERT_TRUE(f.Compose());
-    EXPECT_TRUE(f.Wrote("H,44,429,44,407,22")) << style;
-    EXPECT_TRUE(f.Wrote("H,46,429,46,396,22")) << style;
+    EXPECT_TRUE(f.Wrote("H,44,429,44,407,22")) << TextOf(style);
+    EXPECT_TRUE(f.Wrote("H,46,429,46,396,22")) << TextOf(style);
   }
 }
 
@@ -90,7 +90,7 @@ TEST(LogVolumeTest, ArithmeticPricesKeepTheBaseOfTheChartBefore) {
 // Lines have their own switch: LogBars makes no logarithmic line chart.
 TEST(LogVolumeTest, LineTakesTheBaseWhereLinesAreLogarithmic) {
   ComposerFixture f;
-  f.request.ChartStyle = 'L';
+  f.request.ChartStyle = Style::kLine;
   f.request.LogBars = f.request.LogVolume = true;
   SetVolumes(f, {100, 1000, 10000});
   ASSERT_TRUE(f.Compose());
@@ -109,7 +109,7 @@ TEST(LogVolumeTest, LineTakesTheBaseWhereLinesAreLogarithmic) {
 // 2100 / 2 = 1050 records back from 2000. 1050 * 2 + 120.
 TEST(MultiOscTest, PlotIs2100WideAndTheSurfaceHoldsItsRecordsAnd120More) {
   ComposerFixture f;
-  f.request.MultiOscOn = -1;
+  f.request.Place = ChartPlace::kWide;
   f.Days("20180101", 2000);
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.chart.PlotWidth, 2100);
@@ -123,7 +123,7 @@ TEST(MultiOscTest, PlotIs2100WideAndTheSurfaceHoldsItsRecordsAnd120More) {
 
 TEST(MultiOscTest, BlankSpaceTakesNothingFromIt) {
   ComposerFixture f;
-  f.request.MultiOscOn = -1;
+  f.request.Place = ChartPlace::kWide;
   f.request.BlankSpace = 300;
   f.Days("20180101", 2000);
   ASSERT_TRUE(f.Compose());
@@ -134,7 +134,7 @@ TEST(MultiOscTest, BlankSpaceTakesNothingFromIt) {
 
 TEST(MultiOscTest, FewRecordsMakeANarrowSurface) {
   ComposerFixture f;
-  f.request.MultiOscOn = -1;
+  f.request.Place = ChartPlace::kWide;
   f.request.BarSpacing = 4;
   f.Days("20240101", 30);
   ASSERT_TRUE(f.Compose());
@@ -145,8 +145,8 @@ TEST(MultiOscTest, FewRecordsMakeANarrowSurface) {
 // The surface counts records, not bars: 2100 / 10 * 4.75 = 997.5, half to even 998.
 TEST(MultiOscTest, WeeklyChartStillCountsRecords) {
   ComposerFixture f;
-  f.request.MultiOscOn = -1;
-  f.request.ChartPeriod = "W";
+  f.request.Place = ChartPlace::kWide;
+  f.request.ChartPeriod = Period::kWeekly;
   f.request.BarSpacing = 10;
   f.Days("20180101", 2000);
   ASSERT_TRUE(f.Compose());
@@ -174,7 +174,7 @@ TEST(ScriptPrintModeTest, TickLabelsStandWiderApartInTheScriptAlone) {
   EXPECT_TRUE(f.Wrote("S,8.25,9,246,10.00,27"));
   f.request.ScriptPrintMode = true;
   ASSERT_TRUE(f.Compose());
-  EXPECT_TRUE(f.Wrote("S,8.25,1,417,8.80,27"));   // 42 - 20 - 21, 429 - 12
+  EXPECT_TRUE(f.Wrote("S,8.25,1,417,8.80,27"));  // 42 - 20 - 21, 429 - 12
   EXPECT_TRUE(f.Wrote("S,8.25,-6,240,10.00,27"));
   EXPECT_FALSE(f.Wrote("S,8.25,16,423,8.80,27"));
   EXPECT_TRUE(f.price.Has("text 8.25 b 16,423 8.80 27"));
@@ -239,8 +239,7 @@ TEST(TwoChartsVolumeTest, EachHalfHasItsVolumePanelAndALongerLowerChartStartsAtT
   ComposerFixture f;
   f.request.VolHeight = 2;
   SetVolumes(f, {1000, 3000});
-  f.chart.TwoCharts = true;
-  f.chart.ChartSlot = 1;
+  f.request.Place = ChartPlace::kUpper;
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.chart.UpperBarCount, 1);
   EXPECT_TRUE(f.Wrote("B,42,186,631,207,16"));
@@ -250,6 +249,7 @@ TEST(TwoChartsVolumeTest, EachHalfHasItsVolumePanelAndALongerLowerChartStartsAtT
   EXPECT_TRUE(f.Wrote("L,42,207,42,212,27"));  // the date tick hangs from the panel
 
   SetVolumes(f, {1000, 1000, 1000, 1000, 6000});
+  f.request.Place = ChartPlace::kLower;
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.chart.FirstBarX, 42);
   EXPECT_EQ(f.chart.LastBarX, 42 + 5 * 2);
@@ -270,22 +270,22 @@ TEST(TwoChartsVolumeTest, EachHalfHasItsVolumePanelAndALongerLowerChartStartsAtT
 // stays where it has more.
 TEST(SuperimposedTest, SecondIsAlignedAndNeitherHasAVolumePanel) {
   ComposerFixture f;
-  const auto compose = [&f](std::int16_t panel, int days) {
+  const auto compose = [&f](ChartPlace place, int days) {
     f.days.clear();
     f.Days("20240101", days, 500);
-    f.chart.OscPanel = panel;
+    f.request.Place = place;
     return f.Compose();
   };
-  ASSERT_TRUE(compose(1, 5));
+  ASSERT_TRUE(compose(ChartPlace::kUnder, 5));
   EXPECT_EQ(f.chart.UpperBarCount, 4);
   EXPECT_EQ(f.chart.ChartBottom, 429);
   EXPECT_FALSE(f.chart.Bars.VolumeShown);
-  ASSERT_TRUE(compose(2, 2));
+  ASSERT_TRUE(compose(ChartPlace::kOver, 2));
   EXPECT_EQ(f.chart.FirstBarX, 42 + 3 * 2);
   EXPECT_EQ(f.chart.UpperBarCount, 4);
-  ASSERT_TRUE(compose(2, 9));
+  ASSERT_TRUE(compose(ChartPlace::kOver, 9));
   EXPECT_EQ(f.chart.FirstBarX, 42);
-  ASSERT_TRUE(compose(1, 2));
+  ASSERT_TRUE(compose(ChartPlace::kUnder, 2));
   EXPECT_EQ(f.chart.FirstBarX, 42);
   EXPECT_EQ(f.chart.UpperBarCount, 1);
   for (const std::string& line : f.Lines('H')) EXPECT_FALSE(line.ends_with(",22")) << line;
@@ -297,17 +297,18 @@ TEST(SuperimposedTest, SecondIsAlignedAndNeitherHasAVolumePanel) {
 // eleven from the one to the other.
 TEST(OscNameTest, DecidesOverSmoothingAndAverages) {
   struct Row {
-    char style;
+    Style style;
     const char* name;
     bool smoothing, averages;
   };
-  for (const Row& row : {Row{'B', "", true, true}, Row{'C', "", true, true},
-                         Row{'L', "", true, true}, Row{'B', "RSI", true, true},
-                         Row{'B', "PARA", false, false}, Row{'C', "PARA", false, false},
-                         Row{'L', "PARA", true, false}, Row{'B', "PARAV", false, true},
-                         Row{'C', "PARAV", false, true}, Row{'L', "PARAV", true, true},
-                         Row{'B', "MACD", false, false}, Row{'C', "MACD", false, false},
-                         Row{'L', "MACD", false, false}}) {
+  for (const Row& row :
+       {Row{Style::kBar, "", true, true}, Row{Style::kCandlestick, "", true, true},
+        Row{Style::kLine, "", true, true}, Row{Style::kBar, "RSI", true, true},
+        Row{Style::kBar, "PARA", false, false}, Row{Style::kCandlestick, "PARA", false, false},
+        Row{Style::kLine, "PARA", true, false}, Row{Style::kBar, "PARAV", false, true},
+        Row{Style::kCandlestick, "PARAV", false, true}, Row{Style::kLine, "PARAV", true, true},
+        Row{Style::kBar, "MACD", false, false}, Row{Style::kCandlestick, "MACD", false, false},
+        Row{Style::kLine, "MACD", false, false}}) {
     ComposerFixture f;
     f.request.ChartStyle = row.style;
     f.request.OscName = row.name;
@@ -317,9 +318,9 @@ TEST(OscNameTest, DecidesOverSmoothingAndAverages) {
     f.Days("20240101", 12);
     ASSERT_TRUE(f.Compose());
     EXPECT_EQ(f.Lines('P'), row.smoothing ? (Lines{"P,72,252,19", "P,75,252,19"}) : Lines{})
-        << row.style << row.name;
-    EXPECT_EQ(f.Wrote("L,72,252,75,252,20"), row.averages) << row.style << row.name;
-    EXPECT_EQ(f.Wrote("H,72,252,75,252,21"), row.averages) << row.style << row.name;
+        << TextOf(row.style) << row.name;
+    EXPECT_EQ(f.Wrote("L,72,252,75,252,20"), row.averages) << TextOf(row.style) << row.name;
+    EXPECT_EQ(f.Wrote("H,72,252,75,252,21"), row.averages) << TextOf(row.style) << row.name;
   }
 }
 
@@ -338,7 +339,7 @@ TEST(OscNameTest, SmoothingNeedsOneOfTheAveragesOn) {
 
 // 384 units for 0.05: 90 would stand 614,400 units above 10.
 TEST(PixelOverflowTest, EndsTheScriptWithTheBarBeforeInEveryStyle) {
-  for (const char style : {'B', 'C', 'L'}) {
+  for (const Style style : {Style::kBar, Style::kCandlestick, Style::kLine}) {
     ComposerFixture f;
     f.request.ChartStyle = style;
     f.request.AutoScale = false;
@@ -349,20 +350,20 @@ TEST(PixelOverflowTest, EndsTheScriptWithTheBarBeforeInEveryStyle) {
     f.Day("20240318", 90, 90, 90, 90);
     f.Day("20240319", 10, 10, 10, 10);
     EXPECT_FALSE(f.Compose());
-    ASSERT_EQ(f.dialogs.said.size(), 1u) << style;
+    ASSERT_EQ(f.dialogs.said.size(), 1u) << TextOf(style);
     EXPECT_EQ(f.dialogs.said[0].title, "Chart Display");
     EXPECT_EQ(f.dialogs.said[0].text,
               "There is a problem with the data for TEST.WDT\n at date (20240318) "
               "\nUse View/Modify Data procedure to correct.")
-        << style;
+        << TextOf(style);
     EXPECT_FALSE(f.chart.ChartDrawn);
     EXPECT_FALSE(f.script.IsOpen());
     const Lines bars = f.Lines('H');
-    ASSERT_FALSE(bars.empty()) << style;
-    EXPECT_EQ(bars.back(), style == 'L' ? "H,42,429,44,429,18" : "H,44,429,44,429,18");
-    EXPECT_EQ(f.script.text().find(",46,"), std::string::npos) << style;
-    EXPECT_TRUE(f.Lines('Z').empty()) << style;                  // nothing that follows the bars
-    EXPECT_FALSE(f.Wrote("B,42,45,631,429,16")) << style;
+    ASSERT_FALSE(bars.empty()) << TextOf(style);
+    EXPECT_EQ(bars.back(), style == Style::kLine ? "H,42,429,44,429,18" : "H,44,429,44,429,18");
+    EXPECT_EQ(f.script.text().find(",46,"), std::string::npos) << TextOf(style);
+    EXPECT_TRUE(f.Lines('Z').empty()) << TextOf(style);  // nothing that follows the bars
+    EXPECT_FALSE(f.Wrote("B,42,45,631,429,16")) << TextOf(style);
 
     // The next chart is none the worse.
     f.request.AutoScale = true;
@@ -372,17 +373,17 @@ TEST(PixelOverflowTest, EndsTheScriptWithTheBarBeforeInEveryStyle) {
     fresh.request.ChartStyle = style;
     fresh.days = f.days;
     ASSERT_TRUE(fresh.Compose());
-    EXPECT_EQ(f.script.text(), fresh.script.text()) << style;
+    EXPECT_EQ(f.script.text(), fresh.script.text()) << TextOf(style);
   }
 }
 
 // 2000 bars: mean (1999 + 2000000) / 2000 = 1001, 1000 / 31 a unit; the last volume would stand
 // 62,000 units up.
 TEST(PixelOverflowTest, VolumeFarAboveTheMeanIsToldUnlessVolumesAreCut) {
-  for (const char style : {'B', 'C'}) {
+  for (const Style style : {Style::kBar, Style::kCandlestick}) {
     ComposerFixture f;
     f.request.ChartStyle = style;
-    f.request.MultiOscOn = -1;  // the one surface that holds so many bars
+    f.request.Place = ChartPlace::kWide;  // the one surface that holds so many bars
     f.request.BarSpacing = 1;
     f.Days("20180101", 2000, 1);
     f.days.back().Volume = 2000000;
@@ -400,33 +401,33 @@ TEST(PixelOverflowTest, VolumeFarAboveTheMeanIsToldUnlessVolumesAreCut) {
 // A picture one unit high has its top where its bottom is; one of 5 has 4 units for a plot and
 // none for the panel: round(4 - 4 * 1.03).
 TEST(PixelOverflowTest, PictureTooLowForAScaleIsToldInEveryStyle) {
-  for (const char style : {'B', 'C', 'L'}) {
+  for (const Style style : {Style::kBar, Style::kCandlestick, Style::kLine}) {
     for (const int height : {1, 5}) {
       ComposerFixture f;
       test::RecordingSurface low(638, height);
       f.request.ChartStyle = style;
       SetVolumes(f, {1000, 3000});
       f.Save();
-      ChartServices services{f.home.files(), f.dialogs, f.paths, f.fonts, f.colours,
-                             low,            nullptr,   &f.script, {}};
+      ChartServices services{f.home.files(), f.dialogs, f.paths, f.fonts, f.colours, low,
+                             nullptr,        &f.script, {}};
       EXPECT_FALSE(ComposeChart(services, f.request, f.chart));
-      ASSERT_EQ(f.dialogs.said.size(), 1u) << style << height;
+      ASSERT_EQ(f.dialogs.said.size(), 1u) << TextOf(style) << height;
       EXPECT_EQ(f.dialogs.said[0].text, "There is an unexpected error No. 11\nDivision by zero");
       EXPECT_FALSE(f.script.IsOpen());
-      EXPECT_TRUE(f.Lines('H').empty()) << style << height;
+      EXPECT_TRUE(f.Lines('H').empty()) << TextOf(style) << height;
     }
   }
 }
 
 // 99 percent of 40 lies left of the plot: no bar is asked for, and the last one is there.
 TEST(PixelOverflowTest, PictureNarrowerThanItsScaleShowsTheLastBar) {
-  for (const char style : {'B', 'C', 'L'}) {
+  for (const Style style : {Style::kBar, Style::kCandlestick, Style::kLine}) {
     ComposerFixture f;
     test::RecordingSurface narrow(40, 452);
     f.request.ChartStyle = style;
     f.Days("20240101", 30);
     f.Save();
-    ChartServices services{f.home.files(), f.dialogs, f.paths, f.fonts, f.colours,
+    ChartServices services{f.home.files(), f.dialogs, f.paths,   f.fonts, f.colours,
                            narrow,         nullptr,   &f.script, {}};
     ASSERT_TRUE(ComposeChart(services, f.request, f.chart));
     EXPECT_EQ(f.chart.Bars.FirstDataRec, 30);
@@ -499,12 +500,12 @@ TEST(StopLossChartTest, PercentOutside1To100SetsNone) {
 }
 
 TEST(StopLossChartTest, BarsAloneHaveIt) {
-  for (const char style : {'C', 'L'}) {
+  for (const Style style : {Style::kCandlestick, Style::kLine}) {
     StopFixture f;
     f.state.OutsideDaysOn = true;
     f.state.ChartStyle = style;
     ASSERT_TRUE(f.ComposeAsSet());
-    EXPECT_FALSE(f.ToldOfStop()) << style;
+    EXPECT_FALSE(f.ToldOfStop()) << TextOf(style);
     for (const std::string& line : f.Lines('H')) EXPECT_TRUE(line.ends_with(",18")) << line;
   }
 }
@@ -528,13 +529,11 @@ TEST(AverageLettersTest, FirstIsWrittenAsAThinLineAndTheSecondAtThePrintWeight) 
     return out;
   };
   ASSERT_TRUE(f.Compose());
-  EXPECT_EQ(averages(),
-            (Lines{"L,44,215,46,215,20", "L,46,215,48,215,20", "H,46,227,48,203,21"}));
+  EXPECT_EQ(averages(), (Lines{"L,44,215,46,215,20", "L,46,215,48,215,20", "H,46,227,48,203,21"}));
   // Of two, k = 2/3: 215, 239.67 -> 240, 198.67 -> 199. Of three, k = 1/2: 227, 202.5 -> 202.
   f.request.MaExp = true;
   ASSERT_TRUE(f.Compose());
-  EXPECT_EQ(averages(),
-            (Lines{"L,44,215,46,240,20", "L,46,240,48,199,20", "H,46,227,48,202,21"}));
+  EXPECT_EQ(averages(), (Lines{"L,44,215,46,240,20", "L,46,240,48,199,20", "H,46,227,48,202,21"}));
 }
 
 TEST(AverageLettersTest, SecondAloneKeepsItsLetter) {

@@ -43,17 +43,17 @@ TEST(ComposerTest, OrderOfThePartsOfAChart) {
   ASSERT_TRUE(f.Compose());
   // With volume the plot ends at 386: 0.0076246 a unit, y(10.5) = 386 - 222.96.
   // The first line of each kind, in the order in which they must come.
-  const Lines order = {"T,8,20,2,TEST    Test Holdings,26",   // title
-                       "L,42,429,42,434,27",                  // date tick at the first bar
-                       "H,42,429,42,",                        // volume bar
-                       "B,42,386,631,429,16",                 // volume panel
-                       "B,42,45,631,386,16",                  // frame of the scale
-                       "S,8.25,44,33,DAILY - ARITHMETIC -,27",   // mode line
-                       "V,242,45,242,386,35",                 // fixed grid, 100 bars on
-                       "T,8.25,380,2,Last date",              // end texts
+  const Lines order = {"T,8,20,2,TEST    Test Holdings,26",     // title
+                       "L,42,429,42,434,27",                    // date tick at the first bar
+                       "H,42,429,42,",                          // volume bar
+                       "B,42,386,631,429,16",                   // volume panel
+                       "B,42,45,631,386,16",                    // frame of the scale
+                       "S,8.25,44,33,DAILY - ARITHMETIC -,27",  // mode line
+                       "V,242,45,242,386,35",                   // fixed grid, 100 bars on
+                       "T,8.25,380,2,Last date",                // end texts
                        "T,8.25,380,20,Closing",
-                       "Z,7,601,35,KORA,27",                  // stamp
-                       "L,42,163,44,163,20"};                 // first average
+                       "Z,7,601,35,KORA,27",   // stamp
+                       "L,42,163,44,163,20"};  // first average
   const Lines script = f.Script();
   size_t at = 0;
   for (const std::string& want : order) {
@@ -81,12 +81,12 @@ TEST(ComposerTest, WantedRecordsFillThePlot) {
   EXPECT_EQ(f.chart.Bars.BarCount, 290);
   EXPECT_EQ(f.chart.LastBarX, 42 + 291 * 2);
   // Weekly: 290 * 4.75 = 1377.5, more than there are.
-  f.request.ChartPeriod = "W";
+  f.request.ChartPeriod = Period::kWeekly;
   f.request.BarSpacing = 10;
   // 58 * 4.75 = 275.5, half to even 276.
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.chart.Bars.FirstDataRec, 724);
-  f.request.ChartPeriod = "M";
+  f.request.ChartPeriod = Period::kMonthly;
   f.request.BarSpacing = 20;
   // 29 * 20 = 580.
   ASSERT_TRUE(f.Compose());
@@ -96,7 +96,7 @@ TEST(ComposerTest, WantedRecordsFillThePlot) {
 TEST(ComposerTest, WeekFactorOf6ChartsWith475AndOneOf525AsItIs) {
   ComposerFixture f;
   f.Days("20200101", 1000);
-  f.request.ChartPeriod = "W";
+  f.request.ChartPeriod = Period::kWeekly;
   f.request.BarSpacing = 10;
   f.request.BlankSpace = 9;
   f.request.WeekFactor = 6;
@@ -143,7 +143,7 @@ TEST(ComposerTest, FallingCandleIsFilledAndARisingOneAnOutlineInTheScriptAlone) 
   ComposerFixture f;
   f.Day("20240314", 10.5f, 11, 9, 10);
   f.Day("20240315", 10, 11, 9, 10.5f);
-  f.request.ChartStyle = 'C';
+  f.request.ChartStyle = Style::kCandlestick;
   f.request.BarSpacing = 4;
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.Lines('C'), Lines{"C,40.5,178,43.5,252,28"});
@@ -308,8 +308,8 @@ TEST(ComposerTest, BrokenStopIsToldOnlyWhereTheLastBarBreaksIt) {
   f.request.StopLossShown = true;
   f.request.StopLossPct = 1;
   f.Day("20240313", 10, 10.5f, 9.5f, 10);
-  f.Day("20240314", 10, 11, 9.2f, 10);        // stop 9.108
-  f.Day("20240315", 9.5f, 9.5f, 9, 9.05f);    // breaks it
+  f.Day("20240314", 10, 11, 9.2f, 10);      // stop 9.108
+  f.Day("20240315", 9.5f, 9.5f, 9, 9.05f);  // breaks it
   ASSERT_TRUE(f.Compose());
   EXPECT_NE(f.script.text().find("PREVIOUS STOP BROKEN,13"), std::string::npos);
   EXPECT_TRUE(f.Wrote("H,46,326,46,399,11"));  // y(9.5) = 429 - 103.38
@@ -342,7 +342,7 @@ TEST(ComposerTest, SecondAverageIsWrittenAtThePrintWeightAndWeeklyChartsTakeTheW
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote("H,98,252,100,252,21"));
   EXPECT_FALSE(f.Wrote("L,98,252,100,252,20"));
-  f.request.ChartPeriod = "W";
+  f.request.ChartPeriod = Period::kWeekly;
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote("L,48,252,50,252,20"));
 }
@@ -389,15 +389,15 @@ TEST(DateAxisTest, MovingGridTakesThePlaceOfTheTicksWithinAYear) {
   f.request.GridLines = true;
   f.request.BarSpacing = 5;
   ASSERT_TRUE(f.Compose());
-  EXPECT_TRUE(f.Wrote("L,42,429,42,434,27"));            // the first year differs from none
-  EXPECT_TRUE(f.Wrote("V,127,45,127,434,35"));           // 1 February
+  EXPECT_TRUE(f.Wrote("L,42,429,42,434,27"));   // the first year differs from none
+  EXPECT_TRUE(f.Wrote("V,127,45,127,434,35"));  // 1 February
   EXPECT_TRUE(f.price.Has("line dot 127,50,127,429 35"));
 }
 
 TEST(DateAxisTest, WeeklyChartsShowYearsAlone) {
   ComposerFixture f;
   f.Days("20231101", 120);
-  f.request.ChartPeriod = "W";
+  f.request.ChartPeriod = Period::kWeekly;
   f.request.BarSpacing = 5;
   ASSERT_TRUE(f.Compose());
   int texts = 0;
@@ -412,11 +412,11 @@ TEST(DateAxisTest, WeeklyChartsShowYearsAlone) {
 TEST(DateAxisTest, SuperimposedSecondChartStandsOnTheAxisOfTheFirst) {
   ComposerFixture f;
   f.Day("20240315", 10, 11, 9, 10);
-  f.chart.OscPanel = 1;
+  f.request.Place = ChartPlace::kUnder;
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote("T,8.25,42,431,M,27"));
   f.script.Open(false);
-  f.chart.OscPanel = 2;
+  f.request.Place = ChartPlace::kOver;
   ASSERT_TRUE(f.Compose());
   EXPECT_FALSE(f.Wrote("T,8.25,42,431,M,27"));
 }
@@ -467,10 +467,9 @@ TEST(ScaleTest, PercentageBandsAreNamedInTheModeLineWithTheDefault5) {
   f.request.Name.BandDown = 101;
   f.Day("20240315", 10, 11, 9, 10);
   ASSERT_TRUE(f.Compose());
-  EXPECT_TRUE(f.Wrote(
-      "S,8.25,44,33,DAILY - ARITHMETIC -      Percentage Bands  &5%    -5%,27"));
-  EXPECT_TRUE(f.price.Has(
-      "text 8.25 44,27 DAILY - ARITHMETIC -      Percentage Bands  &5%    -5% 27"));
+  EXPECT_TRUE(f.Wrote("S,8.25,44,33,DAILY - ARITHMETIC -      Percentage Bands  &5%    -5%,27"));
+  EXPECT_TRUE(
+      f.price.Has("text 8.25 44,27 DAILY - ARITHMETIC -      Percentage Bands  &5%    -5% 27"));
 }
 
 TEST(ScaleTest, ClassTextFollowsTheModeUnlessItIsUnknown) {
@@ -491,7 +490,7 @@ TEST(ScaleTest, LogarithmicLineHasAFurtherBlankInItsModeText) {
   f.Day("20240315", 10, 11, 9, 10);
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote("S,8.25,44,33,DAILY - LOGARITHMIC -,27"));
-  f.request.ChartStyle = 'L';
+  f.request.ChartStyle = Style::kLine;
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote("S,8.25,44,33,DAILY - LOGARITHMIC - ,27"));
 }
@@ -504,7 +503,8 @@ TEST(ScaleTest, IndexOfZeroHasAnEmptyLabelWhichWritesNoLine) {
   f.request.Name.Top = 10;  // step 1: -10 .. 10, 0 among them
   f.Day("20240315", 5, 6, 4, 5);
   ASSERT_TRUE(f.Compose());
-  for (const std::string& line : f.Lines('S')) EXPECT_EQ(line.find(",,"), std::string::npos) << line;
+  for (const std::string& line : f.Lines('S'))
+    EXPECT_EQ(line.find(",,"), std::string::npos) << line;
 }
 
 TEST(ComposerTitleTest, OtherDetailsStandOnTheNextLineBehindFifteenBlanks) {
@@ -528,10 +528,10 @@ TEST(ComposerTitleTest, PrintModeOfTheScriptHasTwoBlanksAndALargerStamp) {
 TEST(ComposerTitleTest, PanelChartsShowTheirCodesSideBySideInTheirOwnColours) {
   ComposerFixture f;
   f.Day("20240315", 10, 11, 9, 10);
-  f.chart.OscPanel = 1;
+  f.request.Place = ChartPlace::kUnder;
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote("T,9.75,0,2,TEST,21"));
-  f.chart.OscPanel = 2;
+  f.request.Place = ChartPlace::kOver;
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote("T,9.75,60,2,TEST,22"));
   EXPECT_TRUE(f.Wrote("T,9.75,0,2,TEST,21"));  // the script went on
@@ -540,16 +540,15 @@ TEST(ComposerTitleTest, PanelChartsShowTheirCodesSideBySideInTheirOwnColours) {
 TEST(TwoChartsTest, UpperAndLowerHalfWithTheLastBarsBelowEachOther) {
   ComposerFixture f;
   f.Days("20240101", 20);
-  f.chart.TwoCharts = true;
-  f.chart.ChartSlot = 1;
+  f.request.Place = ChartPlace::kUpper;
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.chart.ChartTop, 2);
   EXPECT_EQ(f.chart.ChartBottom, 207);  // 46 percent of 452
-  EXPECT_EQ(f.chart.ChartSlot, 2);
   const std::int16_t lastX = f.chart.LastBarX;
   const size_t upper = f.Script().size();
 
   f.days.resize(5);
+  f.request.Place = ChartPlace::kLower;
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.chart.ChartTop, 230);  // 51 percent
   EXPECT_EQ(f.chart.ChartBottom, 429);
@@ -559,8 +558,6 @@ TEST(TwoChartsTest, UpperAndLowerHalfWithTheLastBarsBelowEachOther) {
   EXPECT_EQ(f.price.ops.front().rfind("cls", 0), std::string::npos);
   EXPECT_TRUE(f.Wrote("T,9.75,168,232,TEST,26"));
   EXPECT_TRUE(f.Wrote("T,8.25,380,232,Last date processed 05-01-24,27"));
-  EXPECT_FALSE(f.chart.TwoCharts);
-  EXPECT_EQ(f.chart.ChartSlot, 0);
 }
 
 TEST(ComposerFailureTest, EmptyFileIsToldAndNothingIsCharted) {
@@ -662,7 +659,7 @@ TEST(ComposerFailureTest, AdvanceDeclineSeriesHasItsOwnAdvice) {
 
 TEST(ComposerFailureTest, BadWeeklyDateNamesTheRecord) {
   ComposerFixture f;
-  f.request.ChartPeriod = "W";
+  f.request.ChartPeriod = Period::kWeekly;
   f.Day("20240314", 10, 11, 9, 10);
   f.Day("2024xx15", 10, 11, 9, 10);
   EXPECT_FALSE(f.Compose());
@@ -674,7 +671,7 @@ TEST(ComposerFailureTest, BadWeeklyDateNamesTheRecord) {
 
 TEST(ComposerFailureTest, WeekWhoseVolumeLeaves32BitsNamesTheRecordAtWhichItLeft) {
   ComposerFixture f;
-  f.request.ChartPeriod = "W";
+  f.request.ChartPeriod = Period::kWeekly;
   f.Day("20240101", 10, 11, 9, 10, 2000000000);
   f.Day("20240102", 10, 11, 9, 10, 2000000000);
   f.Day("20240103", 10, 11, 9, 10, 1);
@@ -689,7 +686,7 @@ TEST(ComposerFailureTest, WeekWhoseVolumeLeaves32BitsNamesTheRecordAtWhichItLeft
 TEST(ComposerFailureTest, NotANumberAndInfinityInTheFileAreToldAndNoCrash) {
   for (const float bad : {std::nanf(""), std::numeric_limits<float>::infinity(),
                           -std::numeric_limits<float>::infinity()}) {
-    for (const char style : {'B', 'C', 'L'}) {
+    for (const Style style : {Style::kBar, Style::kCandlestick, Style::kLine}) {
       ComposerFixture f;
       f.request.ChartStyle = style;
       f.Day("20240313", 10, 11, 9, 10);
@@ -714,15 +711,15 @@ TEST(ComposerFailureTest, DiskNotReadyIsTriedAgainAsLongAsTheUserWants) {
 TEST(ComposerFailureTest, SecondTryAfterTheDiskWasNotReadyWritesTheScriptOnce) {
   ComposerFixture f;
   f.Day("20240315", 10, 11, 9, 10);
-  f.chart.OscPanel = 1;
+  f.request.Place = ChartPlace::kUnder;
   ASSERT_TRUE(f.Compose());
-  f.chart.OscPanel = 2;  // goes on behind the first
+  f.request.Place = ChartPlace::kOver;  // goes on behind the first
   ASSERT_TRUE(f.Compose());
   const std::string once = f.script.text();
 
   ComposerFixture g;
   g.Day("20240315", 10, 11, 9, 10);
-  g.chart.OscPanel = 1;
+  g.request.Place = ChartPlace::kUnder;
   ASSERT_TRUE(g.Compose());
   struct Slow : test::RecordingSurface {
     using RecordingSurface::RecordingSurface;
@@ -734,9 +731,9 @@ TEST(ComposerFailureTest, SecondTryAfterTheDiskWasNotReadyWritesTheScriptOnce) {
   };
   Slow slow(638, 452);
   g.dialogs.answers = {Answer::kOk};
-  g.chart.OscPanel = 2;
+  g.request.Place = ChartPlace::kOver;
   slow.left = 1;
-  ChartServices services{g.home.files(), g.dialogs, g.paths, g.fonts, g.colours,
+  ChartServices services{g.home.files(), g.dialogs, g.paths,   g.fonts, g.colours,
                          slow,           nullptr,   &g.script, {}};
   EXPECT_TRUE(ComposeChart(services, g.request, g.chart));
   EXPECT_EQ(g.dialogs.said.size(), 1u);
@@ -766,7 +763,7 @@ TEST(ComposerFailureTest, RefusedFontIsNamedInUpperCase) {
   f.fonts.Font1Name = "Odd Face";
   f.Day("20240315", 10, 11, 9, 10);
   f.Save();
-  ChartServices services{f.home.files(), f.dialogs, f.paths, f.fonts, f.colours,
+  ChartServices services{f.home.files(), f.dialogs, f.paths,   f.fonts, f.colours,
                          picky,          nullptr,   &f.script, {}};
   EXPECT_FALSE(ComposeChart(services, f.request, f.chart));
   ASSERT_EQ(f.dialogs.said.size(), 1u);
@@ -790,7 +787,7 @@ TEST(ComposerTest, SuppressedScriptStaysTheRecordOfTheChart) {
   ASSERT_TRUE(f.Compose());
   const std::string before = f.script.text();
   f.request.SuppressScript = true;
-  f.request.ChartStyle = 'L';
+  f.request.ChartStyle = Style::kLine;
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(f.script.text(), before);
   EXPECT_FALSE(f.price.ops.empty());

@@ -32,7 +32,8 @@ Drawn Draw(decltype(SimpleAverageLine)* routine, std::int16_t period,
 TEST(SimpleAverageLineTest, StartsWithTheSecondFullWindow) {
   // Means of three: 20, 23 (22.67), 31 (31.33).
   const Drawn d = Draw(SimpleAverageLine, 3, {10, 20, 30, 18, 46}, 1);
-  EXPECT_EQ(d.ops, (std::vector<std::string>{"line solid 48,20,51,23 7", "line solid 51,23,54,31 7"}));
+  EXPECT_EQ(d.ops,
+            (std::vector<std::string>{"line solid 48,20,51,23 7", "line solid 51,23,54,31 7"}));
   EXPECT_EQ(d.script, "L,48,20,51,23,7\r\nL,51,23,54,31,7\r\n");
 }
 
@@ -51,7 +52,8 @@ TEST(SimpleAverageLineTest, PointAfterAYOf0HasNoLine) {
 
 TEST(SimpleAverageLineTest, FewerClosesThanThePeriodOrNoPeriodDrawNothing) {
   for (const int period : {6, 5, 0, -3})
-    EXPECT_EQ(Draw(SimpleAverageLine, std::int16_t(period), {1, 2, 3, 4, 5}, 1).script, "") << period;
+    EXPECT_EQ(Draw(SimpleAverageLine, std::int16_t(period), {1, 2, 3, 4, 5}, 1).script, "")
+        << period;
 }
 
 TEST(ExpAverageLineTest, SeedsWithTheMeanThenTakesTwoOverPeriodPlusOne) {
@@ -63,9 +65,9 @@ TEST(ExpAverageLineTest, SeedsWithTheMeanThenTakesTwoOverPeriodPlusOne) {
 TEST(CloseSmootherTest, SimpleIsARollingMeanOfTen) {
   CloseSmoother smoother(false);
   for (int i = 1; i <= 9; ++i) EXPECT_FALSE(smoother.Add(std::int16_t(i)).has_value());
-  EXPECT_EQ(smoother.Add(10), 6);   // 5.5 to even
-  EXPECT_EQ(smoother.Add(11), 6);   // 6.5 to even
-  EXPECT_EQ(smoother.Add(22), 8);   // 3 to 11 and 22: 8.5 to even
+  EXPECT_EQ(smoother.Add(10), 6);  // 5.5 to even
+  EXPECT_EQ(smoother.Add(11), 6);  // 6.5 to even
+  EXPECT_EQ(smoother.Add(22), 8);  // 3 to 11 and 22: 8.5 to even
 }
 
 TEST(CloseSmootherTest, ExponentialRoundsAtEachStep) {

@@ -87,8 +87,9 @@ class ForeColourSurface : public RecordingSurface {
 
 TEST(ScriptPlayerTest, LinesOfEachLetterPlayInTheirStyle) {
   PlayerFixture f;
-  ASSERT_TRUE(f.Play("L,1,2,3,4,5\r\nH,1,2,3,4,6\r\nM,1,2,3,4,7\r\nD,1,2,3,4,8\r\n"
-                     "E,1,2,3,4,9\r\nV,1,2,3,4,10\r\nL,5,6,7,8,11\r\n"));
+  ASSERT_TRUE(
+      f.Play("L,1,2,3,4,5\r\nH,1,2,3,4,6\r\nM,1,2,3,4,7\r\nD,1,2,3,4,8\r\n"
+             "E,1,2,3,4,9\r\nV,1,2,3,4,10\r\nL,5,6,7,8,11\r\n"));
   EXPECT_EQ(f.surface.ops,
             (Ops{"line solid 1,2,3,4 5", "line solid 1,2,3,4 6", "line solid 1,2,3,4 7",
                  "line dash 1,2,3,4 8", "line dash 1,2,3,4 9", "line dot 1,2,3,4 10",
@@ -98,15 +99,15 @@ TEST(ScriptPlayerTest, LinesOfEachLetterPlayInTheirStyle) {
 TEST(ScriptPlayerTest, BoxesAndPoints) {
   PlayerFixture f;
   ASSERT_TRUE(f.Play("B,1,2,3,4,5\r\nF,1,2,3,4,6\r\nC,1,2,3,4,7\r\nP,41,252,18\r\n"));
-  EXPECT_EQ(f.surface.ops, (Ops{"box 1,2,3,4 5", "fill 1,2,3,4 6", "fill 1,2,3,4 7",
-                                "point 41,252 18"}));
+  EXPECT_EQ(f.surface.ops,
+            (Ops{"box 1,2,3,4 5", "fill 1,2,3,4 6", "fill 1,2,3,4 7", "point 41,252 18"}));
 }
 
 TEST(ScriptPlayerTest, CoordinatesOfLinesAndBoxesRoundHalfToEven) {
   PlayerFixture f;
   ASSERT_TRUE(f.Play("H,40.5,10.5,42.5,11.5,1\r\nC,43.5,0.5,41.5,-0.5,2\r\nL,1.4,-1.6,0,0,3\r\n"));
-  EXPECT_EQ(f.surface.ops, (Ops{"line solid 40,10,42,12 1", "fill 44,0,42,0 2",
-                                "line solid 1,-2,0,0 3"}));
+  EXPECT_EQ(f.surface.ops,
+            (Ops{"line solid 40,10,42,12 1", "fill 44,0,42,0 2", "line solid 1,-2,0,0 3"}));
 }
 
 TEST(ScriptPlayerTest, TextKeepsFractionsOfPlaceAndSize) {
@@ -131,8 +132,7 @@ TEST(ScriptPlayerTest, BlanksAroundATextOfTStayAndOfSVanish) {
 TEST(ScriptPlayerTest, LowerCaseLettersPlayButATextOfLowerTLosesItsBlanks) {
   PlayerFixture f;
   ASSERT_TRUE(f.Play("l,1,2,3,4,5\r\nt,8,20,2,A B,1\r\nv,1,2,3,4,5\r\n"));
-  EXPECT_EQ(f.surface.ops,
-            (Ops{"line solid 1,2,3,4 5", "text 8 20,2 AB 1", "line dot 1,2,3,4 5"}));
+  EXPECT_EQ(f.surface.ops, (Ops{"line solid 1,2,3,4 5", "text 8 20,2 AB 1", "line dot 1,2,3,4 5"}));
 }
 
 TEST(ScriptPlayerTest, CommaInATextCutsItAndTheRestIsTheColour) {
@@ -157,8 +157,7 @@ TEST(ScriptPlayerTest, EmptySDrawsNothingButBringsFont1Back) {
   f.fonts.Font1Bold = true;
   // The stamp leaves the bold off; S brings it back, with a text or without.
   ASSERT_TRUE(f.Play("Z,7,1,2,KORA,3\r\nT,8,20,2,A,1\r\nS,8,1,2,,3\r\nT,8,20,2,A,1\r\n"));
-  EXPECT_EQ(f.surface.ops,
-            (Ops{"text 7 b i 1,2 KORA 3", "text 8 20,2 A 1", "text 8 b 20,2 A 1"}));
+  EXPECT_EQ(f.surface.ops, (Ops{"text 7 b i 1,2 KORA 3", "text 8 20,2 A 1", "text 8 b 20,2 A 1"}));
 }
 
 TEST(ScriptPlayerTest, SWithBlanksAloneCountsAsACommand) {
@@ -257,7 +256,7 @@ TEST(ScriptPlayerTest, TextsAreAnsi) {
 }
 
 TEST(ScriptPlayerTest, ComposedChartPlaysBackAsItWasDrawn) {
-  for (const char style : {'B', 'L'}) {
+  for (const Style style : {Style::kBar, Style::kLine}) {
     ComposerFixture f;
     f.Days("20240101", 120, 5000);
     for (size_t i = 0; i < f.days.size(); ++i) {
@@ -285,14 +284,15 @@ TEST(ScriptPlayerTest, ComposedChartPlaysBackAsItWasDrawn) {
       if (op.find(" KORA ") == std::string::npos) replayed.push_back(op);
     EXPECT_EQ(played.ops.size(), replayed.size() + 1);
     EXPECT_GT(composed.size(), 300u);
-    ASSERT_EQ(replayed.size(), composed.size()) << style;
-    for (size_t i = 0; i < composed.size(); ++i) EXPECT_EQ(replayed[i], composed[i]) << style;
+    ASSERT_EQ(replayed.size(), composed.size()) << TextOf(style);
+    for (size_t i = 0; i < composed.size(); ++i)
+      EXPECT_EQ(replayed[i], composed[i]) << TextOf(style);
   }
 }
 
 TEST(ScriptPlayerTest, CandlesPlayBackHalfAUnitWider) {
   ComposerFixture f;
-  f.request.ChartStyle = 'C';
+  f.request.ChartStyle = Style::kCandlestick;
   f.request.BarSpacing = 4;
   // y(10) = 252, y(10.5) = 178 on this surface.
   f.Day("20240315", 10.5f, 11, 9, 10);

@@ -6,6 +6,8 @@
 
 #include "base/dates.h"
 #include "lists/chart_list.h"
+#include "tests/chartwindow/window_fixture.h"
+#include "tests/support/all_oscillators.h"
 #include "tests/support/failing_io.h"
 #include "tests/support/recording_surface.h"
 #include "tests/support/records.h"
@@ -22,70 +24,6 @@ using test::ScriptedDialogs;
 using test::Security;
 using test::TempHome;
 
-class ChartWindowTest : public testing::Test {
- protected:
-  ChartWindowTest() {
-    settings.paths.SystemPath = "c:\\korawin\\";
-    settings.paths.CurrentDataPath = "c:\\korawin\\data\\";
-    settings.charts.Type = "B";
-    settings.charts.Period = "A";
-    settings.charts.Spacing = 2;
-    home.files().MakeFolder("c:\\korawin\\data");
-    LoadColours(home.files(), settings.paths.SystemPath, "Black", colours);
-  }
-
-  void PutNames(const std::vector<NameRec>& names) {
-    home.Put("drive_c/korawin/data/Names.dat", Bytes(names));
-    for (const NameRec& name : names)
-      PutPrices(std::string(name.Code.trimmed()));
-  }
-  void PutPrices(const std::string& code) {
-    std::vector<PriceRec> days;
-    for (int i = 1; i <= 28; ++i) {
-      const std::string date = "202602" + std::string(i < 10 ? "0" : "") + std::to_string(i);
-      const float close = 10.0f + float(i % 5);
-      days.push_back(Day(date, close, close + 1, close - 1, close, 1000 * i));
-    }
-    home.Put("drive_c/korawin/data/" + code + ".WDT", Bytes(days));
-  }
-  // A, B and C, all shares.
-  void PutThree() { PutNames({Security("AAA"), Security("BBB"), Security("CCC")}); }
-
-  ChartWindow& window() {
-    if (!window_) {
-      window_ = std::make_unique<ChartWindow>(ChartWindowServices{.files = home.files(),
-                                                                  .dialogs = dialogs,
-                                                                  .settings = settings,
-                                                                  .ini = ini,
-                                                                  .user = user,
-                                                                  .colours = colours,
-                                                                  .current = current,
-                                                                  .state = state,
-                                                                  .price = surface,
-                                                                  .panel = panel});
-      window_->Load();
-      surface.ops.clear();
-      panel.ops.clear();
-    }
-    return *window_;
-  }
-  std::string shown() const { return current.CurrentDataFile; }
-  std::string script() const { return home.Get("drive_c/korawin/data/TCht.Tmp"); }
-
-  TempHome home;
-  ScriptedDialogs dialogs;
-  Settings settings;
-  ChartColours colours{};
-  CurrentName current;
-  SettingsFile ini{home.files(), "C:\\WINDOWS\\Kora.ini"};
-  SettingsFile user{home.files(), "C:\\WINDOWS\\KoraUser.ini"};
-  ChartState state;
-  RecordingSurface surface{638, 452}, panel{638, 144};
-
- private:
-  std::unique_ptr<ChartWindow> window_;
-};
-
 TEST_F(ChartWindowTest, TheFirstChartIsTheFirstSecurityOfTheNameFile) {
   PutThree();
   EXPECT_TRUE(window().NextChart());
@@ -99,6 +37,25 @@ TEST_F(ChartWindowTest, TheFirstChartIsTheFirstSecurityOfTheNameFile) {
   EXPECT_TRUE(dialogs.said.empty());
 }
 
+TEST_F(ChartWindowTest, TheSecurityOnShowIsFollowedWhereTheNameFileIsPutInAnotherOrder) {
+  PutThree();
+  window().NextChart();
+  window().NextChart();
+  EXPECT_EQ(shown(), "BBB.WDT");
+  PutNames({Security("NEW"), Security("AAB"), Security("AAA"), Security("BBB"), Security("CCC")});
+  --state.ChartIndex;  // drawn anew
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_EQ(state.ChartIndex, 4);
+  PutThree();
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_EQ(shown(), "CCC.WDT");
+  EXPECT_EQ(state.ChartIndex, 3);
+  PutNames({Security("AAA"), Security("BBB")});  // gone: its place decides
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_EQ(shown(), "AAA.WDT");
+}
+
 TEST_F(ChartWindowTest, ForwardFromTheLastChartGoesToRecordOne) {
   PutThree();
   for (const char* expected : {"AAA.WDT", "BBB.WDT", "CCC.WDT", "AAA.WDT"}) {
@@ -106,6 +63,17 @@ TEST_F(ChartWindowTest, ForwardFromTheLastChartGoesToRecordOne) {
     EXPECT_EQ(shown(), expected);
   }
   EXPECT_EQ(state.ChartIndex, 1);
+}
+
+TEST_F(ChartWindowTest, AChartIsShownByItsPlace) {
+  PutThree();
+  EXPECT_TRUE(window().ShowAt(3));
+  EXPECT_EQ(shown(), "CCC.WDT");
+  EXPECT_EQ(state.ChartIndex, 3);
+  EXPECT_TRUE(window().ShowAt(2));
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_TRUE(window().ShowAt(4));
+  EXPECT_EQ(shown(), "AAA.WDT") << "beyond the last comes the first";
 }
 
 TEST_F(ChartWindowTest, BackwardFromRecordOneGoesToTheLast) {
@@ -153,26 +121,26 @@ TEST_F(ChartWindowTest, NothingIsComposedWhileLoading) {
 TEST_F(ChartWindowTest, DataWithoutBarsComesUpAsALineAndTheStyleStays) {
   PutNames({Security("AAA"), Security("CLO", 1, kCloseOnly), Security("CCC")});
   window().NextChart();
-  EXPECT_EQ(state.ChartStyle, 'B');
+  EXPECT_EQ(state.ChartStyle, Style::kBar);
   window().NextChart();
-  EXPECT_EQ(state.ChartStyle, 'L');
+  EXPECT_EQ(state.ChartStyle, Style::kLine);
   window().NextChart();
-  EXPECT_EQ(state.ChartStyle, 'L');
+  EXPECT_EQ(state.ChartStyle, Style::kLine);
   EXPECT_EQ(shown(), "CCC.WDT");
 }
 
 TEST_F(ChartWindowTest, EveryTypeWithoutBarsTurnsCandlesIntoALine) {
   for (const std::int16_t type : {kCloseVolume, kCloseOnly, kAdvanceDecline}) {
     PutNames({Security("CLO", 1, type)});
-    state.ChartStyle = 'C';
+    state.ChartStyle = Style::kCandlestick;
     window().NextChart();
-    EXPECT_EQ(state.ChartStyle, 'L') << type;
+    EXPECT_EQ(state.ChartStyle, Style::kLine) << type;
   }
   for (const std::int16_t type : {kShare, kIndex}) {
     PutNames({Security("BAR", 1, type)});
-    state.ChartStyle = 'C';
+    state.ChartStyle = Style::kCandlestick;
     window().NextChart();
-    EXPECT_EQ(state.ChartStyle, 'C') << type;
+    EXPECT_EQ(state.ChartStyle, Style::kCandlestick) << type;
   }
 }
 
@@ -180,8 +148,9 @@ TEST_F(ChartWindowTest, AMissingNameFileIsToldAndNothingIsShown) {
   EXPECT_FALSE(window().NextChart());
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(dialogs.said[0].title, "Charts");
-  EXPECT_EQ(dialogs.said[0].text.find(
-                "There is a file access problem. Check directory paths option."), 0u);
+  EXPECT_EQ(
+      dialogs.said[0].text.find("There is a file access problem. Check directory paths option."),
+      0u);
   EXPECT_NE(dialogs.said[0].text.find("c:\\korawin\\data\\Names.dat"), std::string::npos);
   EXPECT_EQ(state.ChartIndex, 0);
 }
@@ -249,7 +218,7 @@ TEST_F(ChartWindowTest, AChartThatFailsWhereABadRecordIsInSightStandsAtASmallerS
   days[0].RecDate.set("19999999");
   home.Put("drive_c/korawin/data/AAA.WDT", Bytes(days));
   window();
-  state.ChartPeriod = "W";
+  state.ChartPeriod = Period::kWeekly;
   state.BarSpacing = 20;
   surface.SetWidth(2000);
   EXPECT_FALSE(window().NextChart());
@@ -285,9 +254,16 @@ TEST_F(ChartWindowTest, ADiskThatIsNotReadyIsAskedForOnceForAllSizes) {
     }
   } drive;
   const Files files(home.path(), drive);
-  ChartWindow charts({.files = files, .dialogs = dialogs, .settings = settings, .ini = ini,
-                      .user = user, .colours = colours, .current = current, .state = state,
-                      .price = surface, .panel = panel});
+  ChartWindow charts({.files = files,
+                      .dialogs = dialogs,
+                      .settings = settings,
+                      .ini = ini,
+                      .user = user,
+                      .colours = colours,
+                      .current = current,
+                      .state = state,
+                      .price = surface,
+                      .panel = panel});
   charts.Load();
   drive.ready = false;
   dialogs.answers = {Answer::kCancel, Answer::kCancel, Answer::kCancel};
@@ -320,11 +296,11 @@ TEST_F(ChartWindowTest, ANameFileThatShrankWhileTheWindowStoodWrapsToItsStart) {
 
 TEST_F(ChartWindowTest, DrawnLinesAreEmptiedAtEachNewChartUnlessTwoShareTheSurface) {
   PutThree();
+  window().NextChart();
+  window().StartSplitScreen();
   home.Put("drive_c/korawin/data/ChtLns.Tmp", "H,1,2,3,4,5\r\n");
-  state.SplitScreen = true;
   window().NextChart();
   EXPECT_NE(home.Get("drive_c/korawin/data/ChtLns.Tmp"), "");
-  state.SplitScreen = false;
   window().NextChart();
   EXPECT_TRUE(home.Exists("drive_c/korawin/data/ChtLns.Tmp"));
   EXPECT_EQ(home.Get("drive_c/korawin/data/ChtLns.Tmp"), "");
@@ -438,8 +414,7 @@ TEST_F(IndustryTest, WithoutAMatchItSaysSoAndShowsTheFirst) {
     dialogs.said.clear();
     EXPECT_EQ(Step(1), "AAA.WDT");
     ASSERT_EQ(dialogs.said.size(), 1u);
-    EXPECT_EQ(dialogs.said[0].text,
-              "No records on file for that Industry classification or group");
+    EXPECT_EQ(dialogs.said[0].text, "No records on file for that Industry classification or group");
     EXPECT_EQ(dialogs.said[0].title, "Industry Classification");
     EXPECT_EQ(state.ChartIndex, 1);
   }
@@ -537,9 +512,16 @@ TEST_F(ChartWindowTest, TheFrameIsKeptWhereItWasDropped) {
   EXPECT_EQ(window().view().Frame->left, 170);
   for (const char* bad : {"x,y", "12", "1,2,3", ",", "nan,inf"}) {
     user.PutSetting(kUserSection, "BDFrame", bad);
-    ChartWindow fresh({.files = home.files(), .dialogs = dialogs, .settings = settings, .ini = ini,
-                       .user = user, .colours = colours, .current = current, .state = state,
-                       .price = surface, .panel = panel});
+    ChartWindow fresh({.files = home.files(),
+                       .dialogs = dialogs,
+                       .settings = settings,
+                       .ini = ini,
+                       .user = user,
+                       .colours = colours,
+                       .current = current,
+                       .state = state,
+                       .price = surface,
+                       .panel = panel});
     fresh.Load();
     EXPECT_TRUE(fresh.NextChart());
     EXPECT_FALSE(fresh.view().Frame) << bad;
@@ -552,10 +534,10 @@ TEST_F(ChartWindowTest, StyleAndPeriodRedrawTheChartOnShow) {
   PutThree();
   window().NextChart();
   window().NextChart();
-  EXPECT_TRUE(window().SetStyle('C'));
-  EXPECT_EQ(window().Request.ChartStyle, 'C');
-  EXPECT_TRUE(window().SetPeriod("W"));
-  EXPECT_EQ(window().Request.ChartPeriod, "W");
+  EXPECT_TRUE(window().SetStyle(Style::kCandlestick));
+  EXPECT_EQ(window().Request.ChartStyle, Style::kCandlestick);
+  EXPECT_TRUE(window().SetPeriod(Period::kWeekly));
+  EXPECT_EQ(window().Request.ChartPeriod, Period::kWeekly);
   EXPECT_EQ(shown(), "BBB.WDT");
   EXPECT_EQ(state.ChartIndex, 2);
   EXPECT_LT(window().Chart.Bars.BarCount, 6) << "28 days are at most five weeks";
@@ -583,13 +565,130 @@ TEST_F(ChartWindowTest, AutomaticBoxesMoveOnToTheNextChart) {
   EXPECT_EQ(shown(), "BBB.WDT");
 }
 
+TEST_F(ChartWindowTest, BoxValueIsAskedForOncePerChart) {
+  PutThree();
+  state.PFAutoBox = false;
+  int asked = 0;
+  window().SetAskBoxValue([&](float computed) {
+    ++asked;
+    return computed * 2;
+  });
+  window().NextChart();
+  EXPECT_EQ(asked, 0) << "bars have no boxes";
+  EXPECT_TRUE(window().SetStyle(Style::kPointFigure));
+  EXPECT_EQ(asked, 1);
+  const float given = window().Chart.Boxes.PFBoxSize;
+  EXPECT_FLOAT_EQ(state.PFBoxSize, given);
+  // Another size, a switch of the grid and a page of it are the same chart.
+  EXPECT_TRUE(window().Resized());
+  EXPECT_TRUE(window().ToggleGridLines());
+  RecordingSurface page{638, 452};
+  EXPECT_TRUE(window().DrawAgain(page, nullptr));
+  EXPECT_EQ(asked, 1);
+  EXPECT_FLOAT_EQ(window().Chart.Boxes.PFBoxSize, given);
+  EXPECT_NE(script().find("Box Value = " + Str(given)), std::string::npos);
+  EXPECT_TRUE(window().Refresh());
+  EXPECT_EQ(asked, 2);
+  EXPECT_TRUE(window().StepChart());
+  EXPECT_EQ(asked, 3);
+  // Automatic again, on the chart after it.
+  EXPECT_TRUE(window().TogglePFAuto());
+  EXPECT_EQ(asked, 3);
+  EXPECT_FLOAT_EQ(window().Chart.Boxes.PFBoxSize, given / 2);
+}
+
+TEST_F(ChartWindowTest, CrossHairReadsBoxesByTheMouseAndTheKeys) {
+  PutThree();
+  window().NextChart();
+  window().SetStyle(Style::kPointFigure);
+  window().ToggleGrid();
+  surface.ops.clear();
+  const Composition& chart = window().Chart;
+  const auto price = [&](int row) {
+    return Format(row * double(chart.Boxes.PFBoxSize) + double(chart.Scale.ScaleLow), "#######.00");
+  };
+  window().MouseMove({100, chart.ChartBottom - 6.0 * 10, Pane::kPrice});
+  EXPECT_EQ(window().view().Panels[3], price(10));
+  EXPECT_EQ(window().view().Panels[2], "") << "a column has no date";
+  // No line downward: the one from the scale alone.
+  EXPECT_EQ(surface.ops.size(), 1u);
+  // The keys go over the rows from where the pointer is.
+  window().MovePoint(-1);
+  EXPECT_EQ(window().view().Panels[3], price(9));
+  window().MovePoint(1);
+  EXPECT_EQ(window().view().Panels[3], price(10));
+  // Without a pointer they begin at the row of the last close, 13.
+  window().ToggleGrid();
+  window().ToggleGrid();
+  window().MovePoint(0);
+  const int row = CInt((13 - double(chart.Scale.ScaleLow)) / double(chart.Boxes.PFBoxSize));
+  EXPECT_EQ(window().view().Panels[3], price(row));
+  window().MovePoint(1);
+  EXPECT_EQ(window().view().Panels[3], price(row + 1));
+  window().PointToEnd(false);
+  EXPECT_EQ(window().view().Panels[3], price(0));
+}
+
+TEST_F(ChartWindowTest, BoxesHaveNoOscillators) {
+  PutThree();
+  window().NextChart();
+  window().SetStyle(Style::kPointFigure);
+  const std::string before = script();
+  for (const char* code : {"RSI", "PARA", "OBV"}) window().PickOscillator(code);
+  EXPECT_FALSE(panel.Visible());
+  EXPECT_EQ(script(), before);
+  EXPECT_TRUE(dialogs.said.empty());
+}
+
+TEST_F(ChartWindowTest, SwingStandsInPlaceOfBarsAtLeastThreeApart) {
+  PutThree();
+  window().NextChart();
+  window().SetStyle(Style::kCandlestick);
+  EXPECT_TRUE(window().ToggleSwing());
+  EXPECT_TRUE(state.SwingOn);
+  EXPECT_EQ(state.ChartStyle, Style::kBar);
+  EXPECT_EQ(window().Chart.BarSpacing, 3);
+  EXPECT_NE(script().find("Daily Swing  -  Standard"), std::string::npos);
+  EXPECT_TRUE(window().ToggleSwing());
+  EXPECT_EQ(window().Chart.BarSpacing, 2);
+  EXPECT_EQ(script().find("Swing"), std::string::npos);
+  // A spacing above 3 stays.
+  state.BarSpacing = 7;
+  window().ToggleSwing();
+  EXPECT_EQ(window().Chart.BarSpacing, 7);
+  window().Unload();
+  EXPECT_FALSE(state.SwingOn);
+  EXPECT_EQ(state.BarSpacing, 7);
+}
+
+TEST_F(ChartWindowTest, SwingComesOnWithItsKindAndASize) {
+  PutThree();
+  window().NextChart();
+  const auto title = [&](SwingChoice choice) {
+    state.Swing = choice;
+    state.SwingOn = false;
+    window().ToggleSwing();
+    const std::string text = script();
+    const size_t at = text.find("Daily Swing");
+    return at == std::string::npos ? "" : text.substr(at, text.find(',', at) - at);
+  };
+  EXPECT_EQ(title({SwingKind::kDays, 0}), "Daily Swing 3 - DAY");
+  EXPECT_EQ(title({SwingKind::kPoints, 0.5}), "Daily Swing 3 - POINT");
+  EXPECT_EQ(title({SwingKind::kPoints, 9}), "Daily Swing 9 - POINT");
+  EXPECT_EQ(title({SwingKind::kPointsAuto, 0}), "Daily Swing  -  Standard");
+  // Chosen while it is on, automatic points stay.
+  state.Swing = {SwingKind::kPointsAuto, 0};
+  window().Refresh();
+  EXPECT_NE(script().find(" - Point(Auto)"), std::string::npos);
+}
+
 TEST_F(ChartWindowTest, TheLegendShowsForReversalsOfABarChartAlone) {
   PutThree();
   window().NextChart();
   EXPECT_TRUE(window().ToggleReversals());
   EXPECT_TRUE(window().Request.ColourMarks);
   EXPECT_TRUE(window().view().LegendShown);
-  window().SetStyle('C');
+  window().SetStyle(Style::kCandlestick);
   EXPECT_FALSE(window().view().LegendShown);
   surface.ops.clear();
   EXPECT_FALSE(window().ToggleReversals());
@@ -611,7 +710,7 @@ TEST_F(ChartWindowTest, MultipleAveragesAreDrawnAndWritten) {
 TEST_F(ChartWindowTest, NoToggleComposesBeforeTheFirstChart) {
   PutThree();
   window();
-  EXPECT_FALSE(window().SetStyle('L'));
+  EXPECT_FALSE(window().SetStyle(Style::kLine));
   EXPECT_FALSE(window().ToggleGridLines());
   EXPECT_FALSE(window().ToggleReversals());
   EXPECT_FALSE(window().ToggleMMA());
@@ -632,7 +731,7 @@ class OscillatorTest : public ChartWindowTest {
   OscillatorTest() {
     PutThree();
     OscSettings& osc = settings.osc;
-    for (const OscKey& key : OscKeys()) osc.*(key.value) = {5, 6};
+    for (const OscKey& key : OscKeys()) osc[key] = {5, 6};
     window().NextChart();
     dialogs.said.clear();
     panel.ops.clear();
@@ -647,6 +746,57 @@ TEST_F(OscillatorTest, APickedOscillatorTakesTheLowerPaneAndTheScript) {
   EXPECT_EQ(state.OscCode, "RSI");
   EXPECT_FALSE(panel.ops.empty());
   EXPECT_GT(script().size(), before);
+}
+
+TEST_F(OscillatorTest, APickedOneGoesWithTheNextChartUnlessItIsKept) {
+  window().PickOscillator("RSI");
+  window().NextChart();
+  EXPECT_FALSE(panel.Visible());
+  EXPECT_FALSE(state.OscShown);
+
+  window().ToggleKeepOscillator();
+  EXPECT_EQ(ini.GetSetting("Charts", "KeepOsc"), "True");
+  window().PickOscillator("RSI");
+  EXPECT_TRUE(state.OscShown);
+  EXPECT_EQ(state.OscSelected, "RSI") << "as chart selection then shows";
+  window().NextChart();
+  EXPECT_TRUE(panel.Visible());
+  EXPECT_EQ(state.OscCode, "RSI");
+
+  window().ToggleKeepOscillator();
+  EXPECT_EQ(ini.GetSetting("Charts", "KeepOsc"), "False");
+  window().NextChart();
+  EXPECT_FALSE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, KeepingBeginsWithTheOneOnShow) {
+  window().PickOscillator("MOM");
+  window().ToggleKeepOscillator();
+  window().NextChart();
+  EXPECT_EQ(state.OscCode, "MOM");
+  EXPECT_TRUE(panel.Visible());
+  window().PickOscillator("PARA");
+  window().NextChart();
+  EXPECT_EQ(state.OscSelected, "PARA");
+  EXPECT_FALSE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, AKeptOneIsLeftOutOnPointAndFigureChartsAndComesBack) {
+  state.KeepOsc = true;
+  window().PickOscillator("RSI");
+  window().SetStyle(Style::kPointFigure);
+  EXPECT_FALSE(panel.Visible());
+  window().SetStyle(Style::kBar);
+  EXPECT_TRUE(panel.Visible());
+}
+
+TEST_F(OscillatorTest, ThePicturesHaveNamesForThoseWhoCanNotSeeThem) {
+  EXPECT_EQ(window().ChartName(), "Chart AAA, bars, daily, 28/02/2026, close 13");
+  EXPECT_EQ(window().PanelName(), "Oscillator");
+  window().SetStyle(Style::kLine);
+  window().PickOscillator("WMS");
+  EXPECT_EQ(window().ChartName(), "Chart AAA, line, daily, 28/02/2026, close 13");
+  EXPECT_EQ(window().PanelName(), "Oscillator Williams %R");
 }
 
 TEST_F(OscillatorTest, ASecondOneReplacesTheFirstOnPaneAndScript) {
@@ -670,7 +820,7 @@ TEST_F(OscillatorTest, ItIsNotPartOfTheNextChartButStaysAtAnotherSize) {
 TEST_F(OscillatorTest, OneThatCannotBeShownIsToldOnceForAllSizes) {
   state.OscShown = true;
   state.OscSelected = state.OscCode = "RMO";
-  window().SetPeriod("W");
+  window().SetPeriod(Period::kWeekly);
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(dialogs.said[0].text, "RMO only available on Daily Charts");
   for (int i = 0; i < 3; ++i) {
@@ -706,12 +856,12 @@ TEST_F(OscillatorTest, TheParabolicHasNoPane) {
 }
 
 TEST_F(OscillatorTest, APeriodOfZeroIsRefusedAsTheFirstOfAPairAndLegalAsTheSecond) {
-  settings.osc.StochD.daily = 0;
+  settings.osc[kStochD].daily = 0;
   window().PickOscillator("STO");
   EXPECT_TRUE(dialogs.said.empty());
   EXPECT_TRUE(panel.Visible());
   window().NextChart();
-  settings.osc.StochK.daily = 0;
+  settings.osc[kStochK].daily = 0;
   window().PickOscillator("STO");
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(dialogs.said[0].text, "STO Oscillator values not valid");
@@ -722,21 +872,17 @@ TEST_F(OscillatorTest, APeriodOfZeroIsRefusedAsTheFirstOfAPairAndLegalAsTheSecon
 TEST_F(OscillatorTest, EveryPeriodLiesInOneToTwoHundred) {
   const struct {
     const char* code;
-    PeriodPair OscSettings::*value;
+    const OscKey* value;
     bool zeroIsLegal;
-  } checks[] = {
-      {"STO", &OscSettings::StochK, false}, {"STO", &OscSettings::StochD, true},
-      {"FX", &OscSettings::FXF, false},     {"FX", &OscSettings::FXX, true},
-      {"R/F", &OscSettings::FXF, false},    {"R/F", &OscSettings::FXX, true},
-      {"R/F", &OscSettings::RocP, false},   {"ROC", &OscSettings::RocP, false},
-      {"RSI", &OscSettings::RsiP, false},   {"MACD", &OscSettings::Md1, false},
-      {"MACD", &OscSettings::Md2, false},   {"MACD", &OscSettings::Md3, false},
-      {"WMS", &OscSettings::WmsA, false},   {"ERY", &OscSettings::ERA, false},
-      {"DM", &OscSettings::DMA, false},     {"MOM", &OscSettings::MMA, false},
-      {"COP", &OscSettings::CopD, false},   {"JHG", &OscSettings::HolyD, false},
-      {"VTY", &OscSettings::VtyD, false}};
+  } checks[] = {{"STO", &kStochK, false}, {"STO", &kStochD, true}, {"FX", &kFXF, false},
+                {"FX", &kFXX, true},      {"R/F", &kFXF, false},   {"R/F", &kFXX, true},
+                {"R/F", &kRocP, false},   {"ROC", &kRocP, false},  {"RSI", &kRsiP, false},
+                {"MACD", &kMd1, false},   {"MACD", &kMd2, false},  {"MACD", &kMd3, false},
+                {"WMS", &kWmsA, false},   {"ERY", &kERA, false},   {"DM", &kDMA, false},
+                {"MOM", &kMMA, false},    {"COP", &kCopD, false},  {"JHG", &kHolyD, false},
+                {"VTY", &kVtyD, false}};
   for (const auto& check : checks) {
-    PeriodPair& pair = settings.osc.*check.value;
+    PeriodPair& pair = settings.osc[*check.value];
     const PeriodPair standing = pair;
     for (const int value : {0, 1, 200, 201, -1}) {
       pair.daily = std::int16_t(value);
@@ -753,17 +899,17 @@ TEST_F(OscillatorTest, EveryPeriodLiesInOneToTwoHundred) {
 }
 
 TEST_F(OscillatorTest, MonthlyChartsCheckTheWeeklyPeriods) {
-  settings.osc.RsiP = {0, 5};
-  window().SetPeriod("M");
+  settings.osc[kRsiP] = {0, 5};
+  window().SetPeriod(Period::kMonthly);
   window().PickOscillator("RSI");
   EXPECT_TRUE(dialogs.said.empty());
-  settings.osc.RsiP = {5, 0};
+  settings.osc[kRsiP] = {5, 0};
   window().PickOscillator("RSI");
   EXPECT_EQ(dialogs.said.size(), 1u);
 }
 
 TEST_F(OscillatorTest, RmoIsForDailyChartsOnly) {
-  window().SetPeriod("W");
+  window().SetPeriod(Period::kWeekly);
   window().PickOscillator("RMO");
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(dialogs.said[0].text, "RMO only available on Daily Charts");
@@ -783,8 +929,9 @@ TEST_F(OscillatorTest, AMissingCompareFileIsTold) {
   EXPECT_EQ(dialogs.said[0].text, " Oscillator values not valid");
   window().PickOscillator("RMO");
   ASSERT_EQ(dialogs.said.size(), 2u);
-  EXPECT_EQ(dialogs.said[1].text, "c:\\korawin\\data\\XAO.WDT is not available. Use your code "
-                                  "for the All Ordinaries Index");
+  EXPECT_EQ(dialogs.said[1].text,
+            "c:\\korawin\\data\\XAO.WDT is not available. Use your code "
+            "for the All Ordinaries Index");
   EXPECT_FALSE(panel.Visible());
 }
 
@@ -841,33 +988,29 @@ TEST_F(ChartWindowTest, ASecondChartIsLaidOverTheFirst) {
   window().StartSuperimpose();
   EXPECT_EQ(asked, 1);
   EXPECT_EQ(state.ChartTask, kTaskSuperimpose);
-  EXPECT_TRUE(state.Superimposed);
+  EXPECT_EQ(window().arrangement(), Arrangement::kUnder);
   surface.ops.clear();
   EXPECT_TRUE(window().NextChart());
   EXPECT_FALSE(surface.Has("cls")) << "the first chart stays";
-  EXPECT_TRUE(state.Superimposed);
-  EXPECT_EQ(window().Chart.OscPanel, 0);
+  EXPECT_EQ(window().arrangement(), Arrangement::kSuperimposed);
   window().NextChart();
   EXPECT_TRUE(surface.Has("cls"));
-  EXPECT_FALSE(state.Superimposed);
+  EXPECT_EQ(window().arrangement(), Arrangement::kOne);
 }
 
 TEST_F(ChartWindowTest, ASplitScreenTakesTheNextChartBelowAndEnds) {
   PutThree();
   window().NextChart();
   window().StartSplitScreen();
-  EXPECT_TRUE(state.SplitScreen);
-  EXPECT_TRUE(state.SplitShown);
-  EXPECT_EQ(window().Chart.ChartSlot, 2);
+  EXPECT_EQ(window().arrangement(), Arrangement::kUpper);
   EXPECT_LT(window().Chart.ChartBottom, 226) << "the upper half";
   surface.ops.clear();
   window().NextChart();
   EXPECT_FALSE(surface.Has("cls"));
   EXPECT_GT(window().Chart.ChartTop, 226) << "the lower half";
-  EXPECT_FALSE(state.SplitScreen);
-  EXPECT_TRUE(state.SplitShown);
+  EXPECT_EQ(window().arrangement(), Arrangement::kSplit);
   window().NextChart();
-  EXPECT_FALSE(state.SplitShown);
+  EXPECT_EQ(window().arrangement(), Arrangement::kOne);
   EXPECT_TRUE(surface.Has("cls"));
 }
 
@@ -876,8 +1019,10 @@ TEST_F(ChartWindowTest, APairIsDrawnAgainAtAnotherSize) {
   for (const bool split : {true, false}) {
     state.ChartIndex = 0;
     window().NextChart();
-    if (split) window().StartSplitScreen();
-    else window().StartSuperimpose();
+    if (split)
+      window().StartSplitScreen();
+    else
+      window().StartSuperimpose();
     EXPECT_TRUE(window().Resized()) << "the second is still to come";
     const std::string first = script();
     surface.ops.clear();
@@ -891,11 +1036,10 @@ TEST_F(ChartWindowTest, APairIsDrawnAgainAtAnotherSize) {
     EXPECT_EQ(std::count(surface.ops.begin(), surface.ops.end(), "cls"), 1);
     ASSERT_GT(surface.ops.size(), second.size());
     EXPECT_TRUE(std::equal(second.rbegin(), second.rend(), surface.ops.rbegin()));
-    EXPECT_EQ(state.SplitShown, split);
-    EXPECT_EQ(state.Superimposed, !split);
+    EXPECT_EQ(window().arrangement(), split ? Arrangement::kSplit : Arrangement::kSuperimposed);
     EXPECT_EQ(shown(), "BBB.WDT");
     window().NextChart();
-    EXPECT_FALSE(state.SplitShown || state.Superimposed);
+    EXPECT_EQ(window().arrangement(), Arrangement::kOne);
   }
 }
 
@@ -903,14 +1047,15 @@ TEST_F(ChartWindowTest, ASecondChartThatIsNotChosenLeavesOneChart) {
   PutThree();
   window().NextChart();
   for (const bool split : {true, false}) {
-    if (split) window().StartSplitScreen();
-    else window().StartSuperimpose();
+    if (split)
+      window().StartSplitScreen();
+    else
+      window().StartSuperimpose();
     window().DropSecondChart();
     surface.ops.clear();
     window().NextChart();
     EXPECT_TRUE(surface.Has("cls"));
-    EXPECT_FALSE(state.SplitShown);
-    EXPECT_FALSE(state.Superimposed);
+    EXPECT_EQ(window().arrangement(), Arrangement::kOne);
   }
 }
 
@@ -931,7 +1076,9 @@ class SaveTest : public ChartWindowTest {
     EXPECT_EQ(state.ChartTask, kTaskNone);
     return dialogs.said.empty() ? "" : dialogs.said.back().text;
   }
-  std::string saved(const char* name) { return home.Get(std::string("drive_c/korawin/chtsave/") + name); }
+  std::string saved(const char* name) {
+    return home.Get(std::string("drive_c/korawin/chtsave/") + name);
+  }
 };
 
 TEST_F(SaveTest, TheScriptIsCopied) {
@@ -939,6 +1086,50 @@ TEST_F(SaveTest, TheScriptIsCopied) {
   EXPECT_EQ(Save("mine.CHT"), " CHART SAVED ");
   EXPECT_EQ(dialogs.said[0].title, "Save Chart");
   EXPECT_EQ(saved("mine.CHT"), script());
+}
+
+TEST_F(SaveTest, TheChartOnShowIsSavedThoughTheDataFolderHasChangedSince) {
+  const std::string first = script();
+  home.Put("drive_c/other/Names.dat", Bytes(std::vector<NameRec>{Security("ZZZ")}));
+  home.Put("drive_c/other/ZZZ.WDT", home.Get("drive_c/korawin/data/BBB.WDT"));
+  settings.paths.CurrentDataPath = "c:\\other\\";
+  EXPECT_EQ(window().ScriptOnShow(), "c:\\korawin\\data\\TCht.Tmp");
+  EXPECT_EQ(Save("a.cht"), " CHART SAVED ");
+  EXPECT_EQ(saved("a.cht"), first);
+  window().ShowAt(1);
+  settings.paths.CurrentDataPath = "c:\\korawin\\data\\";
+  EXPECT_EQ(window().SuggestedName(), "ZZZ.cht");
+  EXPECT_EQ(window().ScriptOnShow(), "c:\\other\\TCht.Tmp");
+  EXPECT_EQ(Save("b.cht"), " CHART SAVED ");
+  EXPECT_EQ(saved("b.cht"), home.Get("drive_c/other/TCht.Tmp"));
+  EXPECT_NE(saved("b.cht").find("ZZZ"), std::string::npos);
+}
+
+TEST_F(SaveTest, WhatChartSelectionLooksAtDoesNotNameTheChartOnShow) {
+  current.Rec = Security("CCC");
+  EXPECT_EQ(window().SuggestedName(), "AAA.cht");
+}
+
+TEST_F(SaveTest, AChartThatFailedToDrawIsNotSaved) {
+  home.files().Remove("c:\\korawin\\data\\BBB.WDT");
+  EXPECT_FALSE(window().NextChart());
+  EXPECT_EQ(window().ScriptOnShow(), "");
+  EXPECT_EQ(Save("a.cht"), " CHART NOT SAVED ");
+  EXPECT_FALSE(home.Exists("drive_c/korawin/chtsave/a.cht"));
+  RecordingSurface elsewhere(638, 452);
+  EXPECT_FALSE(window().DrawAgain(elsewhere, nullptr));
+  EXPECT_TRUE(window().NextChart());
+  EXPECT_EQ(Save("a.cht"), " CHART SAVED ");
+}
+
+TEST_F(SaveTest, ASavedChartOnShowIsSavedUnderItsOwnName) {
+  Save("a.cht");
+  const std::string first = saved("a.cht");
+  window().NextChart();
+  window().ShowSaved("c:\\korawin\\chtsave\\a.cht");
+  EXPECT_EQ(window().SuggestedName(), "a.cht");
+  EXPECT_EQ(Save("copy.cht"), " CHART SAVED ");
+  EXPECT_EQ(saved("copy.cht"), first);
 }
 
 TEST_F(SaveTest, AnotherEndingIsRefused) {
@@ -952,8 +1143,7 @@ TEST_F(SaveTest, AFileThatIsThereIsReplacedOnlyOnOk) {
   home.Put("drive_c/korawin/chtsave/a.cht", "old");
   dialogs.answers = {Answer::kCancel, Answer::kCancel, Answer::kCancel};
   EXPECT_EQ(Save("a.cht"), " CHART NOT SAVED ");
-  EXPECT_EQ(dialogs.said[0].text,
-            "c:\\korawin\\chtsave\\a.cht already exists - Overwrite");
+  EXPECT_EQ(dialogs.said[0].text, "c:\\korawin\\chtsave\\a.cht already exists - Overwrite");
   EXPECT_EQ(saved("a.cht"), "old");
   dialogs.answers = {Answer::kOk};
   EXPECT_EQ(Save("a.cht"), " CHART SAVED ");
@@ -1010,7 +1200,7 @@ TEST_F(SaveTest, ThePointerReadsNothingFromASavedChart) {
   window().ShowSaved("c:\\korawin\\chtsave\\a.cht");
   window().ToggleGrid();
   surface.ops.clear();
-  window().MouseMove(100, 200);
+  window().MouseMove({100, 200});
   EXPECT_TRUE(surface.ops.empty());
   EXPECT_EQ(window().view().Panels[2], "");
 }
@@ -1022,13 +1212,12 @@ TEST_F(SaveTest, WhatIsNoSavedChartIsTold) {
   EXPECT_EQ(dialogs.said.back().title, "Saved Charts");
   home.Put("drive_c/korawin/chtsave/bad.cht", std::string("\x01\x02\0,,,,,,,,\r\n", 14));
   window().ShowSaved("c:\\korawin\\chtsave\\bad.cht");
-  EXPECT_EQ(dialogs.said.back().text,
-            "There is problem displaying this chart - format invalid.");
+  EXPECT_EQ(dialogs.said.back().text, "There is problem displaying this chart - format invalid.");
   EXPECT_FALSE(window().ChartFromFile);
 }
 
 TEST_F(SaveTest, TheChartIsDrawnAgainElsewhereWithoutTouchingTheScript) {
-  settings.osc.RsiP = {5, 5};
+  settings.osc[kRsiP] = {5, 5};
   window().PickOscillator("RSI");
   const std::string before = script();
   surface.ops.clear();
@@ -1069,7 +1258,7 @@ TEST_F(GridTest, TheToolShowsThePanelsAndItsButton) {
 
 TEST_F(GridTest, ThePanelsShowTheBarOfThePriceFile) {
   const double x = window().Chart.ChartLeft + 3.0 * window().Chart.BarSpacing;
-  window().MouseMove(x, 200);
+  window().MouseMove({x, 200});
   // The fourth day: close 10 + 4 % 5.
   EXPECT_EQ(panels()[2], "04-02-26");
   EXPECT_EQ(panels()[3], "Open  14.00");
@@ -1085,7 +1274,7 @@ TEST_F(GridTest, EveryColumnReadsItsDayOfThePriceFile) {
   ASSERT_EQ(prices.count(), 28);
   for (std::int32_t record = 1; record <= 28; ++record) {
     const PriceRec day = prices.Read(record);
-    window().MouseMove(chart.ChartLeft + (record - 1) * double(chart.BarSpacing), 200);
+    window().MouseMove({chart.ChartLeft + (record - 1) * double(chart.BarSpacing), 200});
     const std::string date(day.RecDate.raw());
     EXPECT_EQ(panels()[2], date.substr(6, 2) + "-" + date.substr(4, 2) + "-" + date.substr(2, 2));
     EXPECT_EQ(panels()[4], "High  " + std::to_string(int(day.High)) + ".00");
@@ -1094,102 +1283,106 @@ TEST_F(GridTest, EveryColumnReadsItsDayOfThePriceFile) {
 }
 
 TEST_F(GridTest, BeyondTheLastBarItShowsTheLast) {
-  window().MouseMove(window().Chart.ChartRight, 200);
+  window().MouseMove({double(window().Chart.ChartRight), 200});
   EXPECT_EQ(panels()[2], "28-02-26");
 }
 
 TEST_F(GridTest, OutsideThePlotThePanelsAreClearAndThereIsNoCrossHair) {
-  window().MouseMove(100, 200);
+  window().MouseMove({100, 200});
   ASSERT_NE(panels()[2], "");
   surface.ops.clear();
-  window().MouseMove(5, 200);
+  window().MouseMove({5, 200});
   EXPECT_EQ(panels()[2], "");
   EXPECT_EQ(panels()[1], "GRID");
   EXPECT_EQ(surface.ops.size(), 2u) << "the two lines are taken away";
 }
 
 TEST_F(GridTest, AClickEndsIt) {
-  window().MouseMove(100, 200);
+  window().MouseMove({100, 200});
   surface.ops.clear();
-  window().MouseClick();
+  window().MouseRelease({100, 200}, MouseButton::kLeft);
   EXPECT_EQ(surface.ops.size(), 2u);
   EXPECT_FALSE(window().GridOn());
-  window().MouseMove(120, 200);
+  window().MouseMove({120, 200});
   EXPECT_EQ(surface.ops.size(), 2u);
 }
 
 TEST_F(GridTest, AMoveComposesNothing) {
   const std::string before = script();
   home.Put("drive_c/korawin/data/TCht.Tmp", "untouched");
-  for (int x = 50; x < 600; x += 7) window().MouseMove(x, 200);
+  for (int x = 50; x < 600; x += 7) window().MouseMove({double(x), 200});
   EXPECT_EQ(script(), "untouched");
   for (const std::string& op : surface.ops) EXPECT_EQ(op.find("xor dot"), 0u) << op;
 }
 
 TEST_F(GridTest, TheKeysGoFromBarToBar) {
-  window().MoveCross(-1);
+  window().MovePoint(-1);
   EXPECT_EQ(panels()[2], "28-02-26") << "it begins at the last bar";
-  window().MoveCross(-1);
+  window().MovePoint(-1);
   EXPECT_EQ(panels()[2], "27-02-26");
-  window().MoveCross(-1);
+  window().MovePoint(-1);
   EXPECT_EQ(panels()[2], "26-02-26");
-  window().MoveCross(1);
+  window().MovePoint(1);
   EXPECT_EQ(panels()[2], "27-02-26");
-  window().CrossToEnd(false);
+  window().PointToEnd(false);
   EXPECT_EQ(panels()[2], "01-02-26");
-  window().MoveCross(-1);
+  window().MovePoint(-1);
   EXPECT_EQ(panels()[2], "01-02-26");
-  window().CrossToEnd(true);
+  window().PointToEnd(true);
   EXPECT_EQ(panels()[2], "28-02-26");
-  window().MoveCross(1);
+  window().MovePoint(1);
   EXPECT_EQ(panels()[2], "28-02-26");
 }
 
 TEST_F(GridTest, AKeyStartsTheTool) {
   window().ToggleGrid();
-  window().MoveCross(-1);
+  window().MovePoint(-1);
   EXPECT_TRUE(window().GridOn());
   EXPECT_EQ(panels()[2], "28-02-26");
 }
 
 TEST_F(GridTest, ItOutlivesAPageAndLeavesNoLineBehind) {
-  window().MouseMove(100, 200);
+  window().MouseMove({100, 200});
   state.ChartDirection = 1;
   window().StepChart();
   EXPECT_TRUE(window().GridOn());
   surface.ops.clear();
-  window().MouseMove(110, 200);
+  window().MouseMove({110, 200});
   EXPECT_EQ(surface.ops.size(), 2u) << "nothing to take away from the new picture";
 }
 
 TEST_F(GridTest, NothingOfTheChartBeforeIsReadUnderTheNext) {
-  window().MouseMove(window().Chart.ChartLeft, 200);
+  window().MouseMove({double(window().Chart.ChartLeft), 200});
   ASSERT_NE(panels()[2], "");
   state.ChartDirection = 1;
   window().StepChart();
   EXPECT_EQ(panels()[1], "GRID");
   for (size_t i = 2; i < panels().size(); ++i) EXPECT_EQ(panels()[i], "") << i;
-  window().MouseMove(window().Chart.ChartLeft, 200);
+  window().MouseMove({double(window().Chart.ChartLeft), 200});
   EXPECT_NE(panels()[2], "");
 }
 
 TEST_F(GridTest, TwoChartsKeepTheLastText) {
-  window().MouseMove(window().Chart.ChartLeft, 200);
-  const auto before = panels()[2];
-  ASSERT_EQ(before, "01-02-26");
-  state.Superimposed = true;
-  window().MouseMove(window().Chart.ChartLeft + 20, 200);
-  EXPECT_EQ(panels()[2], before);
+  for (const bool split : {true, false}) {
+    if (split)
+      window().StartSplitScreen();
+    else
+      window().StartSuperimpose();
+    window().NextChart();
+    window().ToggleGrid();
+    window().MouseMove({double(window().Chart.ChartLeft), 300});
+    EXPECT_EQ(panels()[2], "");
+  }
 }
 
 TEST_F(GridTest, NothingToReadAfterAChartThatFailed) {
   home.files().Remove("c:\\korawin\\data\\BBB.WDT");
   EXPECT_FALSE(window().NextChart());
   surface.ops.clear();
-  window().MouseMove(100, 200);
+  window().MouseMove({100, 200});
   EXPECT_TRUE(surface.ops.empty());
-  window().MoveCross(-1);
-  window().CrossToEnd(true);
+  window().MovePoint(-1);
+  window().PointToEnd(true);
   EXPECT_TRUE(surface.ops.empty());
 }
 
@@ -1198,11 +1391,11 @@ TEST_F(GridTest, NothingToReadAfterAChartThatFailed) {
 TEST_F(ChartWindowTest, CancellingTheToolsLeavesNothingOn) {
   PutThree();
   window().NextChart();
+  window().StartSuperimpose();
   window().ToggleGrid();
-  window().Chart.OscPanel = 2;
   window().CancelChartTools();
   EXPECT_FALSE(window().GridOn());
-  EXPECT_EQ(window().Chart.OscPanel, 0);
+  EXPECT_EQ(window().arrangement(), Arrangement::kOne);
   EXPECT_EQ(window().view().TB, kNoButton);
   EXPECT_EQ(state.ChartTask, kTaskNone);
   EXPECT_EQ(window().view().Panels[1], "");
@@ -1262,8 +1455,18 @@ TEST(ToolBarTest, ForwardIsTheFifthOfTwenty) {
   EXPECT_STREQ(ToolButtonOf(20).key, "sZoom");
 }
 
-TEST_F(ChartWindowTest, TheTitleTellsTheDataFolder) {
+TEST_F(ChartWindowTest, TheTitleTellsTheDataFolderAndTheChartOnShow) {
   EXPECT_EQ(window().view().Title, "KORA Charting 7F   -  CHARTS  c:\\korawin\\data\\");
+  PutThree();
+  window().NextChart();
+  const std::string start = "KORA Charting 7F   -  CHARTS  c:\\korawin\\data\\  -  ";
+  EXPECT_EQ(window().view().Title, start + "AAA  Bar  Daily");
+  window().SetPeriod(Period::kWeekly);
+  window().SetStyle(Style::kCandlestick);
+  EXPECT_EQ(window().view().Title, start + "AAA  Candlestick  Weekly");
+  home.Put("drive_c/korawin/chtsave/Mine.cht", script());
+  window().ShowSaved("c:\\korawin\\chtsave\\Mine.cht");
+  EXPECT_EQ(window().view().Title, start + "Mine.cht");
 }
 
 }  // namespace

@@ -1,5 +1,3 @@
-#include <QGuiApplication>
-
 #include <gtest/gtest.h>
 
 #include <cstdlib>
@@ -9,11 +7,13 @@
 #include <iterator>
 
 #include "chart/composer.h"
+#include "chartwindow/tools/saved_marks.h"
 #include "indicators/oscillators.h"
 #include "indicators/price_overlays.h"
 #include "platform/headless/headless_surface.h"
 #include "platform/qt/picture.h"
 #include "tests/golden/market.h"
+#include "tests/support/places.h"
 #include "tests/support/scripted_dialogs.h"
 
 // Whole scripts of charts, looked at as pictures once and since then held byte for byte.
@@ -39,7 +39,31 @@ struct GoldenChart {
   const char* osc = "";
   bool slow = false;
   bool mma = false;
+  bool saved = false;  // lines and texts are kept with the security
 };
+
+TrendlineRec Kept(const char* period, const char* from, float price, const char* to, float end) {
+  TrendlineRec rec = EmptyTrendline();
+  rec.TLSpacing = 3;
+  rec.TLPeriod.set(period);
+  rec.TLStartDate.set(from);
+  rec.TLStartPrice = price;
+  rec.TLEndDate.set(to);
+  rec.TLEndPrice = end;
+  return rec;
+}
+
+// Three lines of days, one of them into the blank space and one of a price that is off the chart,
+// an empty slot, a record that says nothing, a line of weeks; two texts.
+const SavedMarks& KeptMarks() {
+  static const SavedMarks marks{
+      {Kept("A", "20240401", 14.5f, "20240701", 18.25f), EmptyTrendline(),
+       Kept("A", "20240610", 16, "X60", 20.5f), Kept("W", "20230301", 14, "20240301", 19),
+       Kept("A", "20240401", 99, "20240701", 18.25f), Kept("A", "letters", 15, "20240701", 18)},
+      {MakeNoteLine("20240506", 15.25, "Bought here", 65535), ParseNoteLine("nonsense"),
+       MakeNoteLine("20240715", 19.5, "sold", 255)}};
+  return marks;
+}
 
 // A chart of SHARE or another with an oscillator.
 GoldenChart Panel(const char* file, const char* osc, const char* code = "SHARE",
@@ -61,9 +85,25 @@ const auto kLog = [](ChartRequest& r) {
 };
 const auto kManual = [](ChartRequest& r) { r.AutoScale = false; };
 
+// Point and figure; the spacing is the reversal.
+GoldenChart Boxes(const char* file, const char* code, int reversal,
+                  std::function<void(ChartRequest&)> options = kGrid, double width = 638) {
+  return {file, code, 'P', "A", reversal, width, 452, std::move(options)};
+}
+
+GoldenChart Swing(const char* file, SwingKind kind, const char* period, double size = 0,
+                  const char* code = "SHARE") {
+  return {file, code, 'B', period, 3, 638, 452, [kind, size](ChartRequest& r) {
+            r.GridLines = true;
+            r.Swing = kind;
+            r.SwingSize = size;
+          }};
+}
+
 const GoldenChart kCharts[] = {
     {"bar_daily_2", "SHARE", 'B', "A", 2, 638, 452, kGrid},
-    {"bar_daily_5_marks", "SHARE", 'B', "A", 5, 638, 452, [](ChartRequest& r) { r.ColourMarks = true; }},
+    {"bar_daily_5_marks", "SHARE", 'B', "A", 5, 638, 452,
+     [](ChartRequest& r) { r.ColourMarks = true; }},
     {"bar_daily_4_stop", "SHARE", 'B', "A", 4, 638, 452,
      [](ChartRequest& r) {
        r.OutsideMarks = r.StopLossShown = true;
@@ -113,6 +153,62 @@ const GoldenChart kCharts[] = {
     {"bands_percentage", "SHARE", 'B', "A", 5, 638, 452, [](ChartRequest& r) { r.BandKind = 1; }},
     {"bands_bollinger", "SHARE", 'C', "A", 5, 638, 452, [](ChartRequest& r) { r.BandKind = 2; }},
     {"mma_weekly", "SHARE", 'L', "W", 5, 638, 452, kPlain, 0, false, "", false, true},
+    Boxes("pf_share_2", "SHARE", 2),
+    Boxes("pf_share_3", "SHARE", 3),
+    Boxes("pf_share_4", "SHARE", 4),
+    Boxes("pf_share_5", "SHARE", 5),
+    Boxes("pf_share_6", "SHARE", 6),
+    Boxes("pf_share_3_manual", "SHARE", 3, kManual),
+    Boxes("pf_share_3_record_box", "SHARE", 3,
+          [](ChartRequest& r) {
+            r.AutoScale = r.PFAutoBox = false;
+            r.Name.PFInc = 0.5f;
+          }),
+    Boxes("pf_share_2_own_box", "SHARE", 2,
+          [](ChartRequest& r) {
+            r.GridLines = true;
+            r.PFAutoBox = false;
+            r.PFBoxSize = 0.2f;
+            r.BlankSpace = 60;
+          }),
+    Boxes("pf_share_3_print", "SHARE", 3, [](ChartRequest& r) { r.ScriptPrintMode = true; }),
+    Boxes("pf_share_3_log", "SHARE", 3, kLog),
+    Boxes("pf_share_2_narrow", "SHARE", 2, kGrid, 260),
+    Boxes("pf_penny_3", "PENNY", 3),
+    Boxes("pf_index_3", "INDEX", 3),
+    Boxes("pf_fund_2", "FUND", 2),
+    Boxes(
+        "pf_wrap_3", "WRAP", 3,
+        [](ChartRequest& r) {
+          r.GridLines = true;
+          r.PFAutoBox = false;
+          r.PFBoxSize = 1;
+        },
+        200),
+    Swing("swing_norm_daily", SwingKind::kStandard, "A"),
+    Swing("swing_norm_weekly", SwingKind::kStandard, "W"),
+    Swing("swing_norm_monthly", SwingKind::kStandard, "M"),
+    Swing("swing_xday_daily", SwingKind::kDays, "A", 3),
+    Swing("swing_xday_weekly", SwingKind::kDays, "W", 2),
+    Swing("swing_xday_monthly", SwingKind::kDays, "M", 2),
+    Swing("swing_xpoint_daily", SwingKind::kPoints, "A", 60),
+    Swing("swing_xpoint_weekly", SwingKind::kPoints, "W", 120),
+    Swing("swing_xpoint_monthly", SwingKind::kPoints, "M", 200),
+    Swing("swing_xpointauto_daily", SwingKind::kPointsAuto, "A"),
+    Swing("swing_xpointauto_weekly", SwingKind::kPointsAuto, "W"),
+    Swing("swing_xpointauto_monthly", SwingKind::kPointsAuto, "M"),
+    Swing("swing_xpoint_index", SwingKind::kPoints, "A", 90, "INDEX"),
+    Swing("swing_norm_penny", SwingKind::kStandard, "A", 0, "PENNY"),
+    {"saved_marks_daily_2", "SHARE", 'B', "A", 2, 638, 452, kGrid, 0, false, "", false, false,
+     true},
+    {"saved_marks_daily_5_log", "SHARE", 'C', "A", 5, 1000, 500,
+     [](ChartRequest& r) {
+       kLog(r);
+       r.BlankSpace = 100;
+     },
+     0, false, "", false, false, true},
+    {"saved_marks_weekly_6", "SHARE", 'L', "W", 6, 638, 308, kPlain, 144, false, "RSI", false,
+     false, true},
     Panel("osc_sto", "STO"),
     Panel("osc_sto_slow", "STO", "SHARE", "A", true),
     Panel("osc_fx", "FX"),
@@ -151,8 +247,8 @@ class ChartGoldenTest : public testing::TestWithParam<GoldenChart> {
     const GoldenChart& golden = GetParam();
     ChartRequest request;
     request.Name = market_->name(golden.code);
-    request.ChartStyle = golden.style;
-    request.ChartPeriod = golden.period;
+    request.ChartStyle = ParseStyle({&golden.style, 1}).value();
+    request.ChartPeriod = ParsePeriod(golden.period).value();
     request.BarSpacing = static_cast<std::int16_t>(golden.spacing);
     request.VolHeight = 2;
     golden.options(request);
@@ -168,32 +264,35 @@ class ChartGoldenTest : public testing::TestWithParam<GoldenChart> {
     Settings settings;
     settings.paths = paths;
     settings.fonts = fonts;
-    for (const OscKey& key : OscKeys())
-      settings.osc.*key.value = {key.defaultDaily, key.defaultTwin};
+    for (const OscKey& key : OscKeys()) settings.osc[key] = {key.defaultDaily, key.defaultTwin};
     settings.osc.MMASet = kDefaultMMASet;
     settings.osc.FillIn = settings.osc.RFAve = true;
     settings.osc.CompFile = "c:\\korawin\\data\\INDEX.WDT";
     request.OscName = golden.osc;
-    const ChartServices services{market_->home().files(),
-                                 dialogs_,
-                                 paths,
-                                 fonts,
-                                 colours,
-                                 price,
-                                 panel,
-                                 &script_,
-                                 PriceOverlays(golden.mma, settings.osc.MMASet)};
+    ChartServices services{market_->home().files(),
+                           dialogs_,
+                           paths,
+                           fonts,
+                           colours,
+                           price,
+                           panel,
+                           &script_,
+                           PriceOverlays(golden.mma, settings.osc.MMASet)};
+    if (golden.saved)
+      services.overlays.push_back([](const ChartCanvas& canvas) {
+        std::vector<TrendlineRow> rows;
+        DrawSavedMarks(canvas, KeptMarks(), rows);
+      });
     if (golden.twoCharts) {
-      chart.TwoCharts = true;
-      chart.ChartSlot = 1;
+      request.Place = ChartPlace::kUpper;
       ASSERT_TRUE(ComposeChart(services, request, chart));
       request.Name = market_->name("PENNY");
-      request.ChartStyle = 'C';
+      request.ChartStyle = Style::kCandlestick;
+      request.Place = ChartPlace::kLower;
     }
     ASSERT_TRUE(ComposeChart(services, request, chart)) << dialogs_.said.back().text;
-    OscHost host{market_->home().files(), dialogs_, settings,
-                 colours,                 request,  chart,
-                 price,                   panel ? *panel : price, &script_};
+    OscHost host{market_->home().files(), dialogs_, settings, colours, request, chart, price,
+                 panel ? *panel : price,  &script_};
     host.OscCode = golden.osc;
     host.SlowStochastic = golden.slow;
     ShowOscillatorPanel(host);
@@ -222,8 +321,7 @@ TEST_P(ChartGoldenTest, ScriptIsTheOneThatWasLookedAt) {
   HeadlessSurface panel(golden.width, golden.panel > 0 ? golden.panel : 1);
   panel.SetVisible(golden.panel > 0);
   Compose(price, &panel);
-  const std::string file =
-      std::string(KORA_SOURCE_DIR) + "/tests/golden/charts/" + golden.file + ".cht";
+  const std::string file = SourceDir() + "/tests/golden/charts/" + golden.file + ".cht";
   if (std::getenv("KORA_GOLDEN_WRITE")) WriteFile(file, script_.text());
   const std::string held = ReadFile(file);
   ASSERT_FALSE(held.empty()) << file;
@@ -243,22 +341,14 @@ TEST_P(ChartGoldenTest, WindowAndCommandWriteTheSameScript) {
   size.width = golden.width;
   size.height = golden.height;
   size.panel = golden.panel;
-  const std::string png = MakePicture(PictureKind::kPng, size, [this](Surface& price, Surface* panel) {
-    Compose(price, panel);
-  });
+  const std::string png = MakePicture(
+      PictureKind::kPng, size, [this](Surface& price, Surface* panel) { Compose(price, panel); });
   if (const char* folder = std::getenv("KORA_GOLDEN_PICTURES"))
     WriteFile(std::string(folder) + "/" + golden.file + ".png", png);
-  EXPECT_EQ(script_.text(),
-            ReadFile(std::string(KORA_SOURCE_DIR) + "/tests/golden/charts/" + golden.file + ".cht"));
+  EXPECT_EQ(script_.text(), ReadFile(SourceDir() + "/tests/golden/charts/" + golden.file + ".cht"));
 }
 
 INSTANTIATE_TEST_SUITE_P(Charts, ChartGoldenTest, testing::ValuesIn(kCharts),
                          [](const auto& info) { return std::string(info.param.file); });
 
 }  // namespace
-
-int main(int argc, char** argv) {
-  QGuiApplication app(argc, argv);
-  testing::InitGoogleTest(&argc, argv);
-  return RUN_ALL_TESTS();
-}

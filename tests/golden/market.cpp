@@ -24,6 +24,7 @@ GoldenMarket::GoldenMarket() {
   Add("INDEX", "All Things Index", kIndex, 3200.0f, 0.1f, 900, 3);
   Add("ADVDEC", "Advances and Declines", kAdvanceDecline, 800.0f, 1.0f, 400, 5);
   Add("FUND", "Fund of Funds", kCloseVolume, 1.5f, 0.005f, 400, 13);
+  AddWrap();
   names_[0].OtherDetails.set("ORD SHARES");
   names_[0].IndClass.set("310");
   names_[0].Base = 10;
@@ -37,6 +38,23 @@ const NameRec& GoldenMarket::name(const std::string& code) const {
   for (const NameRec& rec : names_)
     if (rec.Code.trimmed() == code) return rec;
   throw std::runtime_error("no " + code);
+}
+
+// Big swings, then small ones that turn from the grid of the bar which a narrow chart starts at,
+// and not from that of the first bar.
+void GoldenMarket::AddWrap() {
+  names_.push_back(NewNameRec("WRAP"));
+  names_.back().Name.set("Wrapping Paper Ltd");
+  names_.back().RecType = kShare;
+  std::vector<PriceRec> records;
+  for (int i = 0; i < 50; ++i) {
+    PriceRec rec = NewPriceRec(FormatFileDate(DateOfDayNumber(DayNumber({2023, 3, 1}) + 9 * i)));
+    const float close = i == 0 ? 20 : i < 20 ? (i % 2 ? 30 : 20.6f) : (i % 2 ? 27.7f : 24.5f);
+    rec.Open = rec.High = rec.Low = rec.Close = close;
+    records.push_back(rec);
+  }
+  home_.Put("drive_c/korawin/data/WRAP.WDT",
+            {reinterpret_cast<const char*>(records.data()), records.size() * sizeof(PriceRec)});
 }
 
 void GoldenMarket::Add(const char* code, const char* title, std::int16_t type, float start,

@@ -21,8 +21,7 @@ struct CompareFixture : OscFixture {
   void PutPrices(const std::string& name, const std::vector<float>& closes) {
     std::string bytes;
     for (size_t i = 0; i < closes.size(); ++i) {
-      PriceRec record =
-          NewPriceRec(FormatFileDate(DateOfDayNumber(10959 + std::int32_t(i))));
+      PriceRec record = NewPriceRec(FormatFileDate(DateOfDayNumber(10959 + std::int32_t(i))));
       record.Open = record.High = record.Low = record.Close = closes[i];
       bytes.append(reinterpret_cast<const char*>(&record), sizeof record);
     }

@@ -53,7 +53,7 @@ TEST(CoppockTest, AZeroCloseMakesTheBarZeroAndLeavesTheState) {
 
 TEST(CoppockTest, TheLineBridgesZeroedBars) {
   OscFixture f;
-  f.settings.osc.CopD.daily = 2;
+  f.settings.osc[kCopD].daily = 2;
   f.Closes(kGap);
   ShowCoppock(f.host);
   // 0 to 13 on 110 units from 127.2 up: 17.2 and 127.2 - 33.8.
@@ -64,7 +64,7 @@ TEST(CoppockTest, TheLineBridgesZeroedBars) {
 
 TEST(CoppockTest, TitleLabelsAndLines) {
   OscFixture f;
-  f.settings.osc.CopD.daily = 2;
+  f.settings.osc[kCopD].daily = 2;
   f.Closes(kGap);
   ShowCoppock(f.host);
   const auto lines = Drawn(f, 'L', 16);
@@ -80,7 +80,7 @@ TEST(CoppockTest, TitleLabelsAndLines) {
 
 TEST(CoppockTest, AStateBeyond16BitsEndsInTheMessage) {
   OscFixture f;
-  f.settings.osc.CopD.daily = 2;
+  f.settings.osc[kCopD].daily = 2;
   f.Closes({0.001f, 0.001f, 0.001f, 5000});
   ShowCoppock(f.host);
   ASSERT_EQ(f.dialogs.said.size(), 1u);
@@ -89,11 +89,11 @@ TEST(CoppockTest, AStateBeyond16BitsEndsInTheMessage) {
 
 TEST(CoppockTest, TwoBarsDrawNothingAndFewerThanThePeriodTheFrame) {
   OscFixture f;
-  f.settings.osc.CopD.daily = 1;
+  f.settings.osc[kCopD].daily = 1;
   f.Closes({10, 11});
   ShowCoppock(f.host);
   EXPECT_EQ(f.script.text(), "");
-  f.settings.osc.CopD.daily = 200;
+  f.settings.osc[kCopD].daily = 200;
   f.Closes({10, 11, 12});
   ShowCoppock(f.host);
   EXPECT_EQ(f.script.text(), "B,42,311,630,449,16\r\n");
@@ -107,7 +107,8 @@ TEST(CoppockTest, RealPricesAgreeWithRatesOfChangeKeptWhole) {
   int state = 0;
   for (size_t i = P + 1; i < s.smoothed.size(); ++i) {
     const double c = f.chart.Bars[i].Close;
-    const double raw = 100 * (c / f.chart.Bars[i - P].Close + c / f.chart.Bars[i - P + 1].Close - 2);
+    const double raw =
+        100 * (c / f.chart.Bars[i - P].Close + c / f.chart.Bars[i - P + 1].Close - 2);
     state = int(std::nearbyint((2 * raw + 13.0 * state) / 15));
     ASSERT_EQ(s.smoothed[i], state) << "bar " << i;
   }
@@ -118,7 +119,7 @@ TEST(ValueFrameTest, ASeriesAboveZeroIsSpreadFromZeroWithLowestAsTheOffset) {
   const OscPanel panel(f.host);
   const ValueFrame frame(panel, 3, 1);
   // 3 to 110 units, from 127.2 up.
-  EXPECT_EQ(frame.Y(3), 54);   // 127.2 - 73.3
+  EXPECT_EQ(frame.Y(3), 54);  // 127.2 - 73.3
   EXPECT_EQ(frame.Y(1), 127);
   EXPECT_EQ(frame.Y(0), 164);  // below the panel
 }

@@ -114,14 +114,15 @@ TEST(DirectionalMovementTest, APeriodOfZeroBecomesTen) {
   OscFixture f;
   SetBars(f, ConstantDx(40));
   ShowDirectionalMovement(f.host);
-  EXPECT_EQ(f.Lines('T'), std::vector<std::string>{
-                          "T,8.25,44,313,Directional Movement ( 10 period )    ADX 10 period,27"});
+  EXPECT_EQ(f.Lines('T'),
+            std::vector<std::string>{
+                "T,8.25,44,313,Directional Movement ( 10 period )    ADX 10 period,27"});
 }
 
 TEST(DirectionalMovementTest, FewerBarsThanThePeriodLeaveTheFrame) {
   OscFixture f;
-  f.settings.osc.DMA.daily = 201;
-  f.settings.osc.DMXA.daily = 14;
+  f.settings.osc[kDMA].daily = 201;
+  f.settings.osc[kDMXA].daily = 14;
   SetBars(f, ConstantDx(40));
   ShowDirectionalMovement(f.host);
   EXPECT_EQ(f.script.text(), "B,42,311,630,449,16\r\n");
@@ -129,8 +130,8 @@ TEST(DirectionalMovementTest, FewerBarsThanThePeriodLeaveTheFrame) {
 
 TEST(DirectionalMovementTest, LinesStartBehindTheirWindows) {
   OscFixture f;
-  f.settings.osc.DMA.daily = 4;
-  f.settings.osc.DMXA.daily = 2;
+  f.settings.osc[kDMA].daily = 4;
+  f.settings.osc[kDMXA].daily = 2;
   SetBars(f, ConstantDx(12));
   ShowDirectionalMovement(f.host);
   // Bars 6 to 12. The scale ends at 75: plus at 13, minus at 131 - 25 * 118 / 75.
@@ -151,8 +152,8 @@ TEST(DirectionalMovementTest, LinesStartBehindTheirWindows) {
 TEST(DirectionalMovementTest, TheFillIsSolidUnderPlusAndDottedOtherwise) {
   OscFixture f;
   f.settings.osc.FillIn = true;
-  f.settings.osc.DMA.daily = 2;
-  f.settings.osc.DMXA.daily = 2;
+  f.settings.osc[kDMA].daily = 2;
+  f.settings.osc[kDMXA].daily = 2;
   SetBars(f, Steps("uuuuuddd"));
   ShowDirectionalMovement(f.host);
   // Bars 4 to 8: 100 and 0 twice, 50 and 50, 0 and 100 twice.

@@ -48,14 +48,14 @@ TEST(ElderRayTest, RecordsWithoutARangeUseTheClose) {
 
 TEST(ElderRayTest, TitleAndZeroLines) {
   OscFixture f;
-  f.settings.osc.ERA.daily = 2;
+  f.settings.osc[kERA].daily = 2;
   SetBars(f, kFour);
   ShowElderRay(f.host);
   // 138 * 0.3 = 41.4 and 138 * 0.75 = 103.5, half to even.
-  EXPECT_EQ(f.Lines('T'), (std::vector<std::string>{
-                          "T,8.25,44,313,Elder Ray ( 2  Period )  ,27", "T,8.25,22,343,0.0,27",
-                          "T,8.25,22,406,0.0,27", "T,8.25,43,343,Bull,27",
-                          "T,8.25,43,406,Bear,27"}));
+  EXPECT_EQ(f.Lines('T'),
+            (std::vector<std::string>{"T,8.25,44,313,Elder Ray ( 2  Period )  ,27",
+                                      "T,8.25,22,343,0.0,27", "T,8.25,22,406,0.0,27",
+                                      "T,8.25,43,343,Bull,27", "T,8.25,43,406,Bear,27"}));
   const auto zero = Drawn(f, 'L', 16);
   ASSERT_EQ(zero.size(), 2u);
   EXPECT_SEGMENT(zero[0], 42, 41, 630, 41);
@@ -64,7 +64,7 @@ TEST(ElderRayTest, TitleAndZeroLines) {
 
 TEST(ElderRayTest, RaysStandOnTheirZeroLines) {
   OscFixture f;
-  f.settings.osc.ERA.daily = 2;
+  f.settings.osc[kERA].daily = 2;
   SetBars(f, kFour);
   ShowElderRay(f.host);
   // 69 units hold 6 of Bull and 8 of Bear.
@@ -80,7 +80,7 @@ TEST(ElderRayTest, RaysStandOnTheirZeroLines) {
 
 TEST(ElderRayTest, NoRaysAtAllKeepTheStartingRangesAndShowTheEmptyPanel) {
   OscFixture f;
-  f.settings.osc.ERA.daily = 200;
+  f.settings.osc[kERA].daily = 200;
   SetBars(f, kFour);
   ShowElderRay(f.host);
   EXPECT_EQ(f.Lines('L').size(), 2u);
@@ -89,7 +89,7 @@ TEST(ElderRayTest, NoRaysAtAllKeepTheStartingRangesAndShowTheEmptyPanel) {
 
 TEST(ElderRayTest, ARangeOfZeroOnEitherSideLeavesTheFrame) {
   OscFixture f;
-  f.settings.osc.ERA.daily = 2;
+  f.settings.osc[kERA].daily = 2;
   SetBars(f, {{10, 9, 10}, {10, 9, 10}, {10, 9, 10}});  // no Bull
   ShowElderRay(f.host);
   EXPECT_EQ(f.script.text(), "B,42,311,630,449,16\r\n");

@@ -43,7 +43,7 @@ TEST(HolyGrailTest, EachAverageStartsWhereItsWindowIsFull) {
 
 TEST(HolyGrailTest, LinesStandLeftOfThePricesByThePeriod) {
   OscFixture f;
-  f.settings.osc.HolyD.daily = 2;
+  f.settings.osc[kHolyD].daily = 2;
   f.Closes(kCloses);
   ShowHolyGrail(f.host);
   // x grows from bar 3 on: 44 for bar 3, 54 for bar 8. 3.5 on 110 units from 127.2 up.
@@ -58,7 +58,7 @@ TEST(HolyGrailTest, LinesStandLeftOfThePricesByThePeriod) {
 
 TEST(HolyGrailTest, ADetrendedZeroKeepsTheLastY) {
   OscFixture f;
-  f.settings.osc.HolyD.daily = 2;
+  f.settings.osc[kHolyD].daily = 2;
   f.Closes(kCloses);
   ShowHolyGrail(f.host);
   // Bar 9: its average of -1 would stand at 96.
@@ -67,7 +67,7 @@ TEST(HolyGrailTest, ADetrendedZeroKeepsTheLastY) {
 
 TEST(HolyGrailTest, TitleLabelsAndLines) {
   OscFixture f;
-  f.settings.osc.HolyD.daily = 2;
+  f.settings.osc[kHolyD].daily = 2;
   f.Closes(kCloses);
   ShowHolyGrail(f.host);
   const auto texts = f.Lines('T');
@@ -86,7 +86,7 @@ TEST(HolyGrailTest, TitleLabelsAndLines) {
 TEST(HolyGrailTest, APeriodOf50NeedsMoreThan105BarsForTheSecondLine) {
   for (const int last : {105, 106}) {
     OscFixture f;
-    f.settings.osc.HolyD.daily = 50;
+    f.settings.osc[kHolyD].daily = 50;
     std::vector<float> closes;
     for (int i = 0; i <= last; ++i) closes.push_back(10.0f + float(i % 7) * float(i % 3 + 1));
     f.Closes(closes);
@@ -97,7 +97,7 @@ TEST(HolyGrailTest, APeriodOf50NeedsMoreThan105BarsForTheSecondLine) {
 
 TEST(HolyGrailTest, AYThatCannotBeHadKeepsTheLastOneWithoutAMessage) {
   OscFixture f;
-  f.settings.osc.HolyD.daily = 2;
+  f.settings.osc[kHolyD].daily = 2;
   // At bar 3 the price itself still stands in the column: far outside any picture.
   std::vector<float> closes;
   for (const float c : kCloses) closes.push_back(c + 1e6f);
@@ -109,7 +109,7 @@ TEST(HolyGrailTest, AYThatCannotBeHadKeepsTheLastOneWithoutAMessage) {
 
 TEST(HolyGrailTest, NoLineComesFromAYThatWasNeverHad) {
   OscFixture f;
-  f.settings.osc.HolyD.daily = 2;
+  f.settings.osc[kHolyD].daily = 2;
   // Flat up to bar 8; bar 9 is the first with a y, bar 10 the first with a line.
   f.Closes({5, 5, 5, 5, 5, 5, 5, 5, 5, 8, 6, 7});
   ShowHolyGrail(f.host);
@@ -120,7 +120,7 @@ TEST(HolyGrailTest, NoLineComesFromAYThatWasNeverHad) {
 
 TEST(HolyGrailTest, FewBarsAndEqualCloses) {
   OscFixture f;
-  f.settings.osc.HolyD.daily = 5;
+  f.settings.osc[kHolyD].daily = 5;
   f.Closes({1, 2, 3, 4, 5, 6});  // BarCount 5 is not above the period
   ShowHolyGrail(f.host);
   EXPECT_EQ(f.script.text(), "");

@@ -3,8 +3,8 @@
 #include <cmath>
 #include <limits>
 
-#include "indicators/oscillators.h"
 #include "tests/indicators/osc_fixture.h"
+#include "tests/support/all_oscillators.h"
 
 // What no market has, and files can: every panel ends, tells at most one message, leaves the
 // pointer free and the script closed, and writes no coordinate that is no number.
@@ -118,8 +118,8 @@ TEST_P(HostileBarsTest, PricesThatAreNoNumbersEndInOneMessageAtMost) {
 }
 
 TEST_P(HostileBarsTest, VolumesAtTheLimitsEndInOneMessageAtMost) {
-  for (const std::int32_t volume : {std::numeric_limits<std::int32_t>::max(),
-                                    std::numeric_limits<std::int32_t>::min()}) {
+  for (const std::int32_t volume :
+       {std::numeric_limits<std::int32_t>::max(), std::numeric_limits<std::int32_t>::min()}) {
     OscFixture f;
     SetAllPeriods(f, 5);
     std::vector<Bar> bars = Swings(120);

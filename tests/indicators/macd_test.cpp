@@ -17,9 +17,9 @@ void Rise(OscFixture& f, int count, float from = 0, float step = 1) {
   std::vector<float> closes;
   for (int i = 0; i < count; ++i) closes.push_back(from + step * float(i));
   f.Closes(closes);
-  f.settings.osc.Md1 = {12, 12};
-  f.settings.osc.Md2 = {26, 26};
-  f.settings.osc.Md3 = {9, 9};
+  f.settings.osc[kMd1] = {12, 12};
+  f.settings.osc[kMd2] = {26, 26};
+  f.settings.osc[kMd3] = {9, 9};
   SetPriceMap(f, 1);
 }
 
@@ -61,7 +61,7 @@ TEST(MacdTest, TheFirstDifferenceIsAtBar37AndTheFirstSignalAtBar46) {
   EXPECT_EQ(s.difference[36], 0);
   EXPECT_NEAR(s.difference[37], 7, 1e-4);
   EXPECT_EQ(s.signal[45], 0);
-  EXPECT_NEAR(s.signal[46], 70.0 / 9, 1e-4);              // ten sevens over nine
+  EXPECT_NEAR(s.signal[46], 70.0 / 9, 1e-4);  // ten sevens over nine
   EXPECT_NEAR(s.signal[47], 0.2 * 7 + 0.8 * 70 / 9, 1e-4);
 }
 
@@ -147,20 +147,13 @@ TEST(MacdTest, TheMultiOscillatorViewShowsTheHistogramOnly) {
   EXPECT_EQ(f.Lines('B'), std::vector<std::string>{"B,42,503,630,641,16"});
 }
 
-TEST(MacdTest, WeeksAndMonthsReadTheTwinsAndOtherLettersNothing) {
+TEST(MacdTest, WeeksAndMonthsReadTheTwins) {
   OscFixture f;
   Rise(f, 60);
-  f.settings.osc.Md1.twin = 5;
-  f.request.ChartPeriod = "M";
+  f.settings.osc[kMd1].twin = 5;
+  f.request.ChartPeriod = Period::kMonthly;
   ShowMACD(f.host);
   EXPECT_EQ(f.Lines('T').at(0), "T,8.25,44,313,MACD ( 5 / 26 / 9  Period )  ,27");
-
-  OscFixture other;
-  Rise(other, 60);
-  other.request.ChartPeriod = "X";
-  ShowMACD(other.host);
-  EXPECT_TRUE(other.panel.ops.empty());
-  EXPECT_EQ(other.script.text(), "");
 }
 
 TEST(MacdTest, EqualClosesLeaveTheFrame) {
@@ -180,10 +173,10 @@ TEST(MacdTest, FewerBarsThanTheFirstSignalNeedsLeaveTheFrame) {
 }
 
 TEST(MacdTest, OneOfThreePeriodsMissingDrawsNothing) {
-  for (PeriodPair OscSettings::*pair : {&OscSettings::Md1, &OscSettings::Md2, &OscSettings::Md3}) {
+  for (const OscKey* pair : {&kMd1, &kMd2, &kMd3}) {
     OscFixture f;
     Rise(f, 60);
-    f.settings.osc.*pair = {};
+    f.settings.osc[*pair] = {};
     ShowMACD(f.host);
     EXPECT_TRUE(f.panel.ops.empty());
     EXPECT_EQ(f.script.text(), "");
@@ -228,8 +221,7 @@ TEST(MacdTest, RealPricesAgreeWithTheAveragesWrittenOut) {
   double seed3 = 0;
   for (int i = 37; i <= 46; ++i) seed3 += difference[size_t(i)] / 9;
   for (int i = 46; i <= f.chart.Bars.BarCount; ++i) {
-    const double signal =
-        weighted([&](int j) { return difference[size_t(j)]; }, 46, seed3, 9, i);
+    const double signal = weighted([&](int j) { return difference[size_t(j)]; }, 46, seed3, 9, i);
     ASSERT_NEAR(s.signal[size_t(i)], signal, 1e-3) << "bar " << i;
   }
 }

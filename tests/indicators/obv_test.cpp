@@ -114,7 +114,7 @@ TEST(ObvTest, NoVolumePrintsSoAndShowsNoScale) {
 
 TEST(ObvTest, ASecondPassMovesTheTextsAndDrawsNoScale) {
   OscFixture f;
-  f.chart.OscPanel = -1;
+  f.host.SecondPass = true;
   f.Closes({1, 2, 3, 2});
   ShowOBV(f.host);
   EXPECT_EQ(f.script.text(),
@@ -123,7 +123,7 @@ TEST(ObvTest, ASecondPassMovesTheTextsAndDrawsNoScale) {
   EXPECT_TRUE(f.panel.Has("text 8.25 44,33 No Volume Data 27"));
 
   OscFixture g;
-  g.chart.OscPanel = -1;
+  g.host.SecondPass = true;
   SetBars(g, kFive);
   ShowOBV(g.host);
   EXPECT_TRUE(g.Lines('L').empty());
@@ -154,7 +154,8 @@ TEST(ObvTest, AnOverflowNamesTheFileAndTheDay) {
 TEST(ObvTest, TheDisksQuestionHasATitleOfItsOwn) {
   OscFixture f;
   f.dialogs.answers = {Answer::kCancel};
-  RunOscillator(f.host, "OBV", true, [] { throw RunTimeError(kDiskNotReady); }, nullptr, "FX");
+  RunOscillator(
+      f.host, "OBV", true, [] { throw RunTimeError(kDiskNotReady); }, nullptr, "FX");
   ASSERT_EQ(f.dialogs.said.size(), 1u);
   EXPECT_EQ(f.dialogs.said[0].title, "FX");
 }

@@ -7,7 +7,8 @@
 
 #include "base/dates.h"
 #include "base/numbers.h"
-#include "indicators/osc_panel.h"
+#include "indicators/oscillators.h"
+#include "tests/support/places.h"
 #include "tests/support/recording_surface.h"
 #include "tests/support/script_lines.h"
 #include "tests/support/scripted_dialogs.h"
@@ -84,7 +85,7 @@ inline void SetBars(OscFixture& f, const std::vector<Bar>& bars) {
 
 // Every oscillator period at one value.
 inline void SetAllPeriods(OscFixture& f, std::int16_t period) {
-  for (const OscKey& key : OscKeys()) f.settings.osc.*key.value = {period, period};
+  for (const OscKey& key : OscKeys()) f.settings.osc[key] = {period, period};
 }
 
 // A price map of `perY` a unit above `bottom`, from 0 up.
@@ -98,7 +99,7 @@ inline void SetPriceMap(OscFixture& f, float perY, std::int16_t bottom = 290) {
 // where there are no such files on this machine.
 inline std::vector<ChartBar> RealBars(const std::string& code) {
   std::vector<ChartBar> bars;
-  std::ifstream file(std::string(KORA_DATA_DIR) + "/" + code + ".csv");
+  std::ifstream file(DataDir() + "/" + code + ".csv");
   std::string line;
   while (std::getline(file, line)) {
     std::istringstream fields(line);
@@ -150,12 +151,12 @@ inline std::vector<std::vector<double>> Drawn(const OscFixture& f, char letter, 
 
 }  // namespace kora::test
 
-#define EXPECT_SEGMENT(actual, x1, y1, x2, y2)                           \
-  do {                                                                   \
-    const std::vector<double> segment_ = (actual);                       \
-    ASSERT_EQ(segment_.size(), 4u);                                      \
-    EXPECT_NEAR(segment_[0], x1, 1e-3);                                  \
-    EXPECT_NEAR(segment_[1], y1, 1e-3);                                  \
-    EXPECT_NEAR(segment_[2], x2, 1e-3);                                  \
-    EXPECT_NEAR(segment_[3], y2, 1e-3);                                  \
+#define EXPECT_SEGMENT(actual, x1, y1, x2, y2)     \
+  do {                                             \
+    const std::vector<double> segment_ = (actual); \
+    ASSERT_EQ(segment_.size(), 4u);                \
+    EXPECT_NEAR(segment_[0], x1, 1e-3);            \
+    EXPECT_NEAR(segment_[1], y1, 1e-3);            \
+    EXPECT_NEAR(segment_[2], x2, 1e-3);            \
+    EXPECT_NEAR(segment_[3], y2, 1e-3);            \
   } while (false)

@@ -42,7 +42,7 @@ TEST(OscPanelTest, GuideHasItsLabelRightAlignedLeftOfTheFrame) {
 
 TEST(OscPanelTest, SecondPassRedrawsNeitherFrameNorGuidesAndMovesTheTitle) {
   OscFixture f;
-  f.chart.OscPanel = -1;
+  f.host.SecondPass = true;
   OscPanel panel(f.host);
   panel.Frame();
   panel.Guide(50, "70%");

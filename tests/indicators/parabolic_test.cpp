@@ -78,7 +78,8 @@ TEST(ParabolicTest, TheStopMovesTowardTheBarsHighAndNotTheExtreme) {
 
 TEST(ParabolicTest, TheFactorStopsAt20BecauseTheNinthSumFallsUnder18In32Bits) {
   std::vector<HighLow> bars;
-  for (int i = 0; i < 14; ++i) bars.push_back({100.0f + 10.0f * float(i), 99.0f + 10.0f * float(i)});
+  for (int i = 0; i < 14; ++i)
+    bars.push_back({100.0f + 10.0f * float(i), 99.0f + 10.0f * float(i)});
   const ParabolicTrail t = Trail(bars);
   const auto factor = [&](size_t i) {
     const double before = i == 1 ? t.startStop : t.steps[i - 1].stop;
@@ -142,8 +143,8 @@ TEST(ParabolicTest, PointsHaveAColourOfTheirOwnInTheScript) {
   SetHighLows(f, RiseThen({{8, 7}}));
   ShowParabolic(f.host);
   // 290 - 90.4, 290 - 91.584, 290 - 93.889, and after the turn 290 - 130.
-  EXPECT_EQ(f.Lines('K'), (std::vector<std::string>{"K,44,200,45", "K,46,198,45", "K,48,196,45",
-                                                    "K,50,160,46"}));
+  EXPECT_EQ(f.Lines('K'),
+            (std::vector<std::string>{"K,44,200,45", "K,46,198,45", "K,48,196,45", "K,50,160,46"}));
   EXPECT_TRUE(f.price.Has("point 44,200 38"));
   EXPECT_TRUE(f.price.Has("point 50,160 40"));
   EXPECT_TRUE(f.panel.ops.empty());
@@ -277,7 +278,7 @@ TEST(ParabolicOnAverageTest, TheAverageIsRoundedHalfToEven) {
   for (int i = 0; i < 5; ++i) f.chart.CloseY.push_back(110);
   ShowParabolicOnAverage(f.host);
   EXPECT_TRUE(f.Lines('K').empty());  // three new highs
-  f.chart.CloseY.push_back(110);  // 102.86 is 103: the fourth
+  f.chart.CloseY.push_back(110);      // 102.86 is 103: the fourth
   ShowParabolicOnAverage(f.host);
   EXPECT_EQ(f.Lines('K').size(), 6u);
 }

@@ -261,11 +261,11 @@ TEST(PriceOverlaysTest, LowerOfTwoChartsDrawsThemWhereItsBarsStand) {
   f.services.overlays = PriceOverlays(true, {3});
   f.request.Ma1On = true;
   f.request.Ma1Days = 2;
-  f.chart.TwoCharts = true;
-  f.chart.ChartSlot = 1;
+  f.request.Place = ChartPlace::kUpper;
   f.Days("20240101", 8);
   ASSERT_TRUE(f.Compose());
   f.days.resize(4);
+  f.request.Place = ChartPlace::kLower;
   ASSERT_TRUE(f.Compose());
   EXPECT_TRUE(f.Wrote("L,52,337,54,337,20"));
   EXPECT_TRUE(f.Wrote("L,54,337,56,337,20"));
@@ -297,7 +297,7 @@ TEST(PriceOverlaysTest, SuperimposedChartHasNone) {
   f.request.Ma1On = f.request.Ma2On = true;
   f.request.Ma1Days = f.request.Ma2Days = 2;
   f.services.overlays = PriceOverlays(true, {2});
-  f.chart.OscPanel = 1;
+  f.request.Place = ChartPlace::kUnder;
   f.Days("20240101", 30);
   ASSERT_TRUE(f.Compose());
   for (const std::string& line : f.Script())
@@ -319,21 +319,19 @@ TEST(ReversalLegendTest, FiveMarksInTheirColours) {
   OverlayFixture f;
   RecordingSurface legend(kLegendWidth, kLegendHeight);
   DrawReversalLegend(legend, f.fonts, f.colours);
-  EXPECT_EQ(legend.ops,
-            (Lines{"cls", "box 0,0,112,70 16", "text 8.25 2,1  Reversal 27",
-                   "line solid 105,3,105,12 29", "text 8.25 2,15  Key Reversal 27",
-                   "line solid 105,17,105,26 30", "text 8.25 2,29  Hook Reversal 27",
-                   "line solid 105,31,105,40 31", "text 8.25 2,43  Open-Close Rev. 27",
-                   "line solid 105,45,105,54 32", "text 8.25 2,57  Pivot Point 27",
-                   "line solid 105,59,105,68 33"}));
+  EXPECT_EQ(legend.ops, (Lines{"cls", "box 0,0,112,70 16", "text 8.25 2,1  Reversal 27",
+                               "line solid 105,3,105,12 29", "text 8.25 2,15  Key Reversal 27",
+                               "line solid 105,17,105,26 30", "text 8.25 2,29  Hook Reversal 27",
+                               "line solid 105,31,105,40 31", "text 8.25 2,43  Open-Close Rev. 27",
+                               "line solid 105,45,105,54 32", "text 8.25 2,57  Pivot Point 27",
+                               "line solid 105,59,105,68 33"}));
 }
 
 TEST(MmaBoxesTest, BlankIsZeroAndTheRangeEndsAtSixHundred) {
   std::array<std::string, 12> boxes{"3",    "",  "600", " 10 ", "0", "abc",
                                     "12.5", "7", "",    "",     "",  ""};
   size_t refused = 99;
-  EXPECT_EQ(ReadMMABoxes(boxes, refused),
-            (MmaPeriods{3, 0, 600, 10, 0, 0, 12, 7, 0, 0, 0, 0}));
+  EXPECT_EQ(ReadMMABoxes(boxes, refused), (MmaPeriods{3, 0, 600, 10, 0, 0, 12, 7, 0, 0, 0, 0}));
   EXPECT_EQ(refused, 99u);
   for (const char* bad : {"-1", "601", "600.1", "99999999999999999999"}) {
     boxes[4] = bad;

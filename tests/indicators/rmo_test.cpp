@@ -21,8 +21,8 @@ namespace {
 struct Rmo : CompareFixture {
   Rmo(std::int16_t P, std::int16_t A) {
     host.OscCode = "RMO";
-    settings.osc.RmoP.daily = P;
-    settings.osc.RmoA.daily = A;
+    settings.osc[kRmoP].daily = P;
+    settings.osc[kRmoA].daily = A;
   }
   Texts Averages() const {
     Texts lines = Lines('L');
@@ -57,10 +57,10 @@ TEST(RmoTest, PanelByHandOnARunningScale) {
   // -0.25   -1..1        84.25  4      46   53.5, 54
   // -2.25   -2.25..1     121    5      48   102.5, 102
   // On the range of the whole series the -1 would stand at 83.
-  EXPECT_EQ(f.Lines('H'), (Texts{"H,42,429,44,331,45", "H,44,331,46,392,45",
-                                 "H,46,392,48,429,45"}));
-  EXPECT_EQ(f.Averages(), (Texts{"L,42,380,44,380,46", "L,44,380,46,362,46",
-                                 "L,46,362,48,410,46"}));
+  EXPECT_EQ(f.Lines('H'),
+            (Texts{"H,42,429,44,331,45", "H,44,331,46,392,45", "H,46,392,48,429,45"}));
+  EXPECT_EQ(f.Averages(),
+            (Texts{"L,42,380,44,380,46", "L,44,380,46,362,46", "L,46,362,48,410,46"}));
   EXPECT_TRUE(f.panel.Has("line solid 42,121,44,23 45"));
 }
 
@@ -119,8 +119,8 @@ TEST(RmoTest, ZeroCloseIsPassedOverAndTakesNoRoom) {
   index.insert(index.begin() + 4, 777.0f);
   f.Put(security, index);
   ShowRMO(f.host);
-  EXPECT_EQ(f.Lines('H'), (Texts{"H,42,429,44,331,45", "H,44,331,46,392,45",
-                                 "H,46,392,48,429,45"}));
+  EXPECT_EQ(f.Lines('H'),
+            (Texts{"H,42,429,44,331,45", "H,44,331,46,392,45", "H,46,392,48,429,45"}));
 }
 
 TEST(RmoTest, FilesArePairedFromTheirEndsWhateverTheirDates) {
@@ -190,9 +190,9 @@ TEST(RmoTest, SecurityComparedWithItselfHasNoValues) {
 }
 
 TEST(RmoTest, NothingIsDrawnOnWeeklyAndMonthlyCharts) {
-  for (const char* period : {"W", "M"}) {
+  for (const Period period : {Period::kWeekly, Period::kMonthly}) {
     Rmo f(2, 0);
-    f.settings.osc.RmoP.twin = 2;
+    f.settings.osc[kRmoP].twin = 2;
     f.request.ChartPeriod = period;
     f.Put(kOnes, kIndexCloses);
     ShowRMO(f.host);
@@ -229,8 +229,8 @@ TEST(RmoTest, CompareFileGoneAtTheTimeOfReadingDrawsNothing) {
   f.Put(kOnes, kIndexCloses);
   GoneIo io;
   Files files(f.home.path(), io);
-  OscHost host{files, f.dialogs, f.settings, f.colours, f.request, f.chart, f.price, f.panel,
-               &f.script};
+  OscHost host{files,   f.dialogs, f.settings, f.colours, f.request,
+               f.chart, f.price,   f.panel,    &f.script};
   ShowRMO(host);
   EXPECT_TRUE(f.panel.ops.empty());
   EXPECT_TRUE(f.dialogs.said.empty());
@@ -308,8 +308,8 @@ TEST(RmoTest, RealPricesAgreeWithAPlainComputation) {
   std::vector<float> ratio, value;
   const size_t n = std::min(closes.size(), indexCloses.size());
   for (size_t i = 0; i < n; ++i)
-    ratio.push_back(float(indexCloses[indexCloses.size() - n + i] /
-                          (100.0 * closes[closes.size() - n + i])));
+    ratio.push_back(
+        float(indexCloses[indexCloses.size() - n + i] / (100.0 * closes[closes.size() - n + i])));
   double high = -1e5, low = 1e5;
   std::vector<double> y;
   size_t doubled = 0;

@@ -22,8 +22,8 @@ namespace {
 struct Rmx : CompareFixture {
   Rmx(std::int16_t P, std::int16_t A) {
     host.OscCode = "RMX";
-    settings.osc.RmxP.daily = P;
-    settings.osc.RmxA.daily = A;
+    settings.osc[kRmxP].daily = P;
+    settings.osc[kRmxA].daily = A;
   }
   // Lines of the data in a colour entry.
   Texts Data(int entry) const {
@@ -119,8 +119,8 @@ TEST(RmxTest, CentreBeyond16BitsHasNoPointAndEndsNothing) {
   Rmx f(2, 0);
   // Values 0.5 and 0.5 + 2^-14: zero lies 98 * 8192 units below, until -0.75 widens the range.
   f.Put(kOnes, {400, 300, 200 - 200.0f / 16384, 350, 100, 100});
-  const RmxSeries series = RmxValues(
-      f.chart.Bars, std::vector<float>{400, 300, 200 - 200.0f / 16384, 350, 100, 100}, 2);
+  const RmxSeries series =
+      RmxValues(f.chart.Bars, std::vector<float>{400, 300, 200 - 200.0f / 16384, 350, 100, 100}, 2);
   ASSERT_LT(series.Points[2].Highest - series.Points[2].Lowest, 0.001f);
   ASSERT_GT(series.Points[2].Highest, series.Points[2].Lowest);
   ShowRMX(f.host);
@@ -207,24 +207,37 @@ TEST(RmxTest, WithNoValueTheStartRangeStands) {
   }
 }
 
-TEST(RmxTest, PageOfPanelsHasItsOwnTopAndBottom) {
+TEST(RmxTest, TitleAndValuesStandWithinThePictureOfTheWindow) {
+  for (const double height : {100.0, 144.0, 190.0, 400.0}) {
+    Rmx f(2, 0);
+    f.Put(kOnes, kIndexCloses);
+    f.panel.SetScale(0, 0, 638, height);
+    ShowRMX(f.host);
+    // The values begin 14 below the frame, whose end is at 141 units; a line of text is 14 high.
+    EXPECT_EQ(f.Lines('B')[0], "B,42,311,630,449,16") << "the script is that of 144 units";
+    const double unit = f.panel.Height() / f.panel.ScaleHeight();
+    EXPECT_LE((141 + 14) * unit + 14, f.panel.Height() + 0.2) << height;
+  }
+}
+
+TEST(RmxTest, AViewOfPanelsLeavesRoomForTheTextsBelowTheFrame) {
   Rmx f(2, 0);
   f.Put(kOnes, kIndexCloses);
   f.host.OscCaller = "ANAL";
-  f.host.AnalPageMode = true;
   f.host.PanelOffsetY = 1000;
   ShowRMX(f.host);
-  EXPECT_EQ(f.Lines('B')[0], "B,42,1020,630,1220,16");
-  // 200 units for -1 to 1 with no inset; the middle is 120.
-  EXPECT_EQ(f.Data(45), (Texts{"L,44,1145,46,1095,45", "L,46,1095,48,1220,45",
-                               "L,48,1220,50,1020,45", "L,50,1020,52,1145,45"}));
-  EXPECT_EQ(f.Lines('T').back(), "T,8.25,432,1234,RMX   -25 (100),27");
+  // A panel of 144: 2% from the top, 28 units more than 2% from its end.
+  EXPECT_EQ(f.Lines('B')[0], "B,42,1003,630,1113,16");
+  // 110 units for -1 to 1 with no inset; the middle is 58.
+  EXPECT_EQ(f.Data(45), (Texts{"L,44,1072,46,1044,45", "L,46,1044,48,1113,45",
+                               "L,48,1113,50,1003,45", "L,50,1003,52,1072,45"}));
+  EXPECT_EQ(f.Lines('T').back(), "T,8.25,432,1127,RMX   -14 (55),27");
 }
 
 TEST(RmxTest, WeeklyAndMonthlyChartsAreDrawnWithTheTwinPeriods) {
   Rmx f(0, 0);
-  f.settings.osc.RmxP.twin = 2;
-  f.request.ChartPeriod = "W";
+  f.settings.osc[kRmxP].twin = 2;
+  f.request.ChartPeriod = Period::kWeekly;
   f.Put(kOnes, kIndexCloses);
   ShowRMX(f.host);
   EXPECT_EQ(f.Data(45).size(), 4u);
@@ -235,7 +248,7 @@ TEST(RmxTest, PeriodOfZeroOrRefusedCompareFileDrawsNothing) {
   f.Put(kOnes, kIndexCloses);
   ShowRMX(f.host);
   EXPECT_TRUE(f.dialogs.said.empty());
-  f.settings.osc.RmxP.daily = 2;
+  f.settings.osc[kRmxP].daily = 2;
   f.settings.osc.CompFile = "c:\\korawin\\data\\index.dat";
   ShowRMX(f.host);
   ASSERT_EQ(f.dialogs.said.size(), 1u);
@@ -250,8 +263,8 @@ TEST(RmxTest, CompareFileGoneAtTheTimeOfReadingLeavesTheFrame) {
   f.Put(kOnes, kIndexCloses);
   GoneIo io;
   Files files(f.home.path(), io);
-  OscHost host{files, f.dialogs, f.settings, f.colours, f.request, f.chart, f.price, f.panel,
-               &f.script};
+  OscHost host{files,   f.dialogs, f.settings, f.colours, f.request,
+               f.chart, f.price,   f.panel,    &f.script};
   ShowRMX(host);
   EXPECT_EQ(f.script.text(), kFrame);
   EXPECT_TRUE(f.dialogs.said.empty());
@@ -264,8 +277,8 @@ TEST(RmxTest, ReadErrorIsToldByItsNumber) {
   FailingIo io;
   io.failReadAt = 2;
   Files files(f.home.path(), io);
-  OscHost host{files, f.dialogs, f.settings, f.colours, f.request, f.chart, f.price, f.panel,
-               &f.script};
+  OscHost host{files,   f.dialogs, f.settings, f.colours, f.request,
+               f.chart, f.price,   f.panel,    &f.script};
   ShowRMX(host);
   ASSERT_EQ(f.dialogs.said.size(), 1u);
   EXPECT_EQ(f.dialogs.said[0].text.rfind("There is an unexpected error No. 57\n", 0), 0u);

@@ -55,22 +55,22 @@ TEST(RsiTest, EqualClosesAndTheBarBeforeTheWindowAreNothing) {
 
 TEST(RsiTest, ThePlacesOfTitleAndGuides) {
   OscFixture f;
-  f.settings.osc.RsiP.daily = 14;
+  f.settings.osc[kRsiP].daily = 14;
   f.Closes({1, 2, 3});
   ShowRSI(f.host);
   // Height 118 from 13 on: 48.4, 95.6, 72. Labels are 22 wide.
   EXPECT_EQ(f.Lines('L'), (std::vector<std::string>{"L,42,356,630,356,16", "L,42,404,630,404,16",
                                                     "L,42,380,630,380,16"}));
-  EXPECT_EQ(f.Lines('T'), (std::vector<std::string>{
-                          "T,8.25,44,313,Relative Strength Index Oscillator (14 Period),27",
-                          "T,8.25,15,350,70%,27", "T,8.25,15,398,30%,27",
-                          "T,8.25,15,374,50%,27"}));
+  EXPECT_EQ(f.Lines('T'),
+            (std::vector<std::string>{
+                "T,8.25,44,313,Relative Strength Index Oscillator (14 Period),27",
+                "T,8.25,15,350,70%,27", "T,8.25,15,398,30%,27", "T,8.25,15,374,50%,27"}));
   EXPECT_EQ(f.Lines('B'), std::vector<std::string>{"B,42,311,630,449,16"});
 }
 
 TEST(RsiTest, TheFirstThreeValuesHaveNoLine) {
   OscFixture f;
-  f.settings.osc.RsiP.daily = 2;
+  f.settings.osc[kRsiP].daily = 2;
   f.Closes({10, 11, 12, 11, 10});
   ShowRSI(f.host);
   // Values 0, 33.3, 33.3 and 0 at bars 1 to 4; the line is the one to the fourth.
@@ -81,8 +81,8 @@ TEST(RsiTest, TheFirstThreeValuesHaveNoLine) {
 
 TEST(RsiTest, WeeklyChartsReadTheTwin) {
   OscFixture f;
-  f.settings.osc.RsiP = {14, 9};
-  f.request.ChartPeriod = "W";
+  f.settings.osc[kRsiP] = {14, 9};
+  f.request.ChartPeriod = Period::kWeekly;
   f.Closes({1, 2, 3});
   ShowRSI(f.host);
   EXPECT_EQ(f.Lines('T')[0], "T,8.25,44,313,Relative Strength Index Oscillator (9 Period),27");
@@ -90,7 +90,7 @@ TEST(RsiTest, WeeklyChartsReadTheTwin) {
 
 TEST(RsiTest, APriceWithoutBoundsEndsInTheMessage) {
   OscFixture f;
-  f.settings.osc.RsiP.daily = 3;
+  f.settings.osc[kRsiP].daily = 3;
   const float inf = std::numeric_limits<float>::infinity();
   f.Closes({10, inf, 10, 10, 10});
   ShowRSI(f.host);

@@ -7,6 +7,7 @@
 #include "indicators/chart_defaults.h"
 #include "indicators/osc_settings.h"
 #include "indicators/overlay_settings.h"
+#include "tests/support/all_oscillators.h"
 #include "tests/support/failing_io.h"
 #include "tests/support/records.h"
 #include "tests/support/scripted_dialogs.h"
@@ -23,7 +24,7 @@ class SettingsRules : public testing::Test {
 
   std::string Osc(const char* key) { return ini.GetSetting("OscDef", key); }
   std::string Chart(const char* key) { return ini.GetSetting("Charts", key); }
-  bool Read(const char* code, std::vector<std::string> typed, const char* period = "A") {
+  bool Read(const char* code, std::vector<std::string> typed, Period period = Period::kDaily) {
     return ReadOscFields(*FindOscBox(code), typed, period, osc, refused);
   }
 
@@ -61,9 +62,9 @@ TEST_F(SettingsRules, EveryOscillatorWithPeriodsHasItsBox) {
       {"VTY", "Volatility", {"Period "}, false},
   };
   for (const Expected& e : boxes) {
-    const OscBox* box = FindOscBox(e.code);
+    const Oscillator* box = FindOscBox(e.code);
     ASSERT_NE(box, nullptr) << e.code;
-    EXPECT_STREQ(box->caption, e.caption);
+    EXPECT_STREQ(box->boxCaption, e.caption);
     EXPECT_EQ(box->compares, e.compares) << e.code;
     std::vector<std::string> labels;
     for (const OscField& field : box->fields) labels.push_back(field.label);
@@ -74,83 +75,87 @@ TEST_F(SettingsRules, EveryOscillatorWithPeriodsHasItsBox) {
 
 TEST_F(SettingsRules, EachFieldIsAPeriodOfItsOwnOscillator) {
   ASSERT_TRUE(Read("R/F", {"1", "2", "3", "4"}));
-  EXPECT_EQ(osc.FXF.daily, 1);
-  EXPECT_EQ(osc.FXX.daily, 2);
-  EXPECT_EQ(osc.RocP.daily, 3);
-  EXPECT_EQ(osc.RocA.daily, 4);
+  EXPECT_EQ(osc[kFXF].daily, 1);
+  EXPECT_EQ(osc[kFXX].daily, 2);
+  EXPECT_EQ(osc[kRocP].daily, 3);
+  EXPECT_EQ(osc[kRocA].daily, 4);
   ASSERT_TRUE(Read("MACD", {"5", "6", "7"}));
-  EXPECT_EQ(osc.Md1.daily, 5);
-  EXPECT_EQ(osc.Md2.daily, 6);
-  EXPECT_EQ(osc.Md3.daily, 7);
+  EXPECT_EQ(osc[kMd1].daily, 5);
+  EXPECT_EQ(osc[kMd2].daily, 6);
+  EXPECT_EQ(osc[kMd3].daily, 7);
   ASSERT_TRUE(Read("DM", {"8", "9"}));
-  EXPECT_EQ(osc.DMA.daily, 8);
-  EXPECT_EQ(osc.DMXA.daily, 9);
-  const std::pair<const char*, PeriodPair OscSettings::*> single[] = {
-      {"RSI", &OscSettings::RsiP}, {"WMS", &OscSettings::WmsA}, {"MOM", &OscSettings::MMA},
-      {"ERY", &OscSettings::ERA},  {"COP", &OscSettings::CopD}, {"JHG", &OscSettings::HolyD},
-      {"VTY", &OscSettings::VtyD}};
+  EXPECT_EQ(osc[kDMA].daily, 8);
+  EXPECT_EQ(osc[kDMXA].daily, 9);
+  const std::pair<const char*, const OscKey*> single[] = {
+      {"RSI", &kRsiP}, {"WMS", &kWmsA},  {"MOM", &kMMA}, {"ERY", &kERA},
+      {"COP", &kCopD}, {"JHG", &kHolyD}, {"VTY", &kVtyD}};
   std::int16_t value = 20;
   for (const auto& [code, member] : single) {
     ASSERT_TRUE(Read(code, {std::to_string(++value)}));
-    EXPECT_EQ((osc.*member).daily, value) << code;
+    EXPECT_EQ(osc[*member].daily, value) << code;
   }
-  const std::tuple<const char*, PeriodPair OscSettings::*, PeriodPair OscSettings::*> pairs[] = {
-      {"STO", &OscSettings::StochK, &OscSettings::StochD},
-      {"FX", &OscSettings::FXF, &OscSettings::FXX},
-      {"RMX", &OscSettings::RmxP, &OscSettings::RmxA},
-      {"RMO", &OscSettings::RmoP, &OscSettings::RmoA},
-      {"ROC", &OscSettings::RocP, &OscSettings::RocA}};
+  const std::tuple<const char*, const OscKey*, const OscKey*> pairs[] = {
+      {"STO", &kStochK, &kStochD},
+      {"FX", &kFXF, &kFXX},
+      {"RMX", &kRmxP, &kRmxA},
+      {"RMO", &kRmoP, &kRmoA},
+      {"ROC", &kRocP, &kRocA}};
   for (const auto& [code, first, second] : pairs) {
     ASSERT_TRUE(Read(code, {std::to_string(value + 1), std::to_string(value + 2)}));
-    EXPECT_EQ((osc.*first).daily, ++value) << code;
-    EXPECT_EQ((osc.*second).daily, ++value) << code;
+    EXPECT_EQ(osc[*first].daily, ++value) << code;
+    EXPECT_EQ(osc[*second].daily, ++value) << code;
   }
 }
 
 TEST_F(SettingsRules, AFirstFieldIsOneToTwoHundredAndAnAverageMayBeZero) {
   EXPECT_TRUE(Read("STO", {"1", "0"}));
   EXPECT_TRUE(Read("STO", {"200", "200"}));
-  EXPECT_EQ(osc.StochK.daily, 200);
+  EXPECT_EQ(osc[kStochK].daily, 200);
   struct Bad {
     const char* code;
     std::vector<std::string> typed;
     size_t refused;
   };
-  const Bad bads[] = {{"STO", {"0", "5"}, 0},      {"STO", {"201", "5"}, 0},
-                      {"STO", {"10", "201"}, 1},   {"STO", {"10", "-1"}, 1},
-                      {"STO", {"-3", "5"}, 0},     {"STO", {"text", "5"}, 0},
-                      {"STO", {"", ""}, 0},        {"R/F", {"50", "0", "0", "0"}, 2},
-                      {"MACD", {"12", "0", "9"}, 1}, {"MACD", {"12", "26", "0"}, 2},
+  const Bad bads[] = {{"STO", {"0", "5"}, 0},
+                      {"STO", {"201", "5"}, 0},
+                      {"STO", {"10", "201"}, 1},
+                      {"STO", {"10", "-1"}, 1},
+                      {"STO", {"-3", "5"}, 0},
+                      {"STO", {"text", "5"}, 0},
+                      {"STO", {"", ""}, 0},
+                      {"R/F", {"50", "0", "0", "0"}, 2},
+                      {"MACD", {"12", "0", "9"}, 1},
+                      {"MACD", {"12", "26", "0"}, 2},
                       {"RSI", {"99999999999999999999"}, 0}};
   for (const Bad& bad : bads) {
     EXPECT_FALSE(Read(bad.code, bad.typed)) << bad.code;
     EXPECT_EQ(refused, bad.refused) << bad.code << bad.typed[0];
-    EXPECT_EQ(osc.StochK.daily, 200) << "as it was";
-    EXPECT_EQ(osc.FXF.daily, 0);
+    EXPECT_EQ(osc[kStochK].daily, 200) << "as it was";
+    EXPECT_EQ(osc[kFXF].daily, 0);
   }
 }
 
 TEST_F(SettingsRules, WeeklyAndMonthlyChartsShareTheTwin) {
-  ASSERT_TRUE(Read("RSI", {"11"}, "W"));
-  EXPECT_EQ(osc.RsiP.daily, 0);
-  EXPECT_EQ(osc.RsiP.twin, 11);
-  ASSERT_TRUE(Read("RSI", {"12"}, "M"));
-  EXPECT_EQ(osc.RsiP.twin, 12);
-  EXPECT_EQ(osc.RsiP.For("W"), 12);
+  ASSERT_TRUE(Read("RSI", {"11"}, Period::kWeekly));
+  EXPECT_EQ(osc[kRsiP].daily, 0);
+  EXPECT_EQ(osc[kRsiP].twin, 11);
+  ASSERT_TRUE(Read("RSI", {"12"}, Period::kMonthly));
+  EXPECT_EQ(osc[kRsiP].twin, 12);
+  EXPECT_EQ(osc[kRsiP].For(Period::kWeekly), 12);
 }
 
 TEST_F(SettingsRules, DefaultsAreGivenForThePeriodOnShowOnly) {
-  FillOscDefaults(osc, "A");
-  EXPECT_EQ(osc.RmxP.daily, 100);
-  EXPECT_EQ(osc.RmxP.twin, 0);
-  EXPECT_EQ(osc.StochK.daily, 10);
-  EXPECT_EQ(osc.StochK.twin, 0);
-  EXPECT_EQ(osc.VtyD.daily, 3);
-  osc.RmxA.twin = 33;
-  FillOscDefaults(osc, "M");
-  EXPECT_EQ(osc.RmxP.twin, 50);
-  EXPECT_EQ(osc.RmxA.twin, 33) << "what is not zero stays";
-  EXPECT_EQ(osc.Md3.twin, 9);
+  FillOscDefaults(osc, Period::kDaily);
+  EXPECT_EQ(osc[kRmxP].daily, 100);
+  EXPECT_EQ(osc[kRmxP].twin, 0);
+  EXPECT_EQ(osc[kStochK].daily, 10);
+  EXPECT_EQ(osc[kStochK].twin, 0);
+  EXPECT_EQ(osc[kVtyD].daily, 3);
+  osc[kRmxA].twin = 33;
+  FillOscDefaults(osc, Period::kMonthly);
+  EXPECT_EQ(osc[kRmxP].twin, 50);
+  EXPECT_EQ(osc[kRmxA].twin, 33) << "what is not zero stays";
+  EXPECT_EQ(osc[kMd3].twin, 9);
 }
 
 TEST_F(SettingsRules, AMissingCompareFileIsToldWithTheTextOfTheBox) {
@@ -192,14 +197,12 @@ class ChartDefaultsRules : public SettingsRules {
     typed = DefaultsFromSettings(settings);
     typed.CompFile = kCompareFile;
   }
-  DefaultsSaved Save() {
-    return SaveChartDefaults(ini, home.files(), dialogs, typed, settings);
-  }
+  DefaultsSaved Save() { return SaveChartDefaults(ini, home.files(), dialogs, typed, settings); }
   ChartDefaults typed;
 };
 
 TEST_F(ChartDefaultsRules, EveryKeyIsWritten) {
-  for (size_t i = 0; i < 22; ++i)
+  for (size_t i = 0; i < OscKeys().size(); ++i)
     typed.periods[i] = {std::to_string(100 + i), std::to_string(200 + i)};
   typed.average1 = {"1", "2"};
   typed.average2 = {"3", "4"};
@@ -207,12 +210,12 @@ TEST_F(ChartDefaultsRules, EveryKeyIsWritten) {
   typed.ScMethod = false;
   ASSERT_EQ(Save(), DefaultsSaved::kAll);
   EXPECT_TRUE(dialogs.said.empty());
-  for (size_t i = 0; i < 22; ++i) {
+  for (size_t i = 0; i < OscKeys().size(); ++i) {
     const OscKey& key = OscKeys()[i];
     EXPECT_EQ(Osc(key.daily), std::to_string(100 + i));
     EXPECT_EQ(Osc(key.twin), std::to_string(200 + i));
-    EXPECT_EQ((settings.osc.*key.value).daily, int(100 + i));
-    EXPECT_EQ((settings.osc.*key.value).twin, int(200 + i));
+    EXPECT_EQ((settings.osc[key]).daily, int(100 + i));
+    EXPECT_EQ((settings.osc[key]).twin, int(200 + i));
   }
   EXPECT_EQ(Osc("CompFile"), kCompareFile);
   const std::pair<const char*, const char*> osc_[] = {
@@ -220,7 +223,7 @@ TEST_F(ChartDefaultsRules, EveryKeyIsWritten) {
       {"ShowOsc", "True"}, {"FillIn", "False"}, {"RFAve", "True"}};
   for (const auto& [key, value] : osc_) EXPECT_EQ(Osc(key), value) << key;
   const std::pair<const char*, const char*> charts[] = {
-      {"Av1D", "1"},     {"Av1W", "2"},      {"Av2D", "3"},     {"Av2W", "4"},
+      {"Av1D", "1"},     {"Av1W", "2"},      {"Av2D", "3"},      {"Av2W", "4"},
       {"AvOne", "True"}, {"AvTwo", "False"}, {"AvCalc", "True"}, {"ScMethod", "False"}};
   for (const auto& [key, value] : charts) EXPECT_EQ(Chart(key), value) << key;
   EXPECT_EQ(settings.charts.Av2D, 3);
@@ -258,7 +261,7 @@ TEST_F(ChartDefaultsRules, SaveStopsAtTheCompareFileAndKeepsWhatStandsBefore) {
   EXPECT_EQ(Osc("VtyD"), "0") << "the last of the periods";
   EXPECT_EQ(Osc("BCCalTp"), "unknown");
   EXPECT_EQ(Chart("Av1D"), "unknown");
-  EXPECT_EQ(settings.osc.StochK.daily, 33);
+  EXPECT_EQ(settings.osc[kStochK].daily, 33);
   EXPECT_FALSE(settings.osc.BCCalTp);
 }
 

@@ -20,8 +20,8 @@ namespace {
 struct Stochastic : OscFixture {
   Stochastic(std::int16_t K, std::int16_t D, const std::string& code = "STO") {
     host.OscCode = code;
-    settings.osc.StochK.daily = settings.osc.FXF.daily = K;
-    settings.osc.StochD.daily = settings.osc.FXX.daily = D;
+    settings.osc[kStochK].daily = settings.osc[kFXF].daily = K;
+    settings.osc[kStochD].daily = settings.osc[kFXX].daily = D;
   }
   // The lines of the data: those behind the guides.
   Texts Data(char letter) const {
@@ -276,7 +276,7 @@ TEST(FxTest, StochasticIsNeverReversed) {
 TEST(FxTest, OverRocItDrawsItsLinesAloneInColoursOfItsOwn) {
   Stochastic f(2, 2, "R/F");
   f.settings.osc.RFAve = true;
-  f.chart.OscPanel = -1;
+  f.host.SecondPass = true;
   f.Closes(kCloses);
   ShowStochasticFX(f.host);
   EXPECT_EQ(f.script.text(),
@@ -284,12 +284,11 @@ TEST(FxTest, OverRocItDrawsItsLinesAloneInColoursOfItsOwn) {
             "L,48,330,50,363,47\r\nD,48,330,50,347,48\r\n"
             "L,50,363,52,404,47\r\nD,50,347,52,374,48\r\n");
   EXPECT_EQ(f.panel.ops[0], "text 8.25 332,4 FX Oscillator (F=2 Period  X=2 Period) 27");
-  EXPECT_EQ(f.chart.OscPanel, 0);
 }
 
 TEST(FxTest, OverRocWithoutAveragesOnlyPercentKIsDrawn) {
   Stochastic f(2, 2, "R/F");
-  f.chart.OscPanel = -1;
+  f.host.SecondPass = true;
   f.Closes(kCloses);
   ShowStochasticFX(f.host);
   EXPECT_EQ(f.Lines('L').size(), 2u);
@@ -330,10 +329,10 @@ TEST(StochasticSignalTest, FxHasNoArrows) {
 }
 
 TEST(StochasticTest, WeeklyAndMonthlyChartsShareTheTwinPeriods) {
-  for (const char* period : {"W", "M"}) {
+  for (const Period period : {Period::kWeekly, Period::kMonthly}) {
     Stochastic f(2, 2);
-    f.settings.osc.StochK.twin = 7;
-    f.settings.osc.StochD.twin = 3;
+    f.settings.osc[kStochK].twin = 7;
+    f.settings.osc[kStochD].twin = 3;
     f.request.ChartPeriod = period;
     f.Closes(kCloses);
     ShowStochasticFX(f.host);
@@ -391,8 +390,8 @@ TEST(StochasticTest, ZeroAndNegativeClosesLeaveNoRange) {
 }
 
 TEST(StochasticTest, PriceThatIsNoNumberIsToldWithItsDate) {
-  for (const float bad : {std::numeric_limits<float>::quiet_NaN(),
-                          std::numeric_limits<float>::infinity()}) {
+  for (const float bad :
+       {std::numeric_limits<float>::quiet_NaN(), std::numeric_limits<float>::infinity()}) {
     Stochastic f(2, 2);
     f.Closes({10, 12, 11, 14, bad, 13});
     ShowStochasticFX(f.host);

@@ -51,8 +51,8 @@ TEST(VolatilityTest, TheFirstBarWithoutRangeHasNoValue) {
   const VolatilitySeries s = Volatility(f.chart.Bars, 2);
   EXPECT_EQ(s.rows[0].value, 0);
   EXPECT_EQ(s.rows[1].value, 1);
-  EXPECT_EQ(s.rows[1].average, 0);             // one value so far
-  EXPECT_FLOAT_EQ(s.rows[2].average, 10.5f);   // 1 and 20
+  EXPECT_EQ(s.rows[1].average, 0);            // one value so far
+  EXPECT_FLOAT_EQ(s.rows[2].average, 10.5f);  // 1 and 20
 }
 
 TEST(VolatilityTest, TheAverageEndsAtItsBar) {
@@ -67,7 +67,7 @@ TEST(VolatilityTest, TheAverageEndsAtItsBar) {
 
 TEST(VolatilityTest, BarsStandOnTheBaseAndAveragesMayLeaveThePanel) {
   OscFixture f;
-  f.settings.osc.VtyD.daily = 2;
+  f.settings.osc[kVtyD].daily = 2;
   SetBars(f, kFour);
   ShowVolatility(f.host);
   // 10% to 118 units from 131 up: 20 lies on the base, 30 at 13; 1 would lie below: no bar.
@@ -85,13 +85,13 @@ TEST(VolatilityTest, BarsStandOnTheBaseAndAveragesMayLeaveThePanel) {
 
 TEST(VolatilityTest, GuidesArePlacesOnThePanelAndNoValues) {
   OscFixture f;
-  f.settings.osc.VtyD.daily = 3;
+  f.settings.osc[kVtyD].daily = 3;
   SetBars(f, kFour);
   ShowVolatility(f.host);
   // 36.6, 107.4 and 72, though the values run from 20 to 30.
-  EXPECT_EQ(f.Lines('T'), (std::vector<std::string>{
-                          "T,8.25,44,313,Volatility (3 Period),27", "T,8.25,15,339,80%,27",
-                          "T,8.25,15,409,20%,27", "T,8.25,15,374,50%,27"}));
+  EXPECT_EQ(f.Lines('T'), (std::vector<std::string>{"T,8.25,44,313,Volatility (3 Period),27",
+                                                    "T,8.25,15,339,80%,27", "T,8.25,15,409,20%,27",
+                                                    "T,8.25,15,374,50%,27"}));
   const auto guides = Drawn(f, 'L', 16);
   ASSERT_EQ(guides.size(), 3u);
   EXPECT_SEGMENT(guides[0], 42, 37, 630, 37);
@@ -101,7 +101,7 @@ TEST(VolatilityTest, GuidesArePlacesOnThePanelAndNoValues) {
 
 TEST(VolatilityTest, ASecurityWithoutAnyRangeStandsAtHalfHeight) {
   OscFixture f;
-  f.settings.osc.VtyD.daily = 3;
+  f.settings.osc[kVtyD].daily = 3;
   f.Closes({5, 5, 6});
   ShowVolatility(f.host);
   // Nothing joined the range, which stays 100000 down to -100000: 131 - 99999 * 118 / 200000.
@@ -112,7 +112,7 @@ TEST(VolatilityTest, ASecurityWithoutAnyRangeStandsAtHalfHeight) {
 
 TEST(VolatilityTest, OneValueThroughoutLeavesTheFrame) {
   OscFixture f;
-  f.settings.osc.VtyD.daily = 1;
+  f.settings.osc[kVtyD].daily = 1;
   SetBars(f, {{11, 9, 10}, {11, 9, 10}, {11, 9, 10}});
   ShowVolatility(f.host);
   EXPECT_EQ(f.Lines('B').size(), 1u);

@@ -20,7 +20,7 @@ namespace {
 struct Williams : OscFixture {
   explicit Williams(std::int16_t P) {
     host.OscCode = "WMS";
-    settings.osc.WmsA.daily = P;
+    settings.osc[kWmsA].daily = P;
   }
   // Bars with a high of 20 and a low of 10.
   void Between(const std::vector<float>& closes) {
@@ -139,8 +139,8 @@ TEST(WilliamsTest, FailingStepKeepsTheLastStateAndShowsNoMessage) {
   ShowWilliams(f.host);
   EXPECT_TRUE(f.dialogs.said.empty());
   // y stays 131 behind bar 6: means (72 + 131 + 131) / 3 = 111.3, 131, 131.
-  EXPECT_EQ(f.Lines('H'), (Texts{"H,52,360,54,380,45", "H,54,380,56,419,45",
-                                 "H,56,419,58,439,45", "H,58,439,60,439,45"}));
+  EXPECT_EQ(f.Lines('H'), (Texts{"H,52,360,54,380,45", "H,54,380,56,419,45", "H,56,419,58,439,45",
+                                 "H,58,439,60,439,45"}));
 }
 
 TEST(WilliamsTest, PeriodOfZeroDrawsAndWritesNothing) {
@@ -168,8 +168,8 @@ TEST(WilliamsTest, OddPeriodsAndFewBarsLeaveFrameAndGuides) {
 
 TEST(WilliamsTest, WeeklyAndMonthlyChartsShareTheTwinPeriod) {
   Williams f(1);
-  f.settings.osc.WmsA.twin = 9;
-  f.request.ChartPeriod = "M";
+  f.settings.osc[kWmsA].twin = 9;
+  f.request.ChartPeriod = Period::kMonthly;
   f.Between({15, 20});
   ShowWilliams(f.host);
   EXPECT_EQ(f.Lines('T')[0], "T,8.25,44,313,Williams %R Oscillator (9 Period),27");

@@ -9,6 +9,7 @@
 
 #include "store/name_rec.h"
 #include "store/price_rec.h"
+#include "tests/support/places.h"
 #include "tests/support/program.h"
 #include "tests/support/temp_home.h"
 
@@ -32,7 +33,7 @@ class KoractlTest : public ::testing::Test {
  protected:
   ProgramResult Run(Words words, const Words& environment = {}) {
     words.insert(words.begin(), {"--home", home.path() + "/kora"});
-    return RunProgram(KORA_BIN_DIR "/koractl", words, environment);
+    return RunProgram(BinDir() + "/koractl", words, environment);
   }
   // Runs, expects that exit code, and gives standard output.
   std::string Out(const Words& words, int code = 0) {
@@ -134,7 +135,7 @@ TEST_F(KoractlTest, InitKeepsTheNameFileOfAHomeWithoutSettings) {
 
 TEST_F(KoractlTest, TheVariableNamesTheHomeAndTheOptionHoldsBeforeIt) {
   const std::string other = "KORA_HOME=" + home.path() + "/other";
-  EXPECT_EQ(RunProgram(KORA_BIN_DIR "/koractl", {"init"}, {other}).code, 0);
+  EXPECT_EQ(RunProgram(BinDir() + "/koractl", {"init"}, {other}).code, 0);
   EXPECT_TRUE(home.Exists("other/Kora.ini"));
   EXPECT_EQ(Run({"init"}, {other}).code, 0);
   EXPECT_TRUE(home.Exists("kora/Kora.ini"));
@@ -234,8 +235,9 @@ TEST_F(KoractlTest, BarsOfDaysWeeksAndMonths) {
                 "0\t20240109\t1\t6\t1\t4.05\t10\t0\n"
                 "# BarCount=0 FirstDataRec=1 LastDataRec=4 ChartHigh=6 ChartLow=1 VolMax=30 "
                 "VolMin=1 VolAvg=30 VolumeShown=True\n");
-  EXPECT_NE(Out({"bars", "ABC", "--volume", "off"}).find("VolMax=0 VolMin=0 VolAvg=0 "
-                                                         "VolumeShown=False"),
+  EXPECT_NE(Out({"bars", "ABC", "--volume", "off"})
+                .find("VolMax=0 VolMin=0 VolAvg=0 "
+                      "VolumeShown=False"),
             std::string::npos);
   ExpectAbandoned({"bars", "ABC", "--first", "0"}, "There are no records 0 to 4 in ABC.WDT");
   ExpectAbandoned({"bars", "ABC", "--last", "5"}, "There are no records 1 to 5 in ABC.WDT");
@@ -250,8 +252,7 @@ TEST_F(KoractlTest, ScaleOfPricesAndOfAManualRange) {
   // 1500 x 1.02 is 153 tens, 1200 x 0.99 is 119 tens; then outward to hundreds.
   const std::string header = "ScaleLow\tScaleHigh\tGridStep\tGridCount\n";
   // A range of 500 takes its tenth as the step.
-  EXPECT_EQ(Out({"scale", "--high", "1500", "--low", "1200"}),
-            header + "1100\t1600\t50\t10\n");
+  EXPECT_EQ(Out({"scale", "--high", "1500", "--low", "1200"}), header + "1100\t1600\t50\t10\n");
   EXPECT_EQ(Out({"scale", "--high", "10", "--low", "5", "--base", "3", "--top", "12"}),
             header + "3\t12\t0.5\t18\n");
   EXPECT_EQ(Run({"scale", "--high", "-5", "--low", "-20"}).code, 0);
@@ -338,8 +339,8 @@ TEST_F(KoractlTest, ChartOptionsThatMakeNoSense) {
   const std::string out = home.path() + "/c.png";
   for (const char* name : {"c.gif", "c", ".png", "", "c.png.txt"})
     ExpectUsage({"chart", "ABC", "--out", name}, "--out");
-  for (const char* size : {"99x100", "100x99", "10001x100", "638", "638x", "x452", "638x452x", "axb",
-                           "1e3x452", "-638x452", "99999999999x452"})
+  for (const char* size : {"99x100", "100x99", "10001x100", "638", "638x", "x452", "638x452x",
+                           "axb", "1e3x452", "-638x452", "99999999999x452"})
     ExpectUsage({"chart", "ABC", "--out", out, "--size", size}, "--size");
   ExpectUsage({"chart", "ABC", "--out", out, "--size", "10000x10000", "--scale", "2"}, "--scale");
   ExpectUsage({"chart", "ABC", "--out", out, "--spacing", "0"}, "--spacing");
@@ -367,10 +368,56 @@ TEST_F(KoractlTest, OscillatorsHaveTheirPanelBelowThePrices) {
   EXPECT_EQ(home.Get("o.png").substr(20, 4), std::string("\0\0\x02\x8c", 4));  // 452 + 200
 }
 
+TEST_F(KoractlTest, AViewOfSeveralOscillatorsStacksTheirPanelsBelowThePrices) {
+  MakeHome();
+  // Two panels share 452 units, a frame of 226 each: the first where the price picture ends, the
+  // second 3 below the frame of the first.
+  const std::string script =
+      Out({"multi", "abc", "--out", "-", "--oscs", "rsi,None,Momentum", "--size", "638x452"});
+  EXPECT_NE(script.find("\r\nB,42,457,631,673,"), std::string::npos);
+  EXPECT_NE(script.find("\r\nB,42,681,631,897,"), std::string::npos);
+  EXPECT_LT(script.find("Relative Strength"), script.find("Momentum Oscillator"));
+  const std::string out = home.path() + "/v.png";
+  EXPECT_EQ(Out({"multi", "ABC", "--out", out, "--oscs", "RSI", "--size", "638x452"}), "");
+  EXPECT_EQ(home.Get("v.png").substr(20, 4), std::string("\0\0\x03\x88", 4));  // twice 452
+}
+
+TEST_F(KoractlTest, ASetOfOscillatorsIsKeptAndShown) {
+  MakeHome();
+  const std::string none = "\tNone\n";
+  EXPECT_EQ(Out({"multi", "sets"}), "Set\tSlot\tName\n1\t1" + none + "1\t2" + none + "1\t3" + none +
+                                        "1\t4" + none + "2\t1" + none + "2\t2" + none + "2\t3" +
+                                        none + "2\t4" + none);
+  ExpectAbandoned({"multi", "ABC", "--set", "2", "--out", "-"}, "No oscillators have been set");
+  EXPECT_EQ(Out({"multi", "sets", "--set", "2", "--oscs", " macd ,,RSI"}), "");
+  const std::string sets = Out({"multi", "sets"});
+  EXPECT_NE(sets.find("1\t1\tNone\n"), std::string::npos);
+  EXPECT_NE(sets.find("2\t1\tMACD\n2\t2\tNone\n2\t3\tRSI\n2\t4\tNone\n"), std::string::npos);
+  EXPECT_EQ(
+      Out({"--set", "Charts.Grid=False", "multi", "ABC", "--set", "2", "--out", "-"}),
+      Out({"--set", "Charts.Grid=False", "multi", "ABC", "--oscs", "MACD,RSI", "--out", "-"}));
+}
+
+TEST_F(KoractlTest, AViewThatMakesNoSenseIsRefused) {
+  MakeHome();
+  ExpectUsage({"multi", "ABC", "--out", "-"}, "--oscs");
+  ExpectUsage({"multi", "ABC", "--out", "-", "--set", "1", "--oscs", "RSI"}, "--oscs");
+  ExpectUsage({"multi", "ABC", "--out", "-", "--oscs", "RSI,RMO"}, "\"RMO\" is none of");
+  ExpectUsage({"multi", "ABC", "--out", "-", "--oscs", "RSI,RSI,RSI,RSI,RSI"}, "at most 4");
+  ExpectUsage({"multi", "ABC", "--out", "-", "--set", "3"}, "--set");
+  ExpectUsage({"multi", "ABC", "--oscs", "RSI"}, "--out");
+  ExpectUsage({"multi", "ABC", "--out", "-", "--oscs", "RSI", "--style", "P"}, "--style P");
+  ExpectUsage({"multi", "ABC", "--out", "-", "--oscs", "RSI", "--osc", "FX"}, "--oscs");
+  ExpectUsage({"multi", "sets", "--set", "1"}, "--oscs");
+  ExpectUsage({"multi", "sets", "--oscs", "RSI"}, "--set");
+  ExpectAbandoned({"multi", "NIX", "--out", "-", "--oscs", "RSI"}, kNoFile);
+}
+
 TEST_F(KoractlTest, RmoIsForDailyChartsAndNeedsItsCompareFile) {
   MakeHome();
-  ExpectAbandoned({"chart", "ABC", "--out", home.path() + "/r.png", "--osc", "RMO", "--period", "W"},
-                  "[RMO] RMO only available on Daily Charts");
+  ExpectAbandoned(
+      {"chart", "ABC", "--out", home.path() + "/r.png", "--osc", "RMO", "--period", "W"},
+      "[RMO] RMO only available on Daily Charts");
   ExpectAbandoned({"chart", "ABC", "--out", home.path() + "/r.png", "--osc", "RMO"},
                   "[RMX/RMO Compare file] RMX/RMO Compare file path/file details are invalid.");
 }
@@ -395,18 +442,78 @@ std::string Drawing(const std::string& pdf) {
   const size_t from = pdf.find("stream", page == pdf.npos ? 0 : page);
   return from == pdf.npos ? "" : pdf.substr(from, pdf.find("endstream", from) - from);
 }
+// ---- The marks of the mouse
+
+class MarksCommandTest : public KoractlTest {
+ protected:
+  void SetUp() override {
+    ASSERT_EQ(Run({"demo", "--securities", "8", "--years", "2", "--seed", "7"}).code, 0);
+    const std::string names = Out({"names"});
+    // Code of the first share.
+    const size_t row = names.find('\n') + 1;
+    const size_t start = names.find('\t', names.find('\t', row) + 1) + 1;
+    code = names.substr(start, names.find('\t', start) - start);
+  }
+  std::string code;
+};
+
+TEST_F(MarksCommandTest, LinesAreDrawnShownDeletedAndCompacted) {
+  const Words lines{"lines", code};
+  const std::string header = "Rec\tSpacing\tPeriod\tStartDate\tStartPrice\tEndDate\tEndPrice\n";
+  EXPECT_EQ(Out(lines), header);
+  Out({"lines", code, "add", "--at", "100,200,300,150"});
+  Out({"lines", code, "add", "--at", "300,100,625,90"});
+  const std::string two = Out(lines);
+  EXPECT_EQ(std::count(two.begin(), two.end(), '\n'), 3);
+  EXPECT_NE(two.find("1\t3\tA\t"), std::string::npos);
+  EXPECT_NE(two.find("\tX16"), std::string::npos) << two;
+  EXPECT_NE(Out({"chart", code, "--out", "-"}).find("H,101,"), std::string::npos);
+  Out({"lines", code, "delete", "1"});
+  EXPECT_NE(Out(lines).find("1\t0\t\t\t0\t\t0\n"), std::string::npos);
+  Out({"lines", code, "compact"});
+  const std::string one = Out(lines);
+  EXPECT_EQ(std::count(one.begin(), one.end(), '\n'), 2);
+  ExpectAbandoned({"lines", code, "delete", "9"}, "[Trendline] Bad record number");
+  ExpectUsage({"lines", code, "add", "--at", "1,2,3"}, "--at");
+  ExpectUsage({"lines", code, "delete"}, "delete N");
+  Out({"lines", code, "clear"});
+  EXPECT_EQ(Out(lines), header);
+}
+
+TEST_F(MarksCommandTest, TextsLevelsAndAZoomFromAShell) {
+  EXPECT_EQ(Out({"notes", code}), "Date\tPrice\tText\tColour\n");
+  Out({"notes", code, "add", "--at", "200,120", "Bought, here"});
+  EXPECT_NE(Out({"notes", code}).find("\tBought here\t"), std::string::npos);
+  EXPECT_NE(Out({"chart", code, "--out", "-"}).find(",Bought here,"), std::string::npos);
+  ExpectUsage({"notes", code, "add", "--at", "200,120"}, "TEXT");
+  Out({"notes", code, "delete", "1"});
+  EXPECT_EQ(Out({"notes", code}), "Date\tPrice\tText\tColour\n");
+  const ProgramResult fib = Run({"chart", code, "--fib", "150,350,300,150", "--out", "-"});
+  EXPECT_EQ(fib.code, 0);
+  EXPECT_NE(fib.err.find("Start  "), std::string::npos) << fib.err;
+  EXPECT_NE(fib.err.find("62%    "), std::string::npos) << fib.err;
+  EXPECT_EQ(fib.out.substr(fib.out.rfind("\nD,") + 1, 6), "D,300,");
+  ExpectUsage({"zoom", code, "--box", "100,100,100,300", "--out", "a.png"}, "--box");
+  const std::string file = home.path() + "/zoom.svg";
+  Out({"zoom", code, "--box", "100,290,180,380", "--out", file});
+  EXPECT_NE(home.Get("zoom.svg").find("<svg"), std::string::npos);
+}
+
 }  // namespace
 
 TEST_F(KoractlTest, PrintMakesAPdfOfOnePage) {
   MakeHome();
   const std::string out = home.path() + "/a.pdf";
   EXPECT_EQ(Out({"print", "abc", "--out", out}), "");
-  const std::string upright = home.Get("a.pdf");
-  EXPECT_EQ(upright.substr(0, 5), "%PDF-");
-  EXPECT_NE(upright.find("/MediaBox [0 0 595"), std::string::npos);
-  EXPECT_NE(upright.find("/Count 1"), std::string::npos);
-  EXPECT_EQ(Out({"print", "ABC", "--set", "ChtPage.Orient=2", "--osc", "MACD", "--out", out}), "");
-  EXPECT_NE(home.Get("a.pdf").find("/MediaBox [0 0 842"), std::string::npos);
+  // A chart that is wider than high lies on its better side, unless the page was turned.
+  const std::string lying = home.Get("a.pdf");
+  EXPECT_EQ(lying.substr(0, 5), "%PDF-");
+  EXPECT_NE(lying.find("/MediaBox [0 0 842"), std::string::npos);
+  EXPECT_NE(lying.find("/Count 1"), std::string::npos);
+  EXPECT_EQ(Out({"print", "ABC", "--set", "ChtPage.Orient=1", "--osc", "MACD", "--out", out}), "");
+  EXPECT_NE(home.Get("a.pdf").find("/MediaBox [0 0 595"), std::string::npos);
+  EXPECT_EQ(Out({"print", "ABC", "--set", "Charts.FitSide=False", "--out", out}), "");
+  EXPECT_NE(home.Get("a.pdf").find("/MediaBox [0 0 595"), std::string::npos);
   EXPECT_FALSE(home.Exists("kora/" + kHostData + "TCht.Tmp"));
 }
 
@@ -446,7 +553,8 @@ TEST_F(KoractlTest, PrintFollowsThePrintersSettings) {
   };
   const std::string plain = print({});
   EXPECT_EQ(print({}), plain);
-  for (const char* setting : {"Charts.Line Width=9", "Charts.EFact=0.8", "Chart Fonts.CFontSize=20"})
+  for (const char* setting :
+       {"Charts.Line Width=9", "Charts.EFact=0.8", "Chart Fonts.CFontSize=20"})
     EXPECT_NE(print({"--set", setting}), plain) << setting;
   EXPECT_NE(print({"--switch", "N"}), plain);
   home.Put("kora/drive_c/korawin/koraprn.dat", std::string("\1\0\0\0", 4));
@@ -474,14 +582,74 @@ TEST_F(KoractlTest, AChartThatCannotBePrintedLeavesTheOldFile) {
   ExpectUsage({"print", "ABC"}, "--out");
 }
 
-TEST_F(KoractlTest, WhatCannotBeChartedYetIsRefused) {
+TEST_F(KoractlTest, OptionsWithoutAPlaceOnTheChartAreRefused) {
   MakeHome();
   for (const Words& more :
-       {Words{"--style", "P"}, Words{"--swing", "NORM:5"}, Words{"--box", "0.5"}}) {
-    Words words{"chart", "ABC", "--out", home.path() + "/c.png"};
+       {Words{"--box", "0.5"}, Words{"--style", "C", "--swing", "NORM"}, Words{"--swing", "NORM:5"},
+        Words{"--swing", "XPointAuto:5"}, Words{"--swing", "Up"}, Words{"--swing", ":3"},
+        Words{"--osc", "RSI", "--style", "P"}}) {
+    Words words{"chart", "ABC", "--out", "-"};
     words.insert(words.end(), more.begin(), more.end());
     ExpectUsage(words, more[0]);
   }
+}
+
+TEST_F(KoractlTest, PointAndFigureTakesReversalAndBoxValue) {
+  MakeHome();
+  std::string data;
+  for (const float c : {10.0f, 13.0f, 11.0f, 14.0f}) {
+    PriceRec rec = NewPriceRec("2024030" + std::to_string(1 + data.size() / sizeof rec));
+    rec.Open = rec.High = rec.Low = rec.Close = c;
+    data.append(reinterpret_cast<const char*>(&rec), sizeof rec);
+  }
+  PutData("ABC.WDT", data);
+  const auto script = [&](const Words& more) {
+    Words words{"chart", "ABC", "--style", "P", "--out", "-"};
+    words.insert(words.end(), more.begin(), more.end());
+    return Out(words);
+  };
+  // Two boxes back are a column of their own with a reversal of 2, and none with 3.
+  EXPECT_NE(script({"--box", "1", "--spacing", "2"}).find("\r\nX,53,"), std::string::npos);
+  EXPECT_EQ(script({"--box", "1", "--spacing", "3"}).find("\r\nX,"), std::string::npos);
+  EXPECT_NE(script({"--box", "1"}).find(",Box Value = 1,"), std::string::npos);
+  EXPECT_EQ(script({"--box", "1", "--spacing", "0"}), script({"--box", "1", "--spacing", "40"}));
+  EXPECT_NE(script({}).find(",Box Value = 0.0"), std::string::npos);
+  EXPECT_NE(script({"--box", "-1", "--size", "638x300"}).find(",Box Value = 0.003,"),
+            std::string::npos);
+  const Words words{"chart", "ABC", "--style", "P", "--out", "-", "--box"};
+  const auto with = [&](const char* box) {
+    Words all = words;
+    all.push_back(box);
+    return all;
+  };
+  ExpectAbandoned(with("0"), "[Box Value] Box value must have a value. eg 0.20");
+  ExpectAbandoned(with("x"), "[Box Value] Box value must be numeric eg 0.20");
+}
+
+TEST_F(KoractlTest, SwingTakesItsKindAndSize) {
+  MakeHome();
+  std::string data;
+  for (int i = 0; i < 30; ++i) {
+    PriceRec rec = NewPriceRec("202403" + std::to_string(i / 9 + 1) + std::to_string(i % 9 + 1));
+    rec.Open = rec.Low = rec.Close = 10 + float(i % 7) * 0.2f;
+    rec.High = rec.Low + 0.3f;
+    data.append(reinterpret_cast<const char*>(&rec), sizeof rec);
+  }
+  PutData("ABC.WDT", data);
+  const auto title = [&](const char* swing) {
+    const std::string script = Out({"chart", "ABC", "--swing", swing, "--out", "-"});
+    const size_t at = script.find("Daily Swing");
+    return at == std::string::npos ? "" : script.substr(at, script.find(',', at) - at);
+  };
+  EXPECT_EQ(title("NORM"), "Daily Swing  -  Standard");
+  EXPECT_EQ(title("xday:4"), "Daily Swing 4 - DAY");
+  EXPECT_EQ(title("XDay"), "Daily Swing 3 - DAY");
+  EXPECT_EQ(title("XPoint:9.5"), "Daily Swing 9.5 - POINT");
+  EXPECT_EQ(title("XPoint"), "Daily Swing 9 - POINT");
+  EXPECT_NE(title("XPointAuto").find(" - Point(Auto)"), std::string::npos);
+  for (const char* bad : {"XDay:", "XDay:0", "XDay:0.5", "XPoint:-3", "XPoint:nine", "XDay:3x"})
+    ExpectAbandoned({"chart", "ABC", "--swing", bad, "--out", "-"},
+                    "[Swing] Incorrect values entered");
 }
 
 TEST_F(KoractlTest, AChartThatFailsLeavesTheOldPicture) {
@@ -498,15 +666,12 @@ TEST_F(KoractlTest, AChartThatFailsLeavesTheOldPicture) {
   ExpectAbandoned(words, "[Chart Display] There is a problem with ABC.WDT Cannot find or open");
   std::filesystem::remove(home.path() + "/kora/" + kHostData + "ABC.WDT");
   PutData("ABC.WDT", Repeat(std::string(50, '\xFF'), 3));  // NaN prices, dates of no digits
-  // No price counts, which leaves a range that no grid step fits; a week needs a weekday.
-  const std::pair<const char*, const char*> messages[] = {
-      {"A", "[Chart Display] There is an unexpected error No. 11\nDivision by zero"},
-      {"W", "[Chart Display] There is a problem with the data for ABC.WDT"},
-      {"M", "[Chart Display] There is an unexpected error No. 11\nDivision by zero"}};
-  for (const auto& [period, message] : messages) {
+  // No price counts, which leaves a range far below nothing: more steps of the grid than 16 bits
+  // number. A week needs a weekday.
+  for (const char* period : {"A", "W", "M"}) {
     Words by = words;
     by.insert(by.end(), {"--period", period});
-    ExpectAbandoned(by, message);
+    ExpectAbandoned(by, "[Chart Display] There is a problem with the data for ABC.WDT");
   }
 }
 
@@ -582,6 +747,67 @@ TEST_F(KoractlTest, ASettingsFileOfRubbishAsksWhereTheSystemIs) {
   EXPECT_NE(Out({"names"}).find("Abcot Mining"), std::string::npos);
 }
 
+TEST_F(KoractlTest, ASettingsFileThatCantBeReadEndsEveryCommand) {
+  MakeHome();
+  home.Put("kora/Kora.ini", std::string(5u << 20, 'x'));
+  home.Put("x.csv", "ABC,20240104,1,3,1,2,100,0\n");
+  for (const Words& words :
+       {Words{"init"}, Words{"names"}, Words{"find", "ABC"}, Words{"prices", "ABC"},
+        Words{"bars", "ABC"}, Words{"chart", "ABC", "--out", "-"},
+        Words{"import", home.path() + "/x.csv"}, Words{"scale", "--high", "2", "--low", "1"},
+        Words{"downloads"}, Words{"update"}, Words{"master", home.path() + "/x.csv"},
+        Words{"play", "x.cht", "--out", home.path() + "/x.png"},
+        Words{"print", "ABC", "--out", home.path() + "/x.pdf"}})
+    ExpectAbandoned(
+        words, "[KORA] Kora.ini in " + home.path() + "/kora can't be read: The file is too large");
+  ExpectAbandoned({"demo"}, "already");
+}
+
+TEST_F(KoractlTest, AWorkingFolderThatIsGoneIsTold) {
+  MakeHome();
+  const std::string program = BinDir() + "/koractl --home " + home.path() + "/kora ";
+  for (const std::string command : {"play a.cht --out a.png", "print a.cht --out a.pdf"}) {
+    const ProgramResult result =
+        RunProgram("/bin/sh", {"-c", "mkdir " + home.path() + "/gone && cd " + home.path() +
+                                         "/gone && rmdir " + home.path() + "/gone && exec " +
+                                         program + command});
+    EXPECT_EQ(result.code, 1) << command;
+    EXPECT_EQ(result.err, "[KORA] a.cht: the working folder is gone\n");
+  }
+  // What is named from the root needs none.
+  ASSERT_EQ(Run({"chart", "ABC", "--out", home.path() + "/a.cht"}).code, 0);
+  const ProgramResult result = RunProgram(
+      "/bin/sh", {"-c", "mkdir " + home.path() + "/gone && cd " + home.path() + "/gone && rmdir " +
+                            home.path() + "/gone && exec " + program + "play " + home.path() +
+                            "/a.cht --out " + home.path() + "/a.png"});
+  EXPECT_EQ(result.code, 0) << result.err;
+}
+
+TEST_F(KoractlTest, AnEmptyNameIsNoFileAndNoHome) {
+  MakeHome();
+  ExpectUsage({"play", "", "--out", home.path() + "/a.png"}, "An empty name is no file");
+  const ProgramResult nowhere = RunProgram(BinDir() + "/koractl", {"--home", "", "names"});
+  EXPECT_EQ(nowhere.code, 2);
+  EXPECT_NE(nowhere.err.find("--home: an empty name is no folder"), std::string::npos);
+  ExpectAbandoned({"print", "", "--out", home.path() + "/a.pdf"}, kNoFile);
+}
+
+TEST_F(KoractlTest, AnOverrideThatASettingCantHoldIsRefused) {
+  MakeHome();
+  ExpectUsage({"names", "--set", "KoraPaths.ChtData=c:\\" + std::string(60, 'x')},
+              "is longer than 60 characters");
+  ExpectUsage({"names", "--set", "OscDef.CompFile=\u4E2D"}, "has characters that the settings");
+}
+
+TEST_F(KoractlTest, InitThatCantWriteFailsAndLeavesNoSettings) {
+  // A limit on the size of files stands for a full disk.
+  const ProgramResult result = RunProgram(
+      "/bin/sh", {"-c", "ulimit -f 0; trap '' XFSZ; exec " + BinDir() + "/koractl --home " +
+                            home.path() + "/kora init 2>" + "/dev/null"});
+  EXPECT_EQ(result.code, 1);
+  EXPECT_FALSE(home.Exists("kora/Kora.ini"));
+}
+
 TEST_F(KoractlTest, OverridesHoldForOneRun) {
   MakeHome();
   const std::string ini = home.Get("kora/Kora.ini");
@@ -603,8 +829,10 @@ TEST_F(KoractlTest, AnOverrideIsNotWrittenWhereTheFoldersAreSaved) {
   ini.replace(at, std::string("System=c:\\korawin\\").size(), "System=");
   home.Put("kora/Kora.ini", ini);
   // The program folder is looked for, and all folders are saved.
-  EXPECT_EQ(Run({"--set", "Download.DataService=3", "--set", "Download.DLPath=z:\\away", "find",
-                 "ABC"}).code, 0);
+  EXPECT_EQ(
+      Run({"--set", "Download.DataService=3", "--set", "Download.DLPath=z:\\away", "find", "ABC"})
+          .code,
+      0);
   const std::string after = home.Get("kora/Kora.ini");
   EXPECT_NE(after.find("System=C:\\korawin\\"), std::string::npos) << after;
   EXPECT_NE(after.find("DataService=4"), std::string::npos) << after;
@@ -637,8 +865,8 @@ TEST_F(KoractlTest, ImportTellsWhatItTookAndWhatNot) {
   EXPECT_EQ(Out({"import", "--skip-bad", home.path() + "/bad.csv"}),
             "1 securities, 1 rows added, 0 replaced, 1 refused\n");
   home.Put("eu.csv", "Date;Close\n1/2/2024;1\n");
-  EXPECT_EQ(Out({"import", home.path() + "/eu.csv", "--dates", "D/M/YYYY", "--code", "xx",
-                 "--type", "5", "--name", "Europe"}),
+  EXPECT_EQ(Out({"import", home.path() + "/eu.csv", "--dates", "D/M/YYYY", "--code", "xx", "--type",
+                 "5", "--name", "Europe"}),
             "1 securities, 1 rows added, 0 replaced, 0 refused\n");
   EXPECT_NE(Out({"prices", "XX"}).find("20240201"), std::string::npos);
   EXPECT_NE(Out({"names"}).find("XX\t5\tEurope"), std::string::npos);
@@ -659,11 +887,11 @@ TEST_F(KoractlTest, ImportOptionsThatMakeNoSense) {
 
 // Real prices, compared by a reading of their own: every field of every row as text.
 TEST_F(KoractlTest, RealPricesComeBackAsTheyWere) {
-  if (!std::filesystem::is_directory(KORA_DATA_DIR)) GTEST_SKIP() << "no real prices here";
+  if (!std::filesystem::is_directory(DataDir())) GTEST_SKIP() << "no real prices here";
   ASSERT_EQ(Run({"init"}).code, 0);
   Words words{"import"};
   std::vector<std::filesystem::path> sources;
-  for (const auto& entry : std::filesystem::directory_iterator(KORA_DATA_DIR))
+  for (const auto& entry : std::filesystem::directory_iterator(DataDir()))
     if (entry.path().extension() == ".csv") sources.push_back(entry.path());
   ASSERT_FALSE(sources.empty());
   for (const auto& source : sources) words.push_back(source.string());

@@ -42,9 +42,7 @@ struct ListFixture {
   ListCodes Save(std::int16_t list, const ListCodes& codes) {
     return SaveSubList(home.files(), dataPath, list, codes);
   }
-  std::vector<ListRec> Read(std::int16_t list) {
-    return ReadList(home.files(), dataPath, list);
-  }
+  std::vector<ListRec> Read(std::int16_t list) { return ReadList(home.files(), dataPath, list); }
 };
 
 // A record as it lies in the file.
@@ -140,8 +138,8 @@ TEST(ChartListTest, StaleNumbersStayUntilTheListIsSavedAgain) {
 TEST(ChartListTest, ImpossibleRecordNumbersAreReadAsTheyStandAndMendedBySaving) {
   ListFixture f;
   f.Names({"AAA", "BHP"});
-  f.Put("SubListC.Dat", Record(0, "AAA") + Record(-1, "BHP") + Record(32767, "AAA") +
-                            Record(-32768, "BHP"));
+  f.Put("SubListC.Dat",
+        Record(0, "AAA") + Record(-1, "BHP") + Record(32767, "AAA") + Record(-32768, "BHP"));
   const auto records = f.Read(4);
   ASSERT_EQ(records.size(), 4u);
   EXPECT_EQ(records[0].ListRecNo, 0);
@@ -155,7 +153,9 @@ TEST(ChartListTest, ImpossibleRecordNumbersAreReadAsTheyStandAndMendedBySaving) 
 
 TEST(ChartListTest, TornRecordAtTheEndDoesNotCount) {
   ListFixture f;
-  f.Put("SubListA.Dat", Record(1, "AAA") + "\x02\x01" "BHP  ");
+  f.Put("SubListA.Dat", Record(1, "AAA") +
+                            "\x02\x01"
+                            "BHP  ");
   ASSERT_EQ(f.Read(2).size(), 1u);
   f.Put("SubListA.Dat", "1234567");
   EXPECT_TRUE(f.Read(2).empty());
@@ -213,7 +213,8 @@ TEST(ChartListTest, SaveCutOffAnywhereLeavesTheOldListOrTheNew) {
       break;
     }
     EXPECT_EQ(error, kDiskFull);
-    EXPECT_EQ(f.Get("SubListA.Dat"), before) << at;
+    // The seventh call flushes the folder: on a disk that stays broken the new list stays.
+    EXPECT_EQ(f.Get("SubListA.Dat"), at < 7 ? before : after) << at;
   }
 }
 

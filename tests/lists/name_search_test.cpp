@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "lists/industry_classes.h"
+#include "tests/support/error_of.h"
 #include "tests/support/records.h"
 #include "tests/support/temp_home.h"
 
@@ -20,78 +20,48 @@ class NameSearchTest : public testing::Test {
   void PutNames(const std::vector<NameRec>& names) {
     home.Put("drive_c/korawin/data/Names.dat", test::Bytes(names));
   }
-  NameSearch Search(std::string_view text) {
-    return NameSearch(home.files(), "c:\\korawin\\data\\", text);
+  std::vector<NameMatch> Search(std::string_view text) {
+    return NamesWith(home.files(), "c:\\korawin\\data\\", text);
   }
   test::TempHome home;
 };
 
-TEST_F(NameSearchTest, MatchesComeInFileOrderInTheCaseAsGiven) {
-  PutNames({Named("AAA", "Golden Bank"), Named("BBB", "Big bank"), Named("CCC", "The Bank Group")});
-  NameSearch search = Search("Bank");
-  auto match = search.FindNext();
-  ASSERT_TRUE(match);
-  EXPECT_EQ(match->code, "AAA");
-  EXPECT_EQ(match->name, "Golden Bank");
-  EXPECT_EQ(match->record, 1);
-  match = search.FindNext();
-  ASSERT_TRUE(match);
-  EXPECT_EQ(match->code, "CCC");
-  EXPECT_EQ(match->record, 3);
-  EXPECT_FALSE(search.FindNext());
-  EXPECT_FALSE(search.FindNext());
+TEST_F(NameSearchTest, AllMatchesComeInFileOrderInAnyCase) {
+  PutNames({Named("AAA", "Golden Bank"), Named("BBB", "Big bank"), Named("CCC", "Mines"),
+            Named("DDD", "THE BANK GROUP")});
+  for (const char* text : {"Bank", "bank", "BANK"}) {
+    const auto found = Search(text);
+    ASSERT_EQ(found.size(), 3u) << text;
+    EXPECT_EQ(found[0].code, "AAA");
+    EXPECT_EQ(found[0].name, "Golden Bank");
+    EXPECT_EQ(found[0].record, 1);
+    EXPECT_EQ(found[1].code, "BBB");
+    EXPECT_EQ(found[2].code, "DDD");
+    EXPECT_EQ(found[2].record, 4);
+  }
+  EXPECT_TRUE(Search("nowhere").empty());
 }
 
 TEST_F(NameSearchTest, AccentsAreThoseOfTheFile) {
   PutNames({Named("AAA", "Caf\xE9 Group")});
-  EXPECT_TRUE(Search("Caf\xC3\xA9").FindNext());
+  EXPECT_EQ(Search("caf\xC3\xA9").size(), 1u);
+  EXPECT_TRUE(Search("cafe").empty());
 }
 
 TEST_F(NameSearchTest, AMatchFarDownALongFileIsFound) {
   std::vector<NameRec> names(1500, Named("AAA", "Alpha"));
   names[1024] = Named("ZZZ", "Omega");
   PutNames(names);
-  NameSearch search = Search("Omega");
-  const auto match = search.FindNext();
-  ASSERT_TRUE(match);
-  EXPECT_EQ(match->record, 1025);
-  EXPECT_FALSE(search.FindNext());
+  const auto found = Search("Omega");
+  ASSERT_EQ(found.size(), 1u);
+  EXPECT_EQ(found[0].record, 1025);
 }
 
-TEST_F(NameSearchTest, AFileThatShrinksOrVanishesEndsTheSearch) {
-  PutNames({Named("AAA", "Alpha"), Named("BBB", "Alpha")});
-  NameSearch search = Search("Alpha");
-  search.FindNext();
-  search.FindNext();
-  PutNames({Named("AAA", "Alpha")});
-  EXPECT_FALSE(search.FindNext());
-  home.files().Remove("c:\\korawin\\data\\Names.dat");
-  EXPECT_EQ(test::ErrorOf([&] { search.FindNext(); }), 53);
-}
+TEST_F(NameSearchTest, WithoutANameFileThereIsNoMatch) { EXPECT_TRUE(Search("a").empty()); }
 
-TEST(IndustryClassesTest, ReadsIdAndDescription) {
-  test::TempHome home;
-  home.Put("drive_c/korawin/IndClass.dat", "010,Gold\r\n011, Gold - producers \r\n\r\n,none\n020\n");
-  const auto classes = ReadIndustryClasses(home.files(), "c:\\korawin\\");
-  ASSERT_EQ(classes.size(), 3u);
-  EXPECT_EQ(classes[0].id, "010");
-  EXPECT_EQ(classes[0].description, "Gold");
-  EXPECT_EQ(classes[1].description, "Gold - producers");
-  EXPECT_EQ(classes[2].id, "020");
-  EXPECT_EQ(classes[2].description, "");
-}
-
-TEST(IndustryClassesTest, NoFileIsNoClassAndAHugeOneIsError7) {
-  test::TempHome home;
-  EXPECT_TRUE(ReadIndustryClasses(home.files(), "c:\\korawin\\").empty());
-  home.Put("drive_c/korawin/IndClass.dat", std::string((1u << 20) + 1, 'x'));
-  EXPECT_EQ(test::ErrorOf([&] { ReadIndustryClasses(home.files(), "c:\\korawin\\"); }), 7);
-}
-
-TEST(IndustryClassesTest, BinaryTextIsReadAsItStands) {
-  test::TempHome home;
-  home.Put("drive_c/korawin/IndClass.dat", std::string("\0\xFF,\x81\r\r\n,,,,\n", 11));
-  EXPECT_EQ(ReadIndustryClasses(home.files(), "c:\\korawin\\").size(), 1u);
+TEST_F(NameSearchTest, AFileThatCannotBeReadIsAnError) {
+  home.Put("drive_c/korawin/data/Names.dat/inner", "");
+  EXPECT_NE(test::ErrorOf([&] { Search("a"); }), 0);
 }
 
 }  // namespace

@@ -16,7 +16,7 @@ using kora::test::TempHome;
 namespace {
 
 int Start(const std::string& program, const std::vector<std::string>& arguments = {},
-        const std::function<void()>& idle = {}) {
+          const std::function<void()>& idle = {}) {
   return MachineProcesses().RunAndWait(program, arguments, idle);
 }
 
@@ -32,7 +32,9 @@ TEST(ProcessesTest, ReturnsTheExitCode) {
 TEST(ProcessesTest, ArgumentsArriveAsTheyAre) {
   TempHome home;
   const std::string out = home.path() + "/out";
-  EXPECT_EQ(Start("/bin/sh", {"-c", "printf '%s|' \"$@\" > " + out, "sh", "a b", "", "$HOME", "\"q\""}), 0);
+  EXPECT_EQ(
+      Start("/bin/sh", {"-c", "printf '%s|' \"$@\" > " + out, "sh", "a b", "", "$HOME", "\"q\""}),
+      0);
   EXPECT_EQ(home.Get("out"), "a b||$HOME|\"q\"|");
 }
 
@@ -59,9 +61,9 @@ TEST(ProcessesTest, IdleRunsWhileTheProgramDoes) {
   const std::string flag = home.path() + "/flag";
   int calls = 0;
   EXPECT_EQ(Start("/bin/sh", {"-c", "until [ -e " + flag + " ]; do sleep 0.01; done; exit 3"},
-                [&] {
-                  if (++calls == 2) home.Put("flag", "");
-                }),
+                  [&] {
+                    if (++calls == 2) home.Put("flag", "");
+                  }),
             3);
   EXPECT_GE(calls, 2);
 }

@@ -56,7 +56,7 @@ TEST(SettingsFileTest, ValueIsTrimmedAndCutAtSixtyCharacters) {
   EXPECT_EQ(ini.Get("s", "a"), "two words");
   EXPECT_EQ(ini.Get("s", "b"), sixty);
   EXPECT_EQ(ini.Get("s", "c"), sixty);
-  EXPECT_EQ(ini.Get("s", "d"), std::string(59, 'x'));  // cut behind a blank
+  EXPECT_EQ(ini.Get("s", "d"), std::string(59, 'x'));             // cut behind a blank
   EXPECT_EQ(ini.Get("s", "e"), std::string(59, 'x') + "\u00E9");  // a whole character
   EXPECT_EQ(ini.Get("s", "f"), "a=b=c");
 }
@@ -109,8 +109,7 @@ TEST(SettingsFileTest, WritesInPlaceAtTheSectionsEndOrInANewSection) {
   EXPECT_TRUE(ini.file.PutSetting("a", "m", "3"));
   EXPECT_TRUE(ini.file.PutSetting("b", "y", "4"));
   EXPECT_TRUE(ini.file.PutSetting("c", "z", "5"));
-  EXPECT_EQ(ini.text(),
-            "[a]\r\nk=2\r\nm=3\r\n\r\n[b]\r\nx=1\r\ny=4\r\n\r\n[c]\r\nz=5\r\n");
+  EXPECT_EQ(ini.text(), "[a]\r\nk=2\r\nm=3\r\n\r\n[b]\r\nx=1\r\ny=4\r\n\r\n[c]\r\nz=5\r\n");
 }
 
 TEST(SettingsFileTest, ForeignLinesAndCommentsStayByteForByte) {
@@ -136,7 +135,8 @@ TEST(SettingsFileTest, LineEndsInAValueInjectNothing) {
 TEST(SettingsFileTest, NamesThatWouldNotReadBackAreRefused) {
   Ini ini("[s]\r\nsafe=1\r\n");
   const std::string before = ini.text();
-  for (const char* key : {"", "  ", "a=b", "=", "safe=2\r\nx", "a\nb", "a\rb", ";k", "[k", "[k]", " ;k"})
+  for (const char* key :
+       {"", "  ", "a=b", "=", "safe=2\r\nx", "a\nb", "a\rb", ";k", "[k", "[k]", " ;k"})
     EXPECT_FALSE(ini.file.PutSetting("s", key, "v")) << key;
   for (const char* section : {"", " ", "a]b", "]", "a\nb", "a]\r\n[s"})
     EXPECT_FALSE(ini.file.PutSetting(section, "k", "v")) << section;
@@ -197,7 +197,7 @@ TEST(SettingsFileTest, BatchReplacesTheFileOnce) {
 // ---- when things go wrong
 
 TEST(SettingsFileTest, FailingWriteLeavesFileAndValuesAsTheyWere) {
-  for (int at = 1; at <= 4; ++at) {
+  for (int at = 1; at <= 7; ++at) {
     FailingIo io;
     Ini ini("[s]\r\nk=1\r\n", io);
     EXPECT_EQ(ini.Get("s", "k"), "1");
@@ -234,6 +234,40 @@ TEST(SettingsFileTest, ChangeByAnotherProcessIsSeenAndKept) {
   EXPECT_EQ(ini.text(), "[s]\r\nk=3\r\nm=9\r\n");
   std::filesystem::remove(ini.home.path() + "/Kora.ini");
   EXPECT_EQ(ini.Get("s", "k"), "unknown");
+}
+
+TEST(SettingsFileTest, AValueThatWouldNotReadBackIsRefusedAndTheOldOneStays) {
+  Ini ini("[s]\r\nk=old\r\n");
+  EXPECT_FALSE(ini.file.PutSetting("s", "k", "c:\\\u4E2D\\"));  // no character of Windows-1252
+  EXPECT_FALSE(ini.file.PutSetting("s", "k", std::string(61, 'x')));
+  EXPECT_FALSE(ini.file.PutSetting("s", "new", "\u03A9"));
+  EXPECT_EQ(ini.text(), "[s]\r\nk=old\r\n");
+  EXPECT_TRUE(ini.file.PutSetting("s", "k", std::string(60, 'x')));
+  EXPECT_TRUE(ini.file.PutSetting("s", "k", "  caf\u00E9 \u20AC? "));
+  EXPECT_EQ(ini.Get("s", "k"), "caf\u00E9 \u20AC?");
+}
+
+TEST(SettingsFileTest, WhyATextIsNotKept) {
+  EXPECT_EQ(WhyNotKept(""), "");
+  EXPECT_EQ(WhyNotKept("  c:\\data\\  "), "");
+  EXPECT_EQ(WhyNotKept(std::string(60, 'x')), "");
+  EXPECT_EQ(WhyNotKept("a\nb"), "");  // on one line it is kept
+  EXPECT_EQ(WhyNotKept(std::string(61, 'x')), "is longer than 60 characters");
+  EXPECT_EQ(WhyNotKept("\u4E2D"), "has characters that the settings can't hold");
+  EXPECT_EQ(WhyNotKept("\xFF"), "has characters that the settings can't hold");
+}
+
+TEST(SettingsFileTest, WhatKeepsAFileFromBeingReadIsTold) {
+  EXPECT_EQ(Ini().file.Fault(), "");
+  EXPECT_EQ(Ini("[s]\r\n").file.Fault(), "");
+  EXPECT_EQ(Ini(std::string(5u << 20, 'x')).file.Fault(), "The file is too large");
+  Ini folder;
+  folder.home.Put("Kora.ini/x", "x");
+  EXPECT_NE(folder.file.Fault(), "");
+  FailingIo io;
+  Ini failing("[s]\r\n", io);
+  io.failReadAt = 1;
+  EXPECT_NE(failing.file.Fault(), "");
 }
 
 TEST(SettingsFileTest, FileThatCantBeReadHasNoKeysAndIsNotReplaced) {

@@ -31,7 +31,7 @@ TEST(TextMetricsTest, OtherLettersCountAsADigitEach) {
 
 TEST(TextMetricsTest, HeightIsWholeUnits) {
   SurfaceFont font;
-  EXPECT_EQ(font.size, 8.25);              // 11 units
+  EXPECT_EQ(font.size, 8.25);               // 11 units
   EXPECT_EQ(StandardTextHeight(font), 13);  // 12.639
   EXPECT_NEAR(StandardAscent(font), 9.955, 1e-9);
   font.size = 7.5;
@@ -52,15 +52,15 @@ TEST(HeadlessSurfaceTest, MeasuresInWholeUnitsHalfToEven) {
   SurfaceFont font;
   font.size = 7.5;
   surface.SetFont(font);
-  EXPECT_EQ(surface.TextWidth("0"), 6);      // 5.56
-  EXPECT_EQ(surface.TextWidth("BHP"), 21);   // 20.56
+  EXPECT_EQ(surface.TextWidth("0"), 6);     // 5.56
+  EXPECT_EQ(surface.TextWidth("BHP"), 21);  // 20.56
   EXPECT_EQ(surface.TextHeight(), 12);
-  font.size = 93.75;                         // 125 units
-  font.name = "Courier New";                 // widths stay the standard ones
+  font.size = 93.75;          // 125 units
+  font.name = "Courier New";  // widths stay the standard ones
   surface.SetFont(font);
   EXPECT_EQ(surface.Font(), font);
-  EXPECT_EQ(surface.TextWidth("00"), 139);   // 1112 thousandths of 125
-  EXPECT_EQ(surface.TextWidth("k"), 62);     // 500 thousandths: 62.5
+  EXPECT_EQ(surface.TextWidth("00"), 139);  // 1112 thousandths of 125
+  EXPECT_EQ(surface.TextWidth("k"), 62);    // 500 thousandths: 62.5
 }
 
 TEST(HeadlessSurfaceTest, PrintMovesToTheNextLinesStart) {

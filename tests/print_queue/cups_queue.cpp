@@ -72,8 +72,8 @@ CupsQueue::CupsQueue() {
   daemon_.setProcessChannelMode(QProcess::MergedChannels);
   // A test that crashes takes its daemon with it.
   daemon_.setChildProcessModifier([] { prctl(PR_SET_PDEATHSIG, SIGTERM); });
-  daemon_.start(Program("cupsd"), {"-f", "-c", root + "/server/cupsd.conf", "-s",
-                                   root + "/server/cups-files.conf"});
+  daemon_.start(Program("cupsd"),
+                {"-f", "-c", root + "/server/cupsd.conf", "-s", root + "/server/cups-files.conf"});
   if (!daemon_.waitForStarted(kLongest)) return;
   qputenv("CUPS_SERVER", socket.toUtf8());
   qputenv("CUPS_USER", "kora-tests");
@@ -109,8 +109,8 @@ bool CupsQueue::Run(const QString& program, const QStringList& arguments) const 
 }
 
 bool CupsQueue::AddQueue() const {
-  return Run("lpadmin", {"-p", kName, "-E", "-v", "cups-pdf:/", "-P", kModel, "-o", "Label=2",
-                         "-o", "TitlePref=1"});
+  return Run("lpadmin", {"-p", kName, "-E", "-v", "cups-pdf:/", "-P", kModel, "-o", "Label=2", "-o",
+                         "TitlePref=1"});
 }
 
 QList<int> CupsQueue::Done() const {
@@ -128,8 +128,7 @@ QList<int> CupsQueue::Done() const {
 
 QByteArray CupsQueue::NextPdf(const QList<int>& before) const {
   QList<int> done;
-  if (!QTest::qWaitFor([&] { return (done = Done()).size() > before.size(); }, kLongest))
-    return {};
+  if (!QTest::qWaitFor([&] { return (done = Done()).size() > before.size(); }, kLongest)) return {};
   const QString files = QString("*job_%1*").arg(done.last());
   QByteArray pdf;
   for (const QString& name : QDir(kMade).entryList({files}, QDir::Files)) {

@@ -14,6 +14,7 @@
 #include "platform/qt/qt_printer.h"
 #include "tests/print_queue/cups_queue.h"
 #include "tests/support/error_of.h"
+#include "tests/support/places.h"
 #include "tests/support/scripted_dialogs.h"
 #include "tests/support/temp_home.h"
 
@@ -42,7 +43,7 @@ class PrintQueue : public testing::Test {
   }
 
   bool PrintGolden(QtPrinter& printer) {
-    QFile script(QString(KORA_SOURCE_DIR) + "/tests/golden/charts/osc_macd.cht");
+    QFile script(QString::fromStdString(SourceDir()) + "/tests/golden/charts/osc_macd.cht");
     EXPECT_TRUE(script.open(QIODevice::ReadOnly));
     const ChartPrintServices services{home_.files(), dialogs_, printer, fonts_, colours_, {}};
     return PrintChartScript(services, setup_, {638, 596}, script.readAll().toStdString());
@@ -160,8 +161,8 @@ TEST_F(PrintQueue, AQueueThatStoppedOrTakesNothingIsToldAndGetsNoPage) {
   const auto before = queue_->Done();
   const std::string told =
       std::string("There is an unexpected error No. 68\n") + ErrorText(kDeviceNotAvailable);
-  for (const auto& [off, on] : {std::pair{"cupsdisable", "cupsenable"},
-                                std::pair{"cupsreject", "cupsaccept"}}) {
+  for (const auto& [off, on] :
+       {std::pair{"cupsdisable", "cupsenable"}, std::pair{"cupsreject", "cupsaccept"}}) {
     ASSERT_TRUE(queue_->Run(off, {CupsQueue::kName}));
     dialogs_.said.clear();
     EXPECT_FALSE(PrintGolden(printer)) << off;

@@ -32,9 +32,10 @@ TEST(MutationTest, NumbersDatesAndTexts) {
 }
 
 TEST(MutationTest, SettingsFiles) {
-  Mutator(3).Run({"[Charts]\r\nType=B\r\nPeriod=A\r\n\r\n[Download]\r\nDataService=1\r\n",
-                  "; note\n[charts]\nTYPE = C \nType=D\n[x]\n[CHARTS]\nPeriod=M", "Type=1\r\n", "[", ""},
-                 4000, ReadSettings);
+  Mutator(3).Run(
+      {"[Charts]\r\nType=B\r\nPeriod=A\r\n\r\n[Download]\r\nDataService=1\r\n",
+       "; note\n[charts]\nTYPE = C \nType=D\n[x]\n[CHARTS]\nPeriod=M", "Type=1\r\n", "[", ""},
+      4000, ReadSettings);
 }
 
 TEST(MutationTest, NameRecords) {

@@ -27,7 +27,7 @@ class SettingsTest : public ::testing::Test {
   // Reads a file with the program folder given and these lines.
   void Read(const std::string& lines) {
     home_.Put("Kora.ini", "[KoraPaths]\r\nSystem=d:\\kora\\\r\n" + lines);
-    ASSERT_TRUE(ReadPaths(ini_, home_.files(), dialogs_, settings_));
+    ASSERT_TRUE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
     EXPECT_TRUE(dialogs_.said.empty());
   }
 
@@ -37,6 +37,16 @@ class SettingsTest : public ::testing::Test {
   ScriptedDialogs dialogs_;
   Settings settings_;
 };
+
+TEST_F(SettingsTest, ASettingsFileThatCantBeReadIsToldAndNothingElseIsTaken) {
+  home_.Put("Kora.ini", std::string(5u << 20, 'x'));
+  settings_.paths.CurrentDataPath = "c:\\mine\\";
+  EXPECT_FALSE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
+  ASSERT_EQ(dialogs_.said.size(), 1u);
+  EXPECT_EQ(dialogs_.said[0].text,
+            "Kora.ini in " + home_.path() + " can't be read: The file is too large");
+  EXPECT_EQ(settings_.paths.CurrentDataPath, "c:\\mine\\");
+}
 
 // ---- conversions
 
@@ -129,10 +139,6 @@ TEST_F(SettingsTest, WithoutOtherKeysTheUsualConversionHolds) {
   EXPECT_EQ(settings_.Zoom, 100);
   EXPECT_EQ(settings_.AdjDivs, 0);
   EXPECT_FALSE(settings_.NoShortNames);
-  for (const OscKey& key : OscKeys()) {
-    EXPECT_EQ((settings_.osc.*key.value).daily, 0) << key.daily;
-    EXPECT_EQ((settings_.osc.*key.value).twin, 0) << key.twin;
-  }
   EXPECT_EQ(settings_.osc.CompFile, "");
   EXPECT_EQ(settings_.osc.MMASet, (std::array<std::int16_t, 12>{}));
 }
@@ -192,10 +198,9 @@ TEST_F(SettingsTest, VolumeHeightIsHeldTo1To3) {
 }
 
 TEST_F(SettingsTest, VolumeDivisorIsAPowerOfTenOr1) {
-  const std::pair<const char*, int> cases[] = {{"1", 1},       {"10", 10},      {"100", 100},
-                                               {"1000", 1000}, {"10000", 10000}, {"7", 1},
-                                               {"100000", 1},  {"unknown", 1},  {"-10", 1},
-                                               {"10.5", 1}};
+  const std::pair<const char*, int> cases[] = {
+      {"1", 1}, {"10", 10},    {"100", 100},   {"1000", 1000}, {"10000", 10000},
+      {"7", 1}, {"100000", 1}, {"unknown", 1}, {"-10", 1},     {"10.5", 1}};
   for (const auto& [text, divisor] : cases) {
     Read("[Download]\r\nVolume divisor="s + text + "\r\n");
     EXPECT_EQ(settings_.download.VolumeDivisor, divisor) << text;
@@ -203,7 +208,7 @@ TEST_F(SettingsTest, VolumeDivisorIsAPowerOfTenOr1) {
 }
 
 TEST_F(SettingsTest, ZoomOutside50To200Is100) {
-  const std::pair<const char*, int> cases[] = {{"30", 100},  {"49", 100},   {"50", 50},
+  const std::pair<const char*, int> cases[] = {{"30", 100},  {"49", 100},  {"50", 50},
                                                {"200", 200}, {"201", 100}, {"99999", 100}};
   for (const auto& [text, zoom] : cases) {
     Read("[ChartForms]\r\nZoom="s + text + "\r\n");
@@ -225,8 +230,9 @@ TEST_F(SettingsTest, TheServiceFoldersAreReadForServices1And3Only) {
 }
 
 TEST_F(SettingsTest, DownloadFlagsHaveTheirOwnMeaningOfOtherTexts) {
-  Read("[Download]\r\nDownloadNew=yes\r\nUpdateAll=no\r\nNoWarrants=1\r\nInternet Access=True\r\n"
-       "DLPath=c:\\dl\\\r\nInternetDLfmt= YYMMDD.D \r\n");
+  Read(
+      "[Download]\r\nDownloadNew=yes\r\nUpdateAll=no\r\nNoWarrants=1\r\nInternet Access=True\r\n"
+      "DLPath=c:\\dl\\\r\nInternetDLfmt= YYMMDD.D \r\n");
   EXPECT_FALSE(settings_.download.DownloadNew);
   EXPECT_TRUE(settings_.download.UpdateAll);
   EXPECT_FALSE(settings_.download.NoWarrants);
@@ -238,9 +244,10 @@ TEST_F(SettingsTest, DownloadFlagsHaveTheirOwnMeaningOfOtherTexts) {
 }
 
 TEST_F(SettingsTest, FontAndPageKeysAreRead) {
-  Read("[Chart Fonts]\r\nCFont=Arial\r\nCFontSize=9.75\r\nSFont=Courier\r\nSFontSize=8.25\r\n"
-       "[ChtPage]\r\nPPTop=70000\r\nPPLft=-3\r\nPPBot=2.5\r\nPPRht=0.25\r\nOrient=2\r\n"
-       "[Adjustments]\r\nDivs=4\r\nNoShortNames=True\r\n");
+  Read(
+      "[Chart Fonts]\r\nCFont=Arial\r\nCFontSize=9.75\r\nSFont=Courier\r\nSFontSize=8.25\r\n"
+      "[ChtPage]\r\nPPTop=70000\r\nPPLft=-3\r\nPPBot=2.5\r\nPPRht=0.25\r\nOrient=2\r\n"
+      "[Adjustments]\r\nDivs=4\r\nNoShortNames=True\r\n");
   EXPECT_EQ(settings_.fonts.Font1Name, "Arial");
   EXPECT_EQ(settings_.fonts.TitleSize, 9.75);
   EXPECT_EQ(settings_.fonts.Font2Name, "Courier");
@@ -255,25 +262,22 @@ TEST_F(SettingsTest, FontAndPageKeysAreRead) {
   EXPECT_TRUE(settings_.NoShortNames);
 }
 
-TEST_F(SettingsTest, EachOscillatorKeyGoesToItsOwnPeriod) {
-  std::string lines = "[OscDef]\r\n";
-  int value = 0;
-  for (const OscKey& key : OscKeys()) {
-    lines += std::string(key.daily) + "=" + std::to_string(++value) + "\r\n";
-    lines += std::string(key.twin) + "=" + std::to_string(++value) + "\r\n";
-  }
-  Read(lines + "CompFile=c:\\d\\XAO.WDT\r\nBCCalTp=True\r\nCutVols=True\r\nFXRev=True\r\n");
-  value = 0;
-  for (const OscKey& key : OscKeys()) {
-    EXPECT_EQ((settings_.osc.*key.value).For("A"), ++value) << key.daily;
-    EXPECT_EQ((settings_.osc.*key.value).For("M"), ++value) << key.twin;
-  }
-  EXPECT_EQ(settings_.osc.StochK.daily, 1);
-  EXPECT_EQ(settings_.osc.VtyD.twin, 44);
+TEST_F(SettingsTest, SwitchesOfOscillatorsAreRead) {
+  Read("[OscDef]\r\nCompFile=c:\\d\\XAO.WDT\r\nBCCalTp=True\r\nCutVols=True\r\nFXRev=True\r\n");
   EXPECT_EQ(settings_.osc.CompFile, "c:\\d\\XAO.WDT");
   EXPECT_TRUE(settings_.osc.BCCalTp && settings_.osc.CutVols && settings_.osc.FXRev);
   EXPECT_FALSE(settings_.osc.LCalTp || settings_.osc.VCalTp || settings_.osc.ShowOsc ||
                settings_.osc.FillIn || settings_.osc.RFAve);
+}
+
+TEST(OscSettingsTest, APeriodThatWasNeverReadIs0) {
+  constexpr OscKey kKey{"NewP", "NewPW", 5, 6, "New"};
+  OscSettings osc;
+  EXPECT_EQ(std::as_const(osc)[kKey].For(Period::kDaily), 0);
+  osc[kKey] = {7, 8};
+  EXPECT_EQ(std::as_const(osc)[kKey].For(Period::kDaily), 7);
+  EXPECT_EQ(std::as_const(osc)[kKey].For(Period::kWeekly), 8);
+  EXPECT_EQ(std::as_const(osc)[kKey].For(Period::kMonthly), 8);
 }
 
 TEST_F(SettingsTest, TheAverageListTakesNumbersAndKeepsTheRest) {
@@ -296,8 +300,8 @@ TEST_F(SettingsTest, AnOverrideIsReadInPlaceOfTheFile) {
 
 TEST_F(SettingsTest, NumbersBeyondMeasureAreZero) {
   const std::string nines(60, '9');
-  Read("[Charts]\r\nSpacing=" + nines + "\r\nSL Percent=" + nines + "\r\n[ChtPage]\r\nPPTop=" +
-       nines + "\r\nPPBot=" + nines + "\r\n");
+  Read("[Charts]\r\nSpacing=" + nines + "\r\nSL Percent=" + nines +
+       "\r\n[ChtPage]\r\nPPTop=" + nines + "\r\nPPBot=" + nines + "\r\n");
   EXPECT_EQ(settings_.charts.Spacing, 0);
   EXPECT_EQ(settings_.charts.StopLossPct, 0);
   EXPECT_EQ(settings_.page.PPTop, 0);
@@ -308,7 +312,7 @@ TEST_F(SettingsTest, NumbersBeyondMeasureAreZero) {
 
 TEST_F(SettingsTest, WithoutAFileTheUserIsAskedForTheDrive) {
   dialogs_.replies = {"e"};
-  EXPECT_TRUE(ReadPaths(ini_, home_.files(), dialogs_, settings_));
+  EXPECT_TRUE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
   ASSERT_EQ(dialogs_.said.size(), 1u);
   EXPECT_EQ(dialogs_.said[0].text,
             "There is a path problem.\nEnter the drive on which KORA is located");
@@ -327,7 +331,7 @@ TEST_F(SettingsTest, AnEmptyAnswerGivesUpAndWritesNothing) {
        {std::optional<std::string>(), std::optional<std::string>(""),
         std::optional<std::string>("  ")}) {
     dialogs_.replies = {reply};
-    EXPECT_FALSE(ReadPaths(ini_, home_.files(), dialogs_, settings_));
+    EXPECT_FALSE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
     EXPECT_FALSE(home_.Exists("Kora.ini"));
   }
 }
@@ -341,7 +345,7 @@ TEST_F(SettingsTest, WhatIsNoDriveIsAskedAgain) {
 
 TEST_F(SettingsTest, TheProgramOnTheWindowsDriveIsFoundWithoutAsking) {
   home_.Put("drive_c/korawin/KORA32.EXE", "");
-  EXPECT_TRUE(ReadPaths(ini_, home_.files(), dialogs_, settings_));
+  EXPECT_TRUE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
   EXPECT_TRUE(dialogs_.said.empty());
   EXPECT_EQ(settings_.paths.SystemPath, "C:\\korawin\\");
 }
@@ -349,7 +353,7 @@ TEST_F(SettingsTest, TheProgramOnTheWindowsDriveIsFoundWithoutAsking) {
 TEST_F(SettingsTest, FindingTheDriveLosesNoOtherKey) {
   home_.Put("drive_c/korawin/kora32.exe", "");
   home_.Put("Kora.ini", "[Download]\r\nDataService=2\r\nDLPath=c:\\bda\\\r\nOther=kept\r\n");
-  EXPECT_TRUE(ReadPaths(ini_, home_.files(), dialogs_, settings_));
+  EXPECT_TRUE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
   EXPECT_EQ(ini_.GetSetting("Download", "DataService"), "2");
   EXPECT_EQ(ini_.GetSetting("Download", "DLPath"), "c:\\bda\\");
   EXPECT_EQ(ini_.GetSetting("Download", "Other"), "kept");
@@ -358,17 +362,17 @@ TEST_F(SettingsTest, FindingTheDriveLosesNoOtherKey) {
 TEST_F(SettingsTest, AFileOfRubbishStartsTheQuestionOfTheDrive) {
   home_.Put("Kora.ini", Rubbish());
   dialogs_.replies = {"C:"};
-  EXPECT_TRUE(ReadPaths(ini_, home_.files(), dialogs_, settings_));
+  EXPECT_TRUE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
   EXPECT_EQ(dialogs_.said.size(), 1u);
   EXPECT_EQ(settings_.Zoom, 100);
   EXPECT_EQ(ini_.GetSetting("KoraPaths", "System"), "C:\\korawin\\");
 }
 
-TEST_F(SettingsTest, AFolderInPlaceOfTheFileHasNoKeys) {
+TEST_F(SettingsTest, AFolderInPlaceOfTheFileIsTold) {
   home_.Put("Kora.ini/inner", "");
-  dialogs_.replies = {"C:"};
-  EXPECT_TRUE(ReadPaths(ini_, home_.files(), dialogs_, settings_));  // the failed save is passed over
-  EXPECT_EQ(settings_.paths.SystemPath, "C:\\korawin\\");
+  EXPECT_FALSE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
+  ASSERT_EQ(dialogs_.said.size(), 1u);
+  EXPECT_NE(dialogs_.said[0].text.find("can't be read"), std::string::npos);
 }
 
 // ---- writing
@@ -395,12 +399,12 @@ TEST_F(SettingsTest, AFailingWriteIsPassedOverAndLeavesTheOldFile) {
   Read("");
   const std::string old = home_.Get("Kora.ini");
   settings_.paths.CurrentDataPath = "c:\\x\\";
-  for (int at = 1; at <= 4; ++at) {
+  for (int at = 1; at <= 7; ++at) {
     io_.Reset(at);
     SavePaths(ini_, settings_);
     EXPECT_EQ(home_.Get("Kora.ini"), old) << at;
   }
-  io_.Reset(5);
+  io_.Reset(8);
   SavePaths(ini_, settings_);
   EXPECT_NE(home_.Get("Kora.ini"), old);
 }
@@ -408,8 +412,8 @@ TEST_F(SettingsTest, AFailingWriteIsPassedOverAndLeavesTheOldFile) {
 TEST_F(SettingsTest, ANewInstallationReadsBackWhole) {
   io_.Reset();
   WriteDefaultSettings(ini_);
-  EXPECT_EQ(io_.calls, 4);  // the file is written once
-  EXPECT_TRUE(ReadPaths(ini_, home_.files(), dialogs_, settings_));
+  EXPECT_EQ(io_.calls, 5);  // the file is written once
+  EXPECT_TRUE(ReadSettings(ini_, home_.files(), dialogs_, settings_));
   EXPECT_TRUE(dialogs_.said.empty());
   EXPECT_EQ(settings_.paths.SystemPath, "c:\\korawin\\");
   EXPECT_EQ(settings_.paths.CurrentDataPath, "c:\\korawin\\data\\");
@@ -425,27 +429,8 @@ TEST_F(SettingsTest, ANewInstallationReadsBackWhole) {
   EXPECT_EQ(settings_.fonts.TitleSize, 9.75);
   EXPECT_EQ(settings_.fonts.Font2Size, 6);
   EXPECT_EQ(settings_.fonts.Font1Name, "");
-  for (const OscKey& key : OscKeys()) {
-    EXPECT_EQ((settings_.osc.*key.value).daily, key.defaultDaily) << key.daily;
-    EXPECT_EQ((settings_.osc.*key.value).twin, key.defaultTwin) << key.twin;
-  }
   EXPECT_EQ(settings_.osc.MMASet[11], 60);
   EXPECT_EQ(settings_.Zoom, 100);
-}
-
-TEST(OscKeysTest, HaveTheDefaultsOfTheirTable) {
-  const std::pair<const char*, int> table[] = {
-      {"StochK", 10}, {"StochD", 5},  {"FXF", 50},  {"FXX", 25},  {"RocP", 21}, {"RocA", 10},
-      {"RsiP", 14},   {"RmoP", 30},   {"RmoA", 10}, {"RmxP", 100}, {"RmxA", 20}, {"Md1", 12},
-      {"Md2", 26},    {"Md3", 9},     {"WmsA", 7},  {"ERA", 14},  {"DMA", 14},  {"DMXA", 14},
-      {"MMA", 14},    {"CopD", 14},   {"HolyD", 50}, {"VtyD", 3}};
-  ASSERT_EQ(std::size(table), OscKeys().size());
-  for (size_t i = 0; i < OscKeys().size(); ++i) {
-    const OscKey& key = OscKeys()[i];
-    EXPECT_STREQ(key.daily, table[i].first);
-    EXPECT_EQ(key.defaultDaily, table[i].second);
-    EXPECT_EQ(key.defaultTwin, key.daily == "RmxP"s ? 50 : table[i].second);
-  }
 }
 
 }  // namespace

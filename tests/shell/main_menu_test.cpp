@@ -67,9 +67,9 @@ TEST(MenuState, EachServiceShowsItsOwnDownload) {
     int service;
     bool tarvo, bourse, eis;
   };
-  for (const Row& row : {Row{0, false, false, false}, Row{1, true, false, false},
-                         Row{2, false, true, false}, Row{3, true, false, false},
-                         Row{4, false, false, false}, Row{5, false, false, true}}) {
+  for (const Row& row :
+       {Row{0, false, false, false}, Row{1, true, false, false}, Row{2, false, true, false},
+        Row{3, true, false, false}, Row{4, false, false, false}, Row{5, false, false, true}}) {
     EXPECT_EQ(StateOf("mnuTARVO", row.service).visible, row.tarvo) << row.service;
     EXPECT_EQ(StateOf("mnuTARVO", row.service).enabled, row.tarvo) << row.service;
     EXPECT_EQ(StateOf("mnuSnap", row.service).enabled, row.tarvo) << row.service;

@@ -31,10 +31,15 @@ TEST(ProgramArguments, NoneAreFine) {
 }
 
 TEST(ProgramArguments, WrongOnesAreTold) {
-  for (const std::vector<std::string>& wrong :
-       {std::vector<std::string>{"--hom", "/h"}, {"--home"}, {"--home="}, {"--set"},
-        {"--set", "Charts"}, {"--set", ".Key=1"}, {"--set", "Charts.=1"}, {"--set", "A=b.c"},
-        {"--"}}) {
+  for (const std::vector<std::string>& wrong : {std::vector<std::string>{"--hom", "/h"},
+                                                {"--home"},
+                                                {"--home="},
+                                                {"--set"},
+                                                {"--set", "Charts"},
+                                                {"--set", ".Key=1"},
+                                                {"--set", "Charts.=1"},
+                                                {"--set", "A=b.c"},
+                                                {"--"}}) {
     std::string fault;
     EXPECT_FALSE(ParseProgramArguments(wrong, fault)) << wrong[0];
     EXPECT_NE(fault, "") << wrong[0];

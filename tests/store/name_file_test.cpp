@@ -142,7 +142,7 @@ TEST_F(Names, LocatePadsAndUpperCases) {
   EXPECT_EQ(current_.NameRecNo, 2);
   EXPECT_EQ(current_.NameCount, 2);
   EXPECT_EQ(current_.CurrentCode, "BHP   ");
-  EXPECT_EQ(current_.CurrentDataFile, "c:\\data\\BHP.WDT");
+  EXPECT_EQ(current_.PriceFileName, "BHP.WDT");
   EXPECT_EQ(current_.Rec.Code.raw(), "BHP   ");
   EXPECT_TRUE(dialogs_.said.empty());
   EXPECT_EQ(dialogs_.busyCalls, 2);
@@ -155,7 +155,7 @@ TEST_F(Names, LocateTellsWhatItDoesNotFind) {
   EXPECT_FALSE(Locate("BHP"));
   ASSERT_EQ(dialogs_.said.size(), 1u);
   EXPECT_EQ(dialogs_.said[0].text, "No File For That Name");
-  EXPECT_EQ(current_.CurrentDataFile, "");
+  EXPECT_EQ(current_.PriceFileName, "");
   EXPECT_EQ(current_.NameRecNo, 1);
   EXPECT_FALSE(dialogs_.busy);
 }
@@ -176,7 +176,7 @@ TEST_F(Names, ACodeThatCouldLeaveTheFolderHasNoFile) {
   Put(records);
   for (const std::string& code : codes) {
     EXPECT_FALSE(Locate(code)) << code;
-    EXPECT_EQ(current_.CurrentDataFile, "") << code;
+    EXPECT_EQ(current_.PriceFileName, "") << code;
   }
 }
 

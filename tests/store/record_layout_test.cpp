@@ -33,12 +33,23 @@ TEST(RecordLayout, NameRecordByByte) {
     file.Append(rec);
   }
   const std::string expected =
-      "\x09\x00"s "BHP   " "\x04\x00"s
+      "\x09\x00"s
+      "BHP   "
+      "\x04\x00"s
       "B.H.P. Limited                     "
       "Ord            "
-      "\x00\x00\xC0\x3F"s "\x00\x00\x00\xC0"s "\x00\x00\x80\x3E"s "\xCD\xCC\x4C\x3D"s
-      "\x05\x00"s "\x2C\x01"s "\xFF\xFF"s "\x02\x00"s "\x56\x00"s
-      "A" "012" "xyz   ";
+      "\x00\x00\xC0\x3F"s
+      "\x00\x00\x00\xC0"s
+      "\x00\x00\x80\x3E"s
+      "\xCD\xCC\x4C\x3D"s
+      "\x05\x00"s
+      "\x2C\x01"s
+      "\xFF\xFF"s
+      "\x02\x00"s
+      "\x56\x00"s
+      "A"
+      "012"
+      "xyz   ";
   ASSERT_EQ(expected.size(), 96u);
   EXPECT_EQ(home.Get("drive_c/Names.dat"), expected);
 }
@@ -68,8 +79,15 @@ TEST(RecordLayout, PriceRecordByByte) {
     file.Append(rec);
   }
   const std::string expected =
-      "19990827" "\x00\x00\x80\x3F"s "\x00\x00\x00\x40"s "\x00\x00\x00\x3F"s "\x00\x00\xC0\x3F"s
-      "\x40\x42\x0F\x00"s "\x00\x00\x00\x40"s "1:1 Bonus     " "    ";
+      "19990827"
+      "\x00\x00\x80\x3F"s
+      "\x00\x00\x00\x40"s
+      "\x00\x00\x00\x3F"s
+      "\x00\x00\xC0\x3F"s
+      "\x40\x42\x0F\x00"s
+      "\x00\x00\x00\x40"s
+      "1:1 Bonus     "
+      "    ";
   ASSERT_EQ(expected.size(), 50u);
   EXPECT_EQ(home.Get("drive_c/BHP.WDT"), expected);
 }

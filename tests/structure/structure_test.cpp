@@ -11,11 +11,13 @@
 #include <string>
 #include <vector>
 
+#include "tests/support/places.h"
+
 namespace fs = std::filesystem;
 
 namespace {
 
-const fs::path kRoot = KORA_SOURCE_DIR;
+const fs::path kRoot = kora::SourceDir();
 
 // What each room may include besides itself.
 const std::map<std::string, std::set<std::string>>& Allowed() {
@@ -25,20 +27,23 @@ const std::map<std::string, std::set<std::string>>& Allowed() {
     t["platform"] = {"base"};
     t["settings"] = {"base", "platform"};
     t["store"] = {"base", "platform", "settings"};
-    t["chart"] = {"base", "platform", "settings", "store"};
-    t["indicators"] = {"base", "platform", "settings", "store", "chart"};
-    t["lists"] = t["chart"];
-    t["chartwindow"] = {"base", "platform", "settings", "store", "chart", "indicators", "lists"};
-    for (const char* room : {"update", "maintenance"}) {
-      t[room] = t["chart"];
-      t[room].insert("lists");
-    }
-    t["scans"] = t["indicators"];  // the bars of the chart
+    t["looks"] = t["lists"] = {"base", "platform", "settings", "store"};
+    t["chart"] = {"base", "platform", "settings", "store", "looks", "lists"};
+    t["indicators"] = t["chart"];
+    t["indicators"].insert("chart");
+    t["chartwindow"] = t["indicators"];
+    t["chartwindow"].insert("indicators");
+    for (const char* room : {"adjust", "update", "scans", "maintenance", "names", "companies"})
+      t[room] = {"base", "platform", "settings", "store", "lists"};
+    t["update"].insert("adjust");
+    for (const char* room : {"names", "companies"}) t[room].insert("update");
     for (const auto& [room, below] : std::map(t)) t["shell"].insert(room);
+    t["demo"] = t["chartwindow"];
     for (const char* program : {"kora", "koractl"}) {
       t[program] = t["shell"];
       t[program].insert("shell");
     }
+    t["koractl"].insert("demo");
     return t;
   }();
   return table;
@@ -97,11 +102,15 @@ std::string Fault(const Include& include) {
 
 std::vector<Include> AllIncludes() {
   std::vector<Include> out;
-  for (const auto& entry : fs::recursive_directory_iterator(kRoot / "src")) {
-    if (!entry.is_regular_file() || !IsSource(entry.path())) continue;
-    const auto some = IncludesOf(fs::relative(entry.path(), kRoot / "src"), ReadText(entry.path()));
-    out.insert(out.end(), some.begin(), some.end());
-  }
+  const auto read = [&out](const fs::path& folder, const fs::path& top) {
+    for (const auto& entry : fs::recursive_directory_iterator(folder)) {
+      if (!entry.is_regular_file() || !IsSource(entry.path())) continue;
+      const auto some = IncludesOf(fs::relative(entry.path(), top), ReadText(entry.path()));
+      out.insert(out.end(), some.begin(), some.end());
+    }
+  };
+  read(kRoot / "src", kRoot / "src");
+  read(kRoot / "demo", kRoot);
   return out;
 }
 
@@ -120,11 +129,14 @@ TEST(StructureTest, RulesCatchWhatTheyForbid) {
   EXPECT_NE(Fault({"base/x.cpp", "platform/clock.h"}), "");
   EXPECT_NE(Fault({"store/x.cpp", "chart/composer.h"}), "");
   EXPECT_NE(Fault({"update/x.cpp", "scans/scan.h"}), "");
+  EXPECT_NE(Fault({"demo/x.cpp", "update/day_line.h"}), "");
+  EXPECT_NE(Fault({"kora/x.cpp", "demo/demo_market.h"}), "");
   EXPECT_NE(Fault({"attic/x.cpp", "base/text.h"}), "");
   EXPECT_EQ(Fault({"chart/x.cpp", "store/name_rec.h"}), "");
   EXPECT_EQ(Fault({"chart/forms/ChtSel.cpp", "QDialog"}), "");
   EXPECT_EQ(Fault({"kora/main.cpp", "shell/session.h"}), "");
-  const auto found = IncludesOf("a.cpp", "// #include <x>\n#include \"base/a.h\"\n #  include <QFont>\n");
+  const auto found =
+      IncludesOf("a.cpp", "// #include <x>\n#include \"base/a.h\"\n #  include <QFont>\n");
   ASSERT_EQ(found.size(), 2u);
   EXPECT_EQ(found[1].name, "QFont");
 }
@@ -132,7 +144,8 @@ TEST(StructureTest, RulesCatchWhatTheyForbid) {
 // Paths of the machine that something was written on have no place in what is handed on.
 TEST(StructureTest, NothingNamesAPathOfTheMachine) {
   std::string places;
-  for (const char* place : {"root", "work"}) places += (places.empty() ? "" : "|") + std::string(place);
+  for (const char* place : {"root", "work"})
+    places += (places.empty() ? "" : "|") + std::string(place);
   const std::regex path("(^|[^A-Za-z0-9_.}/\\)-])/(" + places + ")/[A-Za-z0-9_.]",
                         std::regex::ECMAScript | std::regex::multiline);
   const auto names = [&](const std::string& text) { return std::regex_search(text, path); };
@@ -140,8 +153,9 @@ TEST(StructureTest, NothingNamesAPathOfTheMachine) {
   EXPECT_TRUE(names(std::string("\"/") + "work/main/src\""));
   EXPECT_FALSE(names("demo/work/x ${HOME}/work/x"));
 
-  const std::set<std::string> kinds = {".h", ".cpp", ".md", ".txt", ".cmake", ".json", ".sh", ".yml",
-                                       ".yaml", ".py", ".in", ".html", ".css", ".desktop", ".ui", ".qrc"};
+  const std::set<std::string> kinds = {".h",   ".cpp",     ".md",   ".txt", ".cmake", ".json",
+                                       ".sh",  ".yml",     ".yaml", ".py",  ".in",    ".html",
+                                       ".css", ".desktop", ".ui",   ".qrc"};
   int seen = 0;
   for (const auto& top : fs::directory_iterator(kRoot)) {
     const std::string name = top.path().filename().string();

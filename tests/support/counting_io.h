@@ -1,11 +1,11 @@
 #pragma once
 
-#include "base/io.h"
+#include "tests/support/forwarding_io.h"
 
 namespace kora::test {
 
 // The machine's file system, counting what is asked of it.
-class CountingIo : public Io {
+class CountingIo : public ForwardingIo {
  public:
   int opens = 0, stats = 0, lists = 0, renames = 0;
   bool refuseLists = false;  // as a folder does that may be entered but not read
@@ -19,8 +19,6 @@ class CountingIo : public Io {
     return MachineIo().Status(path);
   }
   std::vector<std::string> List(const std::string& folder) override;
-  void MakeFolder(const std::string& path) override { MachineIo().MakeFolder(path); }
-  void Remove(const std::string& path) override { MachineIo().Remove(path); }
   void Rename(const std::string& from, const std::string& to) override {
     ++renames;
     MachineIo().Rename(from, to);

@@ -4,9 +4,9 @@
 
 namespace kora::test {
 
-class FailingIo::File : public HostFile {
+class FailingIo::File : public ForwardingFile {
  public:
-  File(FailingIo& io, std::unique_ptr<HostFile> base) : io_(io), base_(std::move(base)) {}
+  File(FailingIo& io, std::unique_ptr<HostFile> base) : ForwardingFile(std::move(base)), io_(io) {}
 
   size_t ReadAt(std::uint64_t offset, void* data, size_t size) override {
     io_.ReadCall();
@@ -19,19 +19,20 @@ class FailingIo::File : public HostFile {
     }
     base_->WriteAt(offset, data, size);
   }
-  std::uint64_t Size() override { return base_->Size(); }
   void Truncate(std::uint64_t size) override {
     io_.Change();
     base_->Truncate(size);
   }
   void Flush() override {
+    io_.Change();  // the disk itself is left alone: tests lose no power
+  }
+  void TakeAccess(const HostStatus& like) override {
     io_.Change();
-    base_->Flush();
+    base_->TakeAccess(like);
   }
 
  private:
   FailingIo& io_;
-  std::unique_ptr<HostFile> base_;
 };
 
 bool FailingIo::Fails() {
@@ -41,7 +42,7 @@ bool FailingIo::Fails() {
 }
 
 std::unique_ptr<HostFile> FailingIo::Open(const std::string& path, OpenMode mode) {
-  if (mode == OpenMode::kCreate || mode == OpenMode::kReplace) Change();
+  if (mode != OpenMode::kRead && mode != OpenMode::kReadWrite) Change();
   if (mode == OpenMode::kRead) ReadCall();
   return std::make_unique<File>(*this, base_.Open(path, mode));
 }
@@ -52,7 +53,11 @@ void FailingIo::MakeFolder(const std::string& path) {
 }
 
 void FailingIo::Remove(const std::string& path) {
-  Change();
+  if (!path.ends_with('~')) {
+    Change();
+  } else if (lasting && failAt > 0 && calls >= failAt) {
+    throw RunTimeError(error);
+  }
   base_.Remove(path);
 }
 
@@ -60,5 +65,14 @@ void FailingIo::Rename(const std::string& from, const std::string& to) {
   Change();
   base_.Rename(from, to);
 }
+
+void FailingIo::FlushDisk(const std::string&) { Change(); }
+
+void FailingIo::Link(const std::string& from, const std::string& to) {
+  Change();
+  base_.Link(from, to);
+}
+
+void FailingIo::FlushFolder(const std::string&) { Change(); }
 
 }  // namespace kora::test

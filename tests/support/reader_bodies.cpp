@@ -31,8 +31,11 @@ class MemoryIo : public Io {
 
   std::unique_ptr<HostFile> Open(const std::string& path, OpenMode mode) override {
     if (!files.contains(path)) {
-      if (mode == OpenMode::kRead || mode == OpenMode::kReadWrite) throw RunTimeError(kFileNotFound);
+      if (mode == OpenMode::kRead || mode == OpenMode::kReadWrite)
+        throw RunTimeError(kFileNotFound);
       files[path] = "";
+    } else if (mode == OpenMode::kNew) {
+      throw RunTimeError(kPathAccess);
     }
     if (mode == OpenMode::kReplace) files[path].clear();
     return std::make_unique<File>(files[path]);
@@ -42,6 +45,7 @@ class MemoryIo : public Io {
     const auto it = files.find(path);
     out.folder = path == "home" || path == "home/drive_c";
     out.exists = out.folder || it != files.end();
+    out.plain = it != files.end();
     if (it != files.end()) out.size = it->second.size();
     out.modified = 1;
     return out;
@@ -57,6 +61,12 @@ class MemoryIo : public Io {
   void Rename(const std::string& from, const std::string& to) override {
     files[to] = files[from];
     files.erase(from);
+  }
+  void Link(const std::string& from, const std::string& to) override { files[to] = files[from]; }
+  std::string LinkTarget(const std::string& path) override { return path; }
+  void FlushFolder(const std::string&) override {}
+  std::unique_ptr<HostLock> TryLock(const std::string&, std::string_view, std::string&) override {
+    return std::make_unique<HostLock>();
   }
 
  private:
@@ -75,6 +85,7 @@ class MemoryIo : public Io {
     std::uint64_t Size() override { return bytes.size(); }
     void Truncate(std::uint64_t size) override { bytes.resize(size); }
     void Flush() override {}
+    void TakeAccess(const HostStatus&) override {}
     std::string& bytes;
   };
 };
@@ -171,8 +182,9 @@ void ReadNameRecords(std::string_view bytes) {
     const std::string_view code = rec.Code.trimmed();
     if (IsFileCode(code)) {
       const std::string name = CodeFileName(code, ".WDT");
-      Check(name.find_first_of(std::string_view("/\\:\0", 4)) == std::string::npos && name[0] != '.',
-            "a code names a file of the folder");
+      Check(
+          name.find_first_of(std::string_view("/\\:\0", 4)) == std::string::npos && name[0] != '.',
+          "a code names a file of the folder");
     }
   }
 }

@@ -7,10 +7,10 @@
 
 namespace kora::test {
 
-void ReadScriptLine(std::string_view bytes);   // SplitScriptLine and its fields
-void ReadNumber(std::string_view bytes);       // Val, Str and Format
-void ReadSettings(std::string_view bytes);     // SettingsFile, reading and one write
-void ReadNameRecords(std::string_view bytes);  // RecordFile<NameRec>
-void ReadPriceRecords(std::string_view bytes); // RecordFile<PriceRec>
+void ReadScriptLine(std::string_view bytes);    // SplitScriptLine and its fields
+void ReadNumber(std::string_view bytes);        // Val, Str and Format
+void ReadSettings(std::string_view bytes);      // SettingsFile, reading and one write
+void ReadNameRecords(std::string_view bytes);   // RecordFile<NameRec>
+void ReadPriceRecords(std::string_view bytes);  // RecordFile<PriceRec>
 
 }  // namespace kora::test

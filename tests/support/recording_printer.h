@@ -14,10 +14,10 @@ namespace kora::test {
 // "box 1 ...", "fill 1 ...". `sent` holds the documents that were sent.
 class RecordingPrinter : public Printer {
  public:
-  std::string device = "Press";          // empty: no printer
-  std::string refused;                   // the face that is refused
-  int failAtEnd = 0;                     // error of EndDoc
-  std::vector<std::string> ops;          // of the document under way or last sent
+  std::string device = "Press";  // empty: no printer
+  std::string refused;           // the face that is refused
+  int failAtEnd = 0;             // error of EndDoc
+  std::vector<std::string> ops;  // of the document under way or last sent
   std::vector<std::vector<std::string>> sent;
   int started = 0, killed = 0;
   double scaleLeft = 0, scaleTop = 0;

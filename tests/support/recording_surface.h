@@ -39,7 +39,8 @@ class RecordingSurface : public HeadlessSurface {
     std::string op = "text " + Str(Font().size);
     if (Font().bold) op += " b";
     if (Font().italic) op += " i";
-    op += " " + Str(CurrentX()) + "," + Str(CurrentY()) + " " + std::string(text) + " " + Str(fore_);
+    op +=
+        " " + Str(CurrentX()) + "," + Str(CurrentY()) + " " + std::string(text) + " " + Str(fore_);
     ops.push_back(op);
     HeadlessSurface::Print(text);
   }

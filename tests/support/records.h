@@ -5,9 +5,9 @@
 #include <vector>
 
 #include "base/runtime_error.h"
-#include "tests/support/error_of.h"
 #include "store/name_rec.h"
 #include "store/price_rec.h"
+#include "tests/support/error_of.h"
 
 namespace kora::test {
 

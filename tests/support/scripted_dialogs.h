@@ -15,8 +15,8 @@ class ScriptedDialogs : public Dialogs {
   struct Said {
     std::string title, text;
   };
-  std::vector<Said> said;              // messages, questions and prompts in order
-  std::deque<Answer> answers;          // to questions; the first button's when empty
+  std::vector<Said> said;                          // messages, questions and prompts in order
+  std::deque<Answer> answers;                      // to questions; the first button's when empty
   std::deque<std::optional<std::string>> replies;  // to prompts; cancel when empty
   int busyCalls = 0;
   bool busy = false;
@@ -32,6 +32,7 @@ class ScriptedDialogs : public Dialogs {
       return a;
     }
     if (buttons == Buttons::kYesNo || buttons == Buttons::kYesNoCancel) return Answer::kYes;
+    if (buttons == Buttons::kNoYes) return Answer::kNo;
     return buttons == Buttons::kRetryCancel ? Answer::kCancel : Answer::kOk;
   }
   std::optional<std::string> Prompt(std::string_view text, std::string_view title,
@@ -43,10 +44,7 @@ class ScriptedDialogs : public Dialogs {
     return reply;
   }
   std::unique_ptr<Progress> StartProgress(std::string_view) override {
-    struct Silent : Progress {
-      bool Step(int, int) override { return true; }
-    };
-    return std::make_unique<Silent>();
+    return std::make_unique<NoProgress>();
   }
   void SetBusy(bool value) override {
     busy = value;

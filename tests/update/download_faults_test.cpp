@@ -5,6 +5,7 @@
 
 #include <set>
 
+#include "base/file_edits.h"
 #include "tests/update/update_fixture.h"
 
 using namespace kora;
@@ -30,6 +31,7 @@ class FaultTest : public UpdateFixture {
   using Scene = std::function<void()>;
 
   const std::string kM = "drive_c/korawin/m/";
+  const std::string kJournal = kHostSystem + "Update.Jnl";
 
   void Clear() {
     std::filesystem::remove_all(home.path() + "/drive_c/korawin");
@@ -56,8 +58,9 @@ class FaultTest : public UpdateFixture {
   }
   // Appends, late volumes, a running total, two new securities.
   static std::string DayOf(const std::string& date) {
-    std::string text = "ORE,D,1,2,1,1,11,12\r\nXAD,D,0,10,4,0,0,0\r\nNEW1,D,7,7,7,7,7,0\r\n"
-                       "ZAP,D,3,3,3,3,21,22\r\nNEW2,D,8,8,8,8,8,0\r\n";
+    std::string text =
+        "ORE,D,1,2,1,1,11,12\r\nXAD,D,0,10,4,0,0,0\r\nNEW1,D,7,7,7,7,7,0\r\n"
+        "ZAP,D,3,3,3,3,21,22\r\nNEW2,D,8,8,8,8,8,0\r\n";
     for (size_t at; (at = text.find(",D,")) != std::string::npos;) text.replace(at + 1, 1, date);
     return text;
   }
@@ -73,8 +76,8 @@ class FaultTest : public UpdateFixture {
     LayMarket(1);
     for (const char* code : {"ORE", "ZAP"})
       Prices(code, {Flat("19980909", 1, 9), Flat("19980910", 1, 10), Flat("19980914", 2, 14)});
-    Prices("XAD", {Day("19980909", 0, 5, 3, 2), Day("19980910", 0, 4, 5, 1),
-                   Day("19980914", 0, 4, 5, 0)});
+    Prices("XAD",
+           {Day("19980909", 0, 5, 3, 2), Day("19980910", 0, 4, 5, 1), Day("19980914", 0, 4, 5, 0)});
     Waiting(DayOf("19980911"));
   }
   // Names of another form, blank lines; every listed share trades.
@@ -101,9 +104,9 @@ class FaultTest : public UpdateFixture {
     Waiting("");
     for (const char* extension : {"das", "dix", "dov", "dsu", "dsf", "dop"}) {
       const std::string tail = std::string(extension) == "dop" ? ",30,C\r\n" : ",15\r\n";
-      Download(std::string("15SEP98.") + extension,
-               "AAA,19980915,3,3,3,3,30" + tail + "BBB,19980915,4,4,4,4,40" + tail +
-                   "NEW,19980915,5,5,5,5,50" + tail);
+      Download(std::string("15SEP98.") + extension, "AAA,19980915,3,3,3,3,30" + tail +
+                                                        "BBB,19980915,4,4,4,4,40" + tail +
+                                                        "NEW,19980915,5,5,5,5,50" + tail);
     }
   }
   // One of three shares trades.
@@ -170,7 +173,8 @@ class FaultTest : public UpdateFixture {
     return n;
   }
 
-  // Killed at every write; OK to what is on file then brings the undisturbed run's bytes.
+  // Killed at every write; the next run then brings the undisturbed run's bytes, and asks nothing
+  // once the journal stands: it knows the mode.
   int ExpectTakenUpAgain(const Scene& scene) {
     const Store whole = WholeRun(scene);
     for (int at = 1;; ++at) {
@@ -178,13 +182,20 @@ class FaultTest : public UpdateFixture {
       Lay(scene);
       const Store before = Everything();
       if (!RunKilledAt(at)) {
-        EXPECT_EQ(Everything(), whole);
+        EXPECT_TRUE(Everything() == whole);
         return at - 1;
       }
       ExpectSound(before, whole, Everything());
-      EXPECT_EQ(Listed(), 1u);
-      EXPECT_EQ(Update(), UpdateEnd::kUpdated);
-      EXPECT_EQ(Everything(), whole);
+      const bool journal = home.Exists(kJournal);
+      if (Listed() == 1) {
+        EXPECT_EQ(Update(), UpdateEnd::kUpdated);
+        EXPECT_TRUE(!journal || dialogs.said.empty());
+      } else {
+        // Killed behind the renaming: all is there, and the journal waits to be swept.
+        EXPECT_TRUE(journal);
+        home.files().Remove(kSystem + "Update.Jnl");
+      }
+      EXPECT_TRUE(Everything() == whole);
       if (HasFailure()) return 0;
     }
   }
@@ -202,14 +213,15 @@ class FaultTest : public UpdateFixture {
        "There is an unexpected error - Disk full"},
       {"no access", kPathAccess, false, false, false,
        "There is a file access problem. Check directory paths option."},
-      {"device", kDeviceError, false, false, true,
-       "There is a device problem. Check and retry"},
+      {"device", kDeviceError, false, false, true, "There is a device problem. Check and retry"},
   };
 
-  // Without the downloaded files, which keep a name that could not be changed.
+  // Without the downloaded files, which keep a name that could not be changed, and the journal of a
+  // day that is in.
   static Store Kept(Store store) {
-    std::erase_if(store,
-                  [](const auto& file) { return file.first.starts_with("korawin/download/"); });
+    std::erase_if(store, [](const auto& file) {
+      return file.first.starts_with("korawin/download/") || file.first == "korawin/Update.Jnl";
+    });
     return store;
   }
 
@@ -239,7 +251,8 @@ class FaultTest : public UpdateFixture {
         } else {
           if (!fault.reading || LastTitle() != "W/M Paths") {  // a list that can't be read
             EXPECT_EQ(LastTitle(), "Error");
-            EXPECT_EQ(LastSaid(), fault.text);
+            EXPECT_EQ(LastSaid().substr(0, LastSaid().find('\n')), fault.text);
+            EXPECT_NE(LastSaid().find("\nc:\\korawin\\"), std::string::npos) << LastSaid();
           }
           // Who can't look at what did not trade is behind the renaming.
           EXPECT_TRUE(Listed() == 1 || (fault.reading && Waits("15SEP98.dX")));
@@ -250,7 +263,7 @@ class FaultTest : public UpdateFixture {
           EXPECT_EQ(Update(), UpdateEnd::kUpdated);
         }
         EXPECT_EQ(Listed(), 0u);
-        EXPECT_EQ(Kept(Everything()), Kept(whole));
+        EXPECT_TRUE(Kept(Everything()) == Kept(whole));
         if (HasFailure()) return;
       }
     }
@@ -259,32 +272,48 @@ class FaultTest : public UpdateFixture {
 
 }  // namespace
 
-// Each new security makes 4 writes: the name file opened, its record, the price file made, its
-// record. A late volume is a write of its own. The day's file is renamed at the end.
+// A journal makes 5 writes: opened, written, flushed, renamed, its folder flushed; one that replaces
+// another takes its access and keeps it aside, which makes 7. Then the name file makes one, each
+// price file one, a new one another as it is made, and the disk is flushed once. The day's file is
+// renamed, the journal removed.
 
 TEST_F(FaultTest, AnAppendedDayIsTakenUpAgainWhereverItWasKilled) {
-  // ORE 2, XAD 1, ZAP 2, two new ones, the renaming.
-  EXPECT_EQ(ExpectTakenUpAgain([this] { LayAppend(); }), 2 + 1 + 2 + 2 * 4 + 1);
+  EXPECT_EQ(ExpectTakenUpAgain([this] { LayAppend(); }), 5 + 1 + 3 + 2 * 2 + 1 + 2);
 }
 
 TEST_F(FaultTest, AReplacedDayIsTakenUpAgainWhereverItWasKilled) {
-  EXPECT_EQ(ExpectTakenUpAgain([this] { LayReplace(); }), 2 + 1 + 2 + 2 * 4 + 1);
+  EXPECT_EQ(ExpectTakenUpAgain([this] { LayReplace(); }), 5 + 1 + 3 + 2 * 2 + 1 + 2);
 }
 
 TEST_F(FaultTest, AnInsertedDayIsTakenUpAgainWhereverItWasKilled) {
-  EXPECT_EQ(ExpectTakenUpAgain([this] { LayInsert(); }), 2 + 1 + 2 + 2 * 4 + 1);
+  EXPECT_EQ(ExpectTakenUpAgain([this] { LayInsert(); }), 5 + 1 + 3 + 2 * 2 + 1 + 2);
 }
 
 TEST_F(FaultTest, AnInternetDayIsTakenUpAgainWhereverItWasKilled) {
-  // Renamed to the list's form; without its blank lines: made, written, flushed and renamed
-  // twice. XAD counts as a share where nothing is looked up.
-  EXPECT_EQ(ExpectTakenUpAgain([this] { LayInternet(); }), 1 + 5 + 2 + 1 + 2 + 2 * 4 + 1);
+  // Renamed to the list's form; without its blank lines: made, written, flushed and renamed twice.
+  EXPECT_EQ(ExpectTakenUpAgain([this] { LayInternet(); }), 1 + 6 + 5 + 1 + 3 + 2 * 2 + 1 + 2);
 }
 
 TEST_F(FaultTest, AWholeMarketIsTakenUpAgainWhereverItWasKilled) {
-  // Five files of 2 late volumes and a new security; the options have no late volumes; the
-  // entry is deleted.
-  EXPECT_EQ(ExpectTakenUpAgain([this] { LayWholeMarket(); }), 5 * (4 + 4) + (2 + 4) + 1);
+  // Six files of two securities on file and a new one; the entry is deleted.
+  EXPECT_EQ(ExpectTakenUpAgain([this] { LayWholeMarket(); }), 6 * (5 + 1 + 2 + 2 + 1) + 5 * 2 + 2);
+}
+
+TEST_F(FaultTest, FlatRecordsAreTakenUpAgainWhereverTheRunWasKilled) {
+  // ORE trades, ZAP and OLD are flat; NEW has no prices.
+  EXPECT_EQ(ExpectTakenUpAgain([this] { LayNoTrades(); }), 5 + 3 + 1 + 2);
+}
+
+// Each security is made for itself: a day of which the first lines were taken goes on behind them.
+TEST_F(FaultTest, ADayInManyPartsIsTakenUpAgainWhereverItWasKilled) {
+  mostHeld = 1;
+  const Scene append = [this] { LayAppend(); }, insert = [this] { LayInsert(); };
+  // A journal, its files and a flush for each of five securities, two of them new; then the part
+  // that ends the day, which has nothing to write.
+  const int writes = 5 * (5 + 1 + 1) + 2 * 2 + 5 + 5 * 2 + 2;
+  EXPECT_EQ(ExpectTakenUpAgain(append), writes);
+  EXPECT_EQ(ExpectTakenUpAgain(insert), writes);
+  EXPECT_EQ(ExpectTakenUpAgain([this] { LayNoTrades(); }), 4 * (5 + 1 + 1) + 5 + 4 * 2 + 2);
 }
 
 TEST_F(FaultTest, FaultsOfAnAppendedDayAreTold) {
@@ -303,26 +332,6 @@ TEST_F(FaultTest, FaultsOfAWholeMarketAreTold) {
   ExpectFaultsTold([this] { LayWholeMarket(); });
 }
 
-// The file is off the list once its lines are written; flat records that were not reached stay
-// away, since a day that is replaced has no pass for them.
-TEST_F(FaultTest, ARunThatIsKilledAmongTheFlatRecordsLeavesWholeFiles) {
-  const Scene scene = [this] { LayNoTrades(); };
-  const Store whole = WholeRun(scene);
-  int passed = 0;
-  for (int at = 1;; ++at) {
-    SCOPED_TRACE(at);
-    Lay(scene);
-    const Store before = Everything();
-    if (!RunKilledAt(at)) break;
-    ExpectSound(before, whole, Everything());
-    EXPECT_NE(Waits("15SEP98.d"), Waits("15SEP98.dX"));
-    if (!Waits("15SEP98.dX")) continue;
-    ++passed;
-    EXPECT_EQ(PricesOf("ORE").size(), 4u);
-  }
-  EXPECT_EQ(passed, 2);  // before ZAP and before OLD; NEW has no prices
-}
-
 // Half a record at the end of a file, as a machine that went down may leave it, is no record.
 TEST_F(FaultTest, AWriteThatIsTornAtTheEndOfAFileIsNoRecord) {
   const Scene scene = [this] { LayAppend(); };
@@ -332,4 +341,98 @@ TEST_F(FaultTest, AWriteThatIsTornAtTheEndOfAFileIsNoRecord) {
   EXPECT_EQ(PricesOf("ORE").size(), 2u);
   ASSERT_EQ(Update(), UpdateEnd::kUpdated);
   EXPECT_EQ(Everything(), whole);
+}
+
+// ---- What a run leaves that dies, and what is done to it meanwhile
+
+TEST_F(FaultTest, AJournalOfADayThatIsInIsSweptByTheNextDay) {
+  Lay([this] { LayAppend(); });
+  ASSERT_TRUE(RunKilledAt(16));  // the journal's removal
+  ASSERT_EQ(Listed(), 0u);
+  ASSERT_TRUE(home.Exists(kJournal));
+  Prices("ORE", {Flat("19980911", 5, 10)});  // edited since: a journal that is done is not redone
+  Download("16SEP98.d", "ORE,19980916,1,2,1,1,11,0\r\nZAP,19980916,3,3,3,3,21,0\r\n");
+  EXPECT_EQ(Update(), UpdateEnd::kUpdated);
+  EXPECT_FALSE(home.Exists(kJournal));
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_EQ(Shown("ORE"), "19980911 5 10; 19980916 1 11");
+}
+
+TEST_F(FaultTest, AnotherDayFinishesTheOneThatWasCutOffFirst) {
+  Lay([this] { LayAppend(); });
+  const Store whole = WholeRun([this] { LayAppend(); });
+  Lay([this] { LayAppend(); });
+  ASSERT_TRUE(RunKilledAt(7));
+  Download("16SEP98.d", "ORE,19980916,9,9,9,9,11,0\r\nZAP,19980916,3,3,3,3,21,0\r\n");
+  EXPECT_EQ(Update("16SEP98.d"), UpdateEnd::kUpdated);
+  EXPECT_TRUE(dialogs.said.empty());
+  EXPECT_TRUE(Waits("15SEP98.dX"));
+  EXPECT_EQ(Shown("ORE"), "19980911 1 10; 19980914 1 12; 19980915 1 11; 19980916 9 11");
+  EXPECT_EQ(Everything().at("korawin/data/NEW1.WDT"), whole.at("korawin/data/NEW1.WDT"));
+}
+
+TEST_F(FaultTest, APriceFileThatWasChangedSinceIsLeftAsItIsAndTold) {
+  Lay([this] { LayAppend(); });
+  ASSERT_TRUE(RunKilledAt(7));  // the name file is written
+  const std::vector<PriceRec> edited{Flat("19980911", 1, 10), Flat("19980914", 77, 10)};
+  Prices("ORE", edited);
+  std::filesystem::remove(home.path() + "/" + kHostData + "ZAP.WDT");
+  EXPECT_EQ(Update(), UpdateEnd::kUpdatedInPart);
+  EXPECT_EQ(Bytes(PricesOf("ORE")), Bytes(edited));
+  EXPECT_FALSE(home.Exists(kHostData + "ZAP.WDT"));
+  EXPECT_EQ(PricesOf("XAD").size(), 3u);
+  EXPECT_NE(LastSaid().find("ORE.WDT was changed since"), std::string::npos) << LastSaid();
+  EXPECT_NE(LastSaid().find("ZAP.WDT was changed since"), std::string::npos) << LastSaid();
+}
+
+// A delivery of the same name with other lines is a day of its own.
+TEST_F(FaultTest, AFileThatWasDeliveredAnewIsAskedAboutAsEver) {
+  Lay([this] { LayAppend(); });
+  ASSERT_TRUE(RunKilledAt(13));  // all of it is written
+  Waiting("ORE,19980915,8,8,8,8,88,0\r\nZAP,19980915,3,3,3,3,21,0\r\n");
+  EXPECT_EQ(Update(), UpdateEnd::kUpdated);
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(LastSaid().substr(0, 40), " There is already data on file with this");
+  EXPECT_EQ(Shown("ORE"), "19980911 1 10; 19980914 1 12; 19980915 8 88");
+}
+
+// What a machine leaves that lost its power: the file has grown, its bytes are zeros or half of
+// the new ones.
+TEST_F(FaultTest, HalfWrittenRecordsOfAPowerCutAreWrittenAgain) {
+  const Store whole = WholeRun([this] { LayInsert(); });
+  for (const char* damage : {"grown", "half", "mixed"}) {
+    Lay([this] { LayInsert(); });
+    const std::string old = home.Get(kHostData + "ORE.WDT");
+    ASSERT_TRUE(RunKilledAt(7));
+    const std::string fresh = whole.at("korawin/data/ORE.WDT");
+    ASSERT_EQ(fresh.size(), old.size() + 50);
+    std::string torn = old + std::string(50, '\0');
+    if (damage[0] == 'h') torn.replace(0, 120, fresh, 0, 120);
+    if (damage[0] == 'm')
+      for (size_t i = 0; i < torn.size(); i += 3) torn[i] = fresh[i];
+    home.Put(kHostData + "ORE.WDT", torn);
+    EXPECT_EQ(Update(), UpdateEnd::kUpdated) << damage;
+    EXPECT_TRUE(dialogs.said.empty()) << damage;
+    EXPECT_TRUE(Everything() == whole) << damage;
+  }
+}
+
+TEST_F(FaultTest, AJournalThatIsCutShortOrDamagedCountsAsNone) {
+  Lay([this] { LayAppend(); });
+  ASSERT_TRUE(RunKilledAt(7));
+  const std::string journal = home.Get(kJournal);
+  ASSERT_GT(journal.size(), 100u);
+  for (size_t size = 0; size < journal.size(); size += 7) {
+    home.Put(kJournal, journal.substr(0, size));
+    EXPECT_FALSE(ReadEditJournal(home.files(), kSystem + "Update.Jnl")) << size;
+  }
+  for (size_t at = 0; at < journal.size(); at += 5) {
+    std::string damaged = journal;
+    damaged[at] = char(damaged[at] ^ 0x41);
+    home.Put(kJournal, damaged);
+    EXPECT_FALSE(ReadEditJournal(home.files(), kSystem + "Update.Jnl")) << at;
+  }
+  // Without a journal the day's data are found on file and asked about, or none of them were.
+  EXPECT_EQ(Update(), UpdateEnd::kUpdated);
+  EXPECT_FALSE(home.Exists(kJournal));
 }

@@ -12,9 +12,7 @@ class DownloadListTest : public UpdateFixture {
   void Wait(const std::vector<std::string>& names) {
     for (const std::string& name : names) Download(name, name);
   }
-  ListResult List() {
-    return BuildDownloadList(home.files(), settings.download, dialogs, entries);
-  }
+  ListResult List() { return BuildDownloadList(home.files(), settings.download, dialogs, entries); }
   // Service 4 with this form of names.
   DownloadEntries Renamed(const std::string& form, const std::vector<std::string>& names) {
     settings.download.DataService = 4;

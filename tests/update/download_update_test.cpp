@@ -2,8 +2,8 @@
 
 #include "base/record_file.h"
 #include "tests/support/mutate.h"
-#include "update/price_write.h"
 #include "tests/update/update_fixture.h"
+#include "update/price_write.h"
 
 using namespace kora;
 using namespace kora::test;
@@ -29,7 +29,8 @@ TEST_F(DownloadUpdate, AppendsARecordAndTakesTheFileOffTheList) {
   EXPECT_EQ(Take("ORE,19980915,1,2,0.5,1.5,1234,0\r\n"), UpdateEnd::kUpdated);
   const auto recs = PricesOf("ORE");
   ASSERT_EQ(recs.size(), 2u);
-  EXPECT_EQ(Bytes(std::vector{recs[1]}), Bytes(std::vector{Day("19980915", 1, 2, 0.5f, 1.5f, 1234)}));
+  EXPECT_EQ(Bytes(std::vector{recs[1]}),
+            Bytes(std::vector{Day("19980915", 1, 2, 0.5f, 1.5f, 1234)}));
   EXPECT_FALSE(Waits("15SEP98.d"));
   EXPECT_TRUE(Waits("15SEP98.dX"));
   EXPECT_TRUE(entries.empty());
@@ -140,11 +141,13 @@ TEST_F(DownloadUpdate, ReplacesTheSameDateAfterOk) {
   ASSERT_EQ(Take("ORE,19980915,1,2,0.5,1.5,100,0\nZAP,19980915,3,3,3,3,3,0\n"),
             UpdateEnd::kUpdated);
   EXPECT_EQ(LastTitle(), kData);
-  EXPECT_EQ(LastSaid(), " There is already data on file with this date\n"
-                        "  New data will replace the old data");
+  EXPECT_EQ(LastSaid(),
+            " There is already data on file with this date\n"
+            "  New data will replace the old data");
   const auto recs = PricesOf("ORE");
   ASSERT_EQ(recs.size(), 2u);
-  EXPECT_EQ(Bytes(std::vector{recs[1]}), Bytes(std::vector{Day("19980915", 1, 2, 0.5f, 1.5f, 100)}));
+  EXPECT_EQ(Bytes(std::vector{recs[1]}),
+            Bytes(std::vector{Day("19980915", 1, 2, 0.5f, 1.5f, 100)}));
   EXPECT_EQ(Shown("ZAP"), "19980915 3 3");
 }
 
@@ -163,9 +166,10 @@ TEST_F(DownloadUpdate, InsertsInOrderOfDate) {
                  Flat("19980917", 4, 4)});
   Prices("ZAP", {Flat("19980911", 1, 1), Flat("19980914", 2, 2)});
   ASSERT_EQ(Take(kBothDays), UpdateEnd::kUpdated);
-  EXPECT_EQ(LastSaid(), " There is already data on file LATER than this date\n"
-                        " This procedure will insert the data in the correct position \n"
-                        " The update will take a little longer than usual");
+  EXPECT_EQ(LastSaid(),
+            " There is already data on file LATER than this date\n"
+            " This procedure will insert the data in the correct position \n"
+            " The update will take a little longer than usual");
   EXPECT_EQ(Shown("ORE"), "19980910 1 0; 19980911 1 1; 19980915 1 100; 19980916 3 3; 19980917 4 4");
   EXPECT_EQ(Shown("ZAP"), "19980911 1 1; 19980914 2 2; 19980915 3 200");
 }
@@ -173,8 +177,9 @@ TEST_F(DownloadUpdate, InsertsInOrderOfDate) {
 TEST_F(DownloadUpdate, ReplacesADateBeforeTheLast) {
   Prices("ORE", {Flat("19980911", 1, 1), Flat("19980915", 9, 9), Flat("19980917", 4, 4)});
   ASSERT_EQ(Take(kBothDays), UpdateEnd::kUpdated);
-  EXPECT_EQ(LastSaid(), " There is already data on file for this date\n"
-                        "  New data will replace the old data");
+  EXPECT_EQ(LastSaid(),
+            " There is already data on file for this date\n"
+            "  New data will replace the old data");
   EXPECT_EQ(Shown("ORE"), "19980911 1 1; 19980915 1 100; 19980917 4 4");
 }
 
@@ -205,7 +210,9 @@ TEST(FindPlaceTest, FollowsTheTableOfDates) {
     std::vector<PriceRec> recs;
     for (const std::string& d : dates) recs.push_back(Flat(d, 1));
     home.Put("drive_c/A.WDT", Bytes(recs));
-    const RecordPlace p = FindPlace(PriceFile(home.files(), "c:\\A.WDT"), date, std::int16_t(mode));
+    StagedPrices staged;
+    const PriceView file(home.files(), "c:\\A.WDT", true, staged);
+    const RecordPlace p = FindPlace(file, date, std::int16_t(mode));
     return std::to_string(p.position) + (p.overwrite ? "=" : "<");
   };
   EXPECT_EQ(place({"19980910", "19980912"}, "19980909", 1), "1<");  // before all
@@ -256,15 +263,16 @@ TEST_F(DownloadUpdate, AnInsertedTotalRunsOnToTheEnd) {
   ASSERT_EQ(Take("XAD,19980915,0,10,4,0,0,0\nXAD,19980914,0,9,5,0,0,0\n"), UpdateEnd::kUpdated);
   // Inserted: 1 + 10 - 4 = 7, then 7 + 6 - 1 = 12. The second line is inserted behind the 11th:
   // 2 + 9 - 5 = 6, 6 + 4 - 5 = 5, 5 + 10 - 4 = 11, 11 + 6 - 1 = 16.
-  EXPECT_EQ(Shown("XAD"), "19980910 0 0; 19980911 2 0; 19980914 6 0; 19980914 5 0; 19980915 11 0; "
-                          "19980916 16 0");
+  EXPECT_EQ(Shown("XAD"),
+            "19980910 0 0; 19980911 2 0; 19980914 6 0; 19980914 5 0; 19980915 11 0; "
+            "19980916 16 0");
 }
 
 TEST_F(DownloadUpdate, AReplacedTotalRunsOnToTheEnd) {
   settings.download.DataService = 1;
   Names({Security("XAD", 1, kAdvanceDecline)});
-  Prices("XAD", {Day("19980911", 0, 5, 3, 2), Day("19980915", 3, 4, 5, 1),
-                 Day("19980916", 0, 6, 1, 6)});
+  Prices("XAD",
+         {Day("19980911", 0, 5, 3, 2), Day("19980915", 3, 4, 5, 1), Day("19980916", 0, 6, 1, 6)});
   ASSERT_EQ(Take("XAD,19980915,0,10,4,0,12,0\n,19980915,,,,,,\n"), UpdateEnd::kUpdated);
   EXPECT_EQ(Shown("XAD"), "19980911 2 0; 19980915 8 12; 19980916 13 0");  // 2+10-4, 8+6-1
   EXPECT_EQ(float(PricesOf("XAD")[1].Open), 3);
@@ -340,7 +348,7 @@ TEST_F(DownloadUpdate, AFileThatIsGoneIsToldAndNothingIsFinished) {
   entries = {"15SEP98.d"};
   EXPECT_EQ(UpdateOneDay(Run(), entries, 0), UpdateEnd::kNotBegun);
   EXPECT_EQ(LastTitle(), "Update");
-  EXPECT_EQ(LastSaid(), "File does not exist");
+  EXPECT_EQ(LastSaid(), "File does not exist\nc:\\korawin\\download\\15SEP98.d");
   EXPECT_EQ(entries, DownloadEntries{"15SEP98.d"});
   EXPECT_EQ(display.states, (std::vector<std::string>{"Updating ", ""}));
 }
@@ -401,13 +409,23 @@ TEST_F(DownloadUpdate, HostileLinesAreRefusedBeforeAnythingIsWritten) {
   const std::string good = "ORE,19980915,1,1,1,1,1,0\n";
   const std::string rest = ",19980915,1,1,1,1,1,0\n";
   using std::string_literals::operator""s;
-  const std::vector<std::string> bad = {
-      "..\\..\\X" + rest, "../X" + rest,    "A:B" + rest, "C*" + rest,  "NUL" + rest,
-      "COM1" + rest,      "\xFF\xFE" + rest, "A B" + rest, "..." + rest, "A\0B"s + rest,
-      "A,1998091,1,1,1,1,1,0\n", "A,19980231,1,1,1,1,1,0\n", "A,date,1,1,1,1,1,0\n",
-      "A,19980915,1" + std::string(50, '0') + ",1,1,1,1,0\n",
-      "A,19980915,1,1,1,1,2147483648,0\n", "A,19980915,1,1,1,1,1,-9999999999\n",
-      std::string(1 << 20, 'A') + ",19980915,1,1,1,1,\0,0\n"s};
+  const std::vector<std::string> bad = {"..\\..\\X" + rest,
+                                        "../X" + rest,
+                                        "A:B" + rest,
+                                        "C*" + rest,
+                                        "NUL" + rest,
+                                        "COM1" + rest,
+                                        "\xFF\xFE" + rest,
+                                        "A B" + rest,
+                                        "..." + rest,
+                                        "A\0B"s + rest,
+                                        "A,1998091,1,1,1,1,1,0\n",
+                                        "A,19980231,1,1,1,1,1,0\n",
+                                        "A,date,1,1,1,1,1,0\n",
+                                        "A,19980915,1" + std::string(50, '0') + ",1,1,1,1,0\n",
+                                        "A,19980915,1,1,1,1,2147483648,0\n",
+                                        "A,19980915,1,1,1,1,1,-9999999999\n",
+                                        std::string(1 << 20, 'A') + ",19980915,1,1,1,1,\0,0\n"s};
   for (const std::string& line : bad) {
     Download("15SEP98.d", good + line + good);
     const auto before = Everything();
@@ -427,8 +445,8 @@ TEST_F(DownloadUpdate, TextOfAnotherEncodingIsRefused) {
   }
   std::string carriage = kBothDays;
   std::erase(carriage, '\n');  // CR alone: one line of 14 commas
-  for (const std::string& text : {utf16, carriage, std::string("no data at all\n"),
-                                  std::string(1 << 20, ',')}) {
+  for (const std::string& text :
+       {utf16, carriage, std::string("no data at all\n"), std::string(1 << 20, ',')}) {
     Download("15SEP98.d", text);
     const auto before = Everything();
     EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kAbandoned);
@@ -438,8 +456,7 @@ TEST_F(DownloadUpdate, TextOfAnotherEncodingIsRefused) {
 }
 
 TEST_F(DownloadUpdate, TakesALineOfAMegabyte) {
-  ASSERT_EQ(Take("ORE" + std::string(1 << 20, 'E') + ",19980915,1,1,1,1,1,0"),
-            UpdateEnd::kUpdated);
+  ASSERT_EQ(Take("ORE" + std::string(1 << 20, 'E') + ",19980915,1,1,1,1,1,0"), UpdateEnd::kUpdated);
   EXPECT_EQ(Shown("OREEEE"), "19980915 1 1");
 }
 
@@ -453,19 +470,131 @@ TEST_F(DownloadUpdate, TakesTwoHundredThousandLines) {
   EXPECT_EQ(int(PricesOf("C3").back().Volume), 199993);
 }
 
-TEST_F(DownloadUpdate, APriceFileDoesNotGrowBeyondWhatChartsCanNumber) {
-  Prices("ORE", std::vector<PriceRec>(32767, Flat("19980914", 1)));
-  EXPECT_EQ(Take("ORE,19980915,1,1,1,1,1,0\n"), UpdateEnd::kStopped);
-  EXPECT_EQ(LastTitle(), "Error");
-  EXPECT_EQ(LastSaid(), "There is an unexpected error - Overflow");
+TEST_F(DownloadUpdate, AFullPriceFileIsNamedAndTheRestOfTheDayIsTaken) {
+  const std::vector<PriceRec> full(32767, Flat("19980914", 1));
+  Names({Security("ORE"), Security("ZAP"), Security("FLAT"), Security("IDLE")});
+  for (const char* code : {"ORE", "FLAT"}) Prices(code, full);
+  Prices("IDLE", {Flat("19980914", 7)});
+  EXPECT_EQ(Take(kBothDays), UpdateEnd::kUpdatedInPart);
+  EXPECT_EQ(LastTitle(), "Data Update");
+  EXPECT_EQ(LastSaid(),
+            "Not everything was taken in as it stands:\n"
+            "15SEP98.d\n"
+            " left out: ORE: its price file is full, with 32767 days\n"
+            " left out: FLAT: its price file is full, with 32767 days");
+  EXPECT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(PricesOf("ORE").size(), 32767u);
+  EXPECT_EQ(PricesOf("FLAT").size(), 32767u);
+  EXPECT_EQ(Shown("ZAP"), "19980915 3 200");
+  EXPECT_EQ(Shown("IDLE"), "19980914 7 0; 19980915 7 0");
+  EXPECT_FALSE(Waits("15SEP98.d"));
+}
+
+TEST_F(DownloadUpdate, AFullPriceFileStillTakesADateThatIsThere) {
+  std::vector<PriceRec> full(32767, Flat("19980914", 1));
+  full.back() = Flat("19980915", 1);
+  Prices("ORE", full);
+  EXPECT_EQ(Take(kBothDays), UpdateEnd::kUpdated);
+  EXPECT_EQ(int(PricesOf("ORE").back().Volume), 100);
+}
+
+TEST_F(DownloadUpdate, AFullNameFileLeavesNewCodesOutAndTakesTheRest) {
+  std::vector<NameRec> names(32767, Security("ZZZ"));
+  names[0] = Security("ORE");
+  Names(names);
+  Prices("ORE", {Flat("19980914", 1)});
+  EXPECT_EQ(Take(kBothDays), UpdateEnd::kUpdatedInPart);
+  EXPECT_EQ(LastSaid(),
+            "Not everything was taken in as it stands:\n"
+            "15SEP98.d\n"
+            " left out: ZAP: the name file is full, with 32767 names");
+  EXPECT_EQ(NamesOf().size(), 32767u);
+  EXPECT_FALSE(home.Exists(kHostData + "ZAP.WDT"));
+  EXPECT_EQ(Shown("ORE"), "19980914 1 0; 19980915 1 100");
+}
+
+TEST_F(DownloadUpdate, TooManyNamesAreTold) {
+  Names(std::vector<NameRec>(32768, Security("ZZZ")));
+  EXPECT_EQ(Take(kBothDays), UpdateEnd::kStopped);
+  EXPECT_EQ(LastSaid(),
+            "There is an unexpected error - Overflow\n"
+            "c:\\korawin\\data\\: 32768 names, and 32767 at most");
   EXPECT_TRUE(Waits("15SEP98.d"));
+}
+
+TEST_F(DownloadUpdate, ATotalThatLeavesItsRangeIsLeftOut) {
+  settings.download.DataService = 1;
+  Names({Security("XAD", 1, kAdvanceDecline), Security("ORE")});
+  Prices("XAD", {Day("19980914", 0, 4, 5, 3e38f)});
+  Prices("ORE", {Flat("19980914", 1)});
+  EXPECT_EQ(Take("XAD,19980915,0,300000000000000000000000000000000000000,0,0,0,0\n" + kBothDays),
+            UpdateEnd::kUpdatedInPart);
+  EXPECT_EQ(PricesOf("XAD").size(), 1u);
+  EXPECT_EQ(PricesOf("ORE").size(), 2u);
+  EXPECT_NE(LastSaid().find(" left out: XAD: its total leaves the range of its field"),
+            std::string::npos);
+}
+
+TEST_F(DownloadUpdate, FieldsThatAreNoNumbersAreReadByTheirLeadingPartAndTold) {
+  ASSERT_EQ(Take("ORE,19980915,1.2x,abc,0.5,,1E5,0\r\nZAP,19980915,,,,3,,\r\n"),
+            UpdateEnd::kUpdated);
+  const auto recs = PricesOf("ORE");
+  EXPECT_EQ(float(recs[0].Open), 1.2f);
+  EXPECT_EQ(float(recs[0].High), 0);
+  EXPECT_EQ(float(recs[0].Close), 0);
+  EXPECT_EQ(int(recs[0].Volume), 1);
+  EXPECT_EQ(LastSaid(),
+            "Not everything was taken in as it stands:\n"
+            "15SEP98.d\n"
+            " line 1, ORE: Open \"1.2x\" read as 1.2\n"
+            " line 1, ORE: High \"abc\" read as 0\n"
+            " line 1, ORE: Close \"\" read as 0\n"
+            " line 1, ORE: Volume \"1E5\" read as 1");
+}
+
+TEST_F(DownloadUpdate, ManyRemarksAreCountedBehindTheFirstTwenty) {
+  std::string text;
+  for (int i = 0; i < 30; ++i) text += "ORE,19980915,1,1,1,x,1,0\n";
+  ASSERT_EQ(Take(text), UpdateEnd::kUpdated);
+  EXPECT_TRUE(LastSaid().ends_with("line 20, ORE: Close \"x\" read as 0\n and 10 more"));
+}
+
+TEST_F(DownloadUpdate, ACodeKeepsItsCase) {
+  Names({Security("ORE")});
+  Prices("ORE", {Flat("19980914", 1)});
+  ASSERT_EQ(Take("ore,19980915,2,2,2,2,20,0\nnew,19980915,3,3,3,3,30,0\n"
+                 "prn,19980915,4,4,4,4,40,0\n"),
+            UpdateEnd::kUpdated);
+  EXPECT_EQ(Shown("ORE"), "19980914 1 0; 19980915 2 20");  // names of files match in any case
+  const auto names = NamesOf();
+  ASSERT_EQ(names.size(), 3u);
+  EXPECT_EQ(names[1].Code.raw(), "new   ");
+  EXPECT_TRUE(home.Exists(kHostData + "new.WDT"));
+  EXPECT_EQ(names[2].Code.raw(), "PRNX  ");
+}
+
+TEST_F(DownloadUpdate, CodesInLowerCaseAreNotThoseOfTheUpdateList) {
+  settings.download.UpdateAll = false;
+  home.Put(kHostSystem + "Update.Lst", "zap,1,Zap Ltd\r\n");
+  ASSERT_EQ(Take("zap,19980915,3,3,3,3,200,0\nZAP,19980915,3,3,3,3,300,0\n"), UpdateEnd::kUpdated);
+  EXPECT_EQ(Shown("ZAP"), "19980915 3 300");
+}
+
+TEST_F(DownloadUpdate, ServiceOneLooksCodesUpAsTheyAre) {
+  settings.download.DataService = 1;
+  Names({Security("XAD", 1, kAdvanceDecline)});
+  Prices("XAD", {Day("19980914", 0, 4, 5, 1)});
+  current.Rec = Security("ANY");
+  ASSERT_EQ(Take("xad,19980915,1,10,4,7,5,0\n"), UpdateEnd::kUpdated);
+  EXPECT_EQ(float(PricesOf("XAD")[1].Close), 7);  // not found: of the kind last held
 }
 
 TEST_F(DownloadUpdate, AMissingFolderIsTold) {
   settings.paths.CurrentDataPath = "c:\\nowhere\\";
   EXPECT_EQ(Take(kBothDays), UpdateEnd::kStopped);
-  EXPECT_EQ(LastSaid(), "There is a file access problem. Check directory paths option.");
+  EXPECT_EQ(LastSaid(),
+            "There is a file access problem. Check directory paths option.\nc:\\nowhere\\: "
+            "No such file or directory");
 }
 
 // ---- Several days
@@ -499,33 +628,37 @@ TEST_F(DownloadUpdate, ARefusedDateDoesNotEndUpdateAll) {
   Download("30SEP98.d", "no data at all");
   Download("01OCT98.d", "ORE,19981001,2,2,2,2,2,0\n");
   EXPECT_EQ(Update(), UpdateEnd::kAbandoned);
+  EXPECT_EQ(dialogs.said.size(), 2u);
+  EXPECT_EQ(LastSaid(),
+            "Not everything was taken in as it stands:\n"
+            "30SEP98.d\n not taken in: an incorrect number of fields");
   EXPECT_EQ(Shown("ORE"), "19981001 2 2");
   EXPECT_TRUE(Waits("30SEP98.d"));
 }
 
-TEST_F(DownloadUpdate, AskingToStopInTheMiddleStops) {
+TEST_F(DownloadUpdate, AFileThatIsStoppedInTheMiddleLeavesEverything) {
+  Download("15SEP98.d", kBothDays);
+  const auto before = Everything();
   display.stopAt = 2;
   dialogs.answers = {Answer::kYes};
-  EXPECT_EQ(Take(kBothDays), UpdateEnd::kStopped);
+  EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kStopped);
   EXPECT_EQ(LastSaid(), "The update is not finished. Stop it ?");
-  EXPECT_EQ(Shown("ORE"), "19980915 1 100");
-  EXPECT_FALSE(home.Exists(kHostData + "ZAP.WDT"));
-  EXPECT_TRUE(Waits("15SEP98.d"));
+  EXPECT_EQ(Everything(), before);
+  EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
+  EXPECT_EQ(dialogs.said.size(), 1u);
 }
 
-TEST_F(DownloadUpdate, StoppingAmongTheFlatRecordsIsDoneBehindThem) {
+TEST_F(DownloadUpdate, StoppingAmongTheFlatRecordsLeavesTheDay) {
   Names({Security("ORE"), Security("ZAP"), Security("OLD")});
   for (const char* code : {"ORE", "ZAP", "OLD"}) Prices(code, {Flat("19980914", 1)});
   Download("16SEP98.d", "ORE,19980916,1,1,1,1,1,0\n");
   Download("15SEP98.d", "ORE,19980915,1,1,1,1,1,0\n");
-  display.stopAt = 2;  // the first share of the pass
+  const auto before = Everything();
+  display.stopAt = 3;  // the second share of the pass
   dialogs.answers = {Answer::kYes};
   EXPECT_EQ(Update(), UpdateEnd::kStopped);
   EXPECT_EQ(dialogs.said.size(), 1u);
-  EXPECT_EQ(Shown("ZAP"), "19980914 1 0; 19980915 1 0");
-  EXPECT_EQ(Shown("OLD"), "19980914 1 0; 19980915 1 0");
-  EXPECT_TRUE(Waits("15SEP98.dX"));
-  EXPECT_TRUE(Waits("16SEP98.d"));
+  EXPECT_EQ(Everything(), before);
 }
 
 TEST_F(DownloadUpdate, NoToStoppingGoesOn) {
@@ -562,9 +695,10 @@ TEST_F(WholeMarket, EachFileGoesToItsOwnFolder) {
   Download("15SEP98.das", "SUM,19980915,1,1,1,1,1,0\n");
   Download("15SEP98.dix", "XAO,19980915,2,2,2,2,2,0\n");
   Download("15SEP98.dov", "DJI,19980915,3,3,3,3,3,0\n");
-  Download("15SEP98.dsu", "ABCEXX,19980915,4,4,4,4,4,0\nABCIXX,19980915,4,4,4,4,4,0\n"
-                          "ABCWXX,19980915,4,4,4,4,4,0\nABCDXX,19980915,4,4,4,4,4,0\n"
-                          "ABC,19980915,4,4,4,4,4,0\n");
+  Download("15SEP98.dsu",
+           "ABCEXX,19980915,4,4,4,4,4,0\nABCIXX,19980915,4,4,4,4,4,0\n"
+           "ABCWXX,19980915,4,4,4,4,4,0\nABCDXX,19980915,4,4,4,4,4,0\n"
+           "ABC,19980915,4,4,4,4,4,0\n");
   Download("15SEP98.dsf", "SPI,19980915,5,5,5,5,5,0\n");
   Download("15SEP98.dop", "BHPAA,19980915,6,6,6,6,6,10,P\n");
   ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
@@ -602,8 +736,11 @@ TEST_F(WholeMarket, PassesOnOverAFileWithoutData) {
   Download("15SEP98.das", "");
   Download("15SEP98.dsf", "SPI,19980915,5,5,5,5,5,0\n");
   EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
-  EXPECT_EQ(LastSaid(), "There is no data in 15SEP98.das\n"
-                        "Use Update The Lot in KORA/Tarvo Download to reprocess");
+  EXPECT_EQ(dialogs.said.at(0).text,
+            "There is no data in 15SEP98.das\n"
+            "Use Update The Lot in KORA/Tarvo Download to reprocess");
+  EXPECT_EQ(LastSaid(),
+            "Not everything was taken in as it stands:\n15SEP98.das\n not taken in: no data");
   EXPECT_EQ(Shown("SPI", dosOf("sfe")), "19980915 5 5");
 }
 
@@ -611,15 +748,19 @@ TEST_F(WholeMarket, ARefusedFileStaysListedAndTheOthersAreTaken) {
   Download("15SEP98.dop", "BHPAA,19980915,6,6,6,6,6,10\n");  // a field short
   Download("15SEP98.dsf", "SPI,19980915,5,5,5,5,5,0\n");
   EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kAbandoned);
-  EXPECT_NE(LastSaid().find(" code,date,open,high,low,close,vol,days,OptType\n"),
+  EXPECT_NE(dialogs.said.at(0).text.find(" code,date,open,high,low,close,vol,days,OptType\n"),
             std::string::npos);
+  EXPECT_EQ(LastSaid(),
+            "Not everything was taken in as it stands:\n"
+            "15SEP98.dop\n not taken in: an incorrect number of fields");
   EXPECT_EQ(Shown("SPI", dosOf("sfe")), "19980915 5 5");
   EXPECT_TRUE(Waits("15SEP98.d"));
   EXPECT_EQ(entries, DownloadEntries{"15SEP98.d"});
 }
 
 TEST_F(WholeMarket, WantsAllFolders) {
-  home.Put(kHostSystem + "WMPaths.lst", "c:\\a\\\r\n\r\nc:\\a\\\r\nc:\\a\\\r\nc:\\a\\\r\n0\r\nc:\\a\\\r\n");
+  home.Put(kHostSystem + "WMPaths.lst",
+           "c:\\a\\\r\n\r\nc:\\a\\\r\nc:\\a\\\r\nc:\\a\\\r\n0\r\nc:\\a\\\r\n");
   EXPECT_EQ(Update("15SEP98.d"), UpdateEnd::kNotBegun);
   EXPECT_EQ(LastTitle(), "W/M Paths");
   EXPECT_EQ(LastSaid(),
@@ -668,18 +809,18 @@ TEST_F(WholeMarket, TellsWhatItIsDoing) {
   Download("15SEP98.das", "SUM,19980915,1,1,1,1,1,0\n");
   Download("15SEP98.dsf", "SPI,19980915,5,5,5,5,5,0\n");
   ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
-  EXPECT_EQ(display.states, (std::vector<std::string>{"Updating ASX ", "Updating FUTURES ",
-                                                      "Checking no-trades", "Updated", "FINISHED"}));
+  EXPECT_EQ(display.states,
+            (std::vector<std::string>{"Updating ASX ", "Updating FUTURES ", "Checking no-trades",
+                                      "Updated", "FINISHED"}));
   EXPECT_EQ(display.targets, (std::vector<std::string>{dosOf("sum"), dosOf("sfe")}));
-  EXPECT_EQ(display.firsts,
-            (std::vector<std::string>{" Updating  15SEP98.das", " Updating  SUM",
-                                      " Updating  15SEP98.dsf", " Updating  SPI", "",
-                                      " Checking OLD", ""}));
+  EXPECT_EQ(display.firsts, (std::vector<std::string>{" Updating  15SEP98.das", " Updating  SUM",
+                                                      " Updating  15SEP98.dsf", " Updating  SPI",
+                                                      "", " Checking OLD", ""}));
   EXPECT_EQ(display.seconds,
             (std::vector<std::string>{
-                "", " Checking file format - wait", " Data OK - updating", " Created record for SUM",
-                " Checking file format - wait", " Data OK - updating", " Created record for SPI",
-                " Checking stocks not traded",
+                "", " Checking file format - wait", " Data OK - updating",
+                " Created record for SUM", " Checking file format - wait", " Data OK - updating",
+                " Created record for SPI", " Checking stocks not traded",
                 " Data files updated with c:\\korawin\\download\\15SEP98.dsf", ""}));
 }
 
@@ -691,8 +832,7 @@ TEST_F(WholeMarket, ExtraStocksIndicesAndOverseasHaveNoNoTradePass) {
   for (const char* ext : {"das", "dix", "dov", "dsf"})
     Download(std::string("15SEP98.") + ext, "NEW,19980915,6,6,6,6,6,0\n");
   ASSERT_EQ(Update("15SEP98.d"), UpdateEnd::kUpdated);
-  for (const char* n : {"sum", "idx", "ovs"})
-    EXPECT_EQ(PricesOf("OLD", dosOf(n)).size(), 1u) << n;
+  for (const char* n : {"sum", "idx", "ovs"}) EXPECT_EQ(PricesOf("OLD", dosOf(n)).size(), 1u) << n;
   EXPECT_EQ(PricesOf("OLD", dosOf("sfe")).size(), 2u);
 }
 

@@ -1,6 +1,8 @@
 #include "update/import_history.h"
 
 #include <gtest/gtest.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 #include <filesystem>
 #include <map>
@@ -11,6 +13,7 @@
 #include "store/name_file.h"
 #include "store/price_rec.h"
 #include "tests/support/failing_io.h"
+#include "tests/support/records.h"
 #include "tests/support/scripted_dialogs.h"
 #include "tests/support/temp_home.h"
 
@@ -31,7 +34,10 @@ class ImportTest : public ::testing::Test {
     return home.path() + "/in/" + name;
   }
   bool Import(const std::string& name, std::string_view text, const ImportOptions& options = {}) {
-    return ImportHistory(home.files(), kData, Source(name, text), options, dialogs, counts);
+    return Import({Source(name, text)}, options);
+  }
+  bool Import(const std::vector<std::string>& sources, const ImportOptions& options = {}) {
+    return ImportHistory(home.files(), kData, sources, options, dialogs, counts);
   }
   std::vector<PriceRec> Prices(const std::string& code) {
     return PriceFile(home.files(), kData + code + ".WDT").ReadAll();
@@ -260,8 +266,7 @@ TEST_F(ImportTest, SortsTheNameFileAndGivesTheListsTheNewNumbers) {
 TEST_F(ImportTest, ABadRowLeavesAllSecuritiesOfTheFileAsTheyWere) {
   ASSERT_TRUE(Import("A.csv", "Date,Close\n20240101,1\n"));
   counts = {};
-  const char* text =
-      "Code,Date,Close\nA,20240102,2\nB,20240102,2\nA,20240230,2\nA,20240103,abc\n";
+  const char* text = "Code,Date,Close\nA,20240102,2\nB,20240102,2\nA,20240230,2\nA,20240103,abc\n";
   ExpectRefused("x.csv", text, "x.csv line 4: the Date \"20240230\"");
   EXPECT_EQ(counts.Refused, 4);
   EXPECT_EQ(counts.Added, 0);
@@ -298,7 +303,11 @@ TEST_F(ImportTest, FilesThatAreNoHistoryAreRefused) {
   ExpectRefused("a.csv", "Date,Close\n", "no rows");
   ExpectRefused("a.csv", "hello\n", "line 1: neither");
   ExpectRefused("a.csv", "Date,Open\n20240102,1\n", "no Close column");
-  ExpectRefused("a.csv", std::string("\xFF\xFE" "D\0a\0", 6), "no plain text");
+  ExpectRefused("a.csv",
+                std::string("\xFF\xFE"
+                            "D\0a\0",
+                            6),
+                "no plain text");
   ExpectRefused("a.csv", std::string("Date,Close\n2024\0,1\n", 18), "no plain text");
   ExpectRefused("a.csv", std::string(2'000'000, 'x'), "line 1: neither");
   ExpectRefused("a.csv", "Date,Close\n20240102," + std::string(2'000'000, '1') + "\n",
@@ -307,12 +316,12 @@ TEST_F(ImportTest, FilesThatAreNoHistoryAreRefused) {
   options.SkipBad = true;
   ExpectRefused("a.csv", "Date,Close\nx,1\n", "no row can be read", options);
   std::filesystem::create_directory(home.path() + "/folder.csv");
-  EXPECT_FALSE(ImportHistory(home.files(), kData, home.path() + "/folder.csv", {}, dialogs, counts));
-  EXPECT_FALSE(ImportHistory(home.files(), kData, home.path() + "/absent.csv", {}, dialogs, counts));
+  EXPECT_FALSE(Import({home.path() + "/folder.csv"}));
+  EXPECT_FALSE(Import({home.path() + "/absent.csv"}));
   // A file of 257 million bytes that takes no room on the disk.
   const std::string huge = Source("huge.csv", "");
   std::filesystem::resize_file(huge, 257u << 20);
-  EXPECT_FALSE(ImportHistory(home.files(), kData, huge, {}, dialogs, counts));
+  EXPECT_FALSE(Import({huge}));
   EXPECT_EQ(DataFiles().size(), 1u);
 }
 
@@ -354,12 +363,13 @@ TEST_F(ImportTest, EveryFailureOfTheDiskLeavesEveryFileAsItWas) {
   const auto before = DataFiles();
   // Changes two price files, makes two new ones, the name file and the list anew.
   const std::string source =
-      Source("m.csv", "Code,Date,Close\nBBB,20240102,2\nDDD,20240101,3\nAAA,20240102,1\n"
-                      "CCC,20240102,1\n");
+      Source("m.csv",
+             "Code,Date,Close\nBBB,20240102,2\nDDD,20240101,3\nAAA,20240102,1\n"
+             "CCC,20240102,1\n");
   int failures = 0;
   for (int at = 1; at < 200; ++at) {
     io.Reset(at);
-    const bool done = ImportHistory(home.files(), kData, source, {}, dialogs, counts);
+    const bool done = Import({source});
     if (io.calls < at) {
       EXPECT_TRUE(done);
       break;
@@ -369,8 +379,9 @@ TEST_F(ImportTest, EveryFailureOfTheDiskLeavesEveryFileAsItWas) {
     ++failures;
   }
   io.Reset();
-  // Six files: each opened, written, flushed, renamed.
-  EXPECT_EQ(failures, 24);
+  // Six files: each opened, written, flushed, renamed, those that replace one given its access and
+  // the old one kept aside; the journal of the set opened, written, flushed; the folder flushed.
+  EXPECT_EQ(failures, 6 * 4 + 4 * 2 + 3 + 1);
   EXPECT_EQ(Names().size(), 4u);
 }
 
@@ -379,7 +390,7 @@ TEST_F(ImportTest, ACutOffLeavesEachFileOldOrNewAndNoNameWithoutItsFile) {
   io.lasting = true;
   for (int at = 1; at < 200; ++at) {
     io.Reset(at);
-    const bool done = ImportHistory(home.files(), kData, source, {}, dialogs, counts);
+    const bool done = Import({source});
     io.Reset();
     if (done) break;
     for (const NameRec& name : Names())
@@ -391,4 +402,155 @@ TEST_F(ImportTest, ACutOffLeavesEachFileOldOrNewAndNoNameWithoutItsFile) {
     }
   }
   EXPECT_EQ(Names().size(), 2u);
+}
+
+// ---- Several files of one command
+
+TEST_F(ImportTest, TheFilesOfOneCommandAreTakenTogether) {
+  EXPECT_TRUE(Import({Source("a.csv", "Code,Date,Close\nAAA,20240102,1\nBBB,20240102,2\n"),
+                      Source("b.csv", "Code,Date,Close\nBBB,20240103,3\nCCC,20240102,4\n")}));
+  EXPECT_EQ(Names().size(), 3u);
+  EXPECT_EQ(Prices("BBB").size(), 2u);
+  EXPECT_EQ(counts.Codes.size(), 3u);
+  EXPECT_EQ(counts.Added, 4);
+}
+
+TEST_F(ImportTest, ARowOfALaterFileTakesThePlaceOfAnEarlierOne) {
+  EXPECT_TRUE(Import({Source("AAA.csv", "Date,Close\n20240103,1\n20240102,1\n"),
+                      Source("x.csv", "Code,Date,Close\nAAA,20240102,7\n")}));
+  ASSERT_EQ(Prices("AAA").size(), 2u);
+  EXPECT_EQ(float(Prices("AAA")[0].Close), 7);
+  EXPECT_EQ(counts.Added, 2);
+  EXPECT_EQ(counts.Replaced, 1);
+}
+
+TEST_F(ImportTest, ARefusedFileLeavesTheOthersOfTheCommand) {
+  EXPECT_FALSE(Import({Source("a.csv", "Code,Date,Close\nAAA,20240102,1\n"),
+                       Source("b.csv", "Code,Date,Close\nBBB,20240102,1\nAAA,20240103,x\n"),
+                       Source("c.csv", "Code,Date,Close\nCCC,20240102,1\n")}));
+  EXPECT_EQ(Names().size(), 2u);
+  EXPECT_EQ(Prices("AAA").size(), 1u);
+  EXPECT_FALSE(home.Exists(kHostData + "BBB.WDT"));
+  EXPECT_EQ(counts.Refused, 2);
+}
+
+// A new code of the command is a known one to the files behind it.
+TEST_F(ImportTest, ANewCodeIsAddedOnceACommand) {
+  ImportOptions index;
+  index.Type = std::int16_t(kIndex);
+  EXPECT_TRUE(Import({Source("a.csv", "Code,Date,Close\nAAA,20240102,1\n"),
+                      Source("b.csv", "Code,Date,Close\nAAA,20240103,1\n")},
+                     index));
+  ASSERT_EQ(Names().size(), 1u);
+  EXPECT_EQ(int(Names()[0].RecType), int(kIndex));
+}
+
+TEST_F(ImportTest, TheRowsOfAllFilesCountForWhatAPriceFileCanHold) {
+  home.Put(kHostData + "Names.dat", Bytes(std::vector{Security("AAA")}));
+  std::string first = "Date,Close\n", second = first;
+  for (int i = 0; i < 20000; ++i) {
+    first += FormatFileDate(DateOfDayNumber(i)) + ",1\n";
+    second += FormatFileDate(DateOfDayNumber(i + 12766)) + ",2\n";
+  }
+  // 32,766 days of their own; one more day fits and two do not.
+  EXPECT_TRUE(
+      Import({Source("AAA.csv", first), Source("AAA2.csv", second)}, ImportOptions{.Code = "AAA"}));
+  EXPECT_EQ(Prices("AAA").size(), 32766u);
+  const std::string days = "Date,Close\n" + FormatFileDate(DateOfDayNumber(40000)) + ",1\n";
+  EXPECT_FALSE(Import({Source("AAA.csv", days),
+                       Source("b.csv", "Code,Date,Close\nAAA," +
+                                           FormatFileDate(DateOfDayNumber(40001)) + ",1\n")}));
+  EXPECT_EQ(Prices("AAA").size(), 32767u);
+  EXPECT_NE(LastSaid().find("b.csv: AAA.WDT: more than 32767 records"), std::string::npos)
+      << LastSaid();
+}
+
+TEST_F(ImportTest, AnImportThatIsStoppedLeavesEverything) {
+  struct Stopping : ScriptedDialogs {
+    int at = 0, steps = 0;
+    std::unique_ptr<Progress> StartProgress(std::string_view) override {
+      struct Counted : Progress {
+        explicit Counted(Stopping& stopping_) : owner(stopping_) {}
+        bool Step(int, int) override { return ++owner.steps != owner.at; }
+        Stopping& owner;
+      };
+      return std::make_unique<Counted>(*this);
+    }
+  } stopping;
+  ASSERT_TRUE(Import("a.csv", "Code,Date,Close\nAAA,20240101,1\n"));
+  const auto before = DataFiles();
+  const std::vector<std::string> sources{
+      Source("a.csv", "Code,Date,Close\nAAA,20240102,1\nBBB,20240102,1\n"),
+      Source("b.csv", "Code,Date,Close\nCCC,20240102,1\n")};
+  for (stopping.at = 1; stopping.at <= 5; ++stopping.at) {
+    stopping.steps = 0;
+    EXPECT_FALSE(ImportHistory(home.files(), kData, sources, {}, stopping, counts)) << stopping.at;
+    EXPECT_EQ(DataFiles(), before) << stopping.at;
+  }
+}
+
+// Numbers of the lists go by the codes, also where a run that was killed behind the name file has
+// left them behind and this one adds no name.
+TEST_F(ImportTest, EveryImportSetsTheNumbersOfTheListsRight) {
+  ASSERT_TRUE(Import("a.csv", "Code,Date,Close\nAAA,20240101,1\nCCC,20240101,1\n"));
+  std::vector<ListRec> list(3);
+  list[0].ListRecNo = 1;
+  list[0].ListCode.set("CCC");  // as it was before AAA came in front of it
+  list[1].ListRecNo = 7;
+  list[1].ListCode.set("GONE");
+  list[2].ListRecNo = 2;
+  list[2].ListCode.set("AAA");
+  home.Put(kHostData + "SubListB.Dat", Bytes(list));
+  ASSERT_TRUE(Import("a.csv", "Code,Date,Close\nAAA,20240102,1\n"));
+  const auto after = ReadList(home.files(), kData, 3);
+  ASSERT_EQ(after.size(), 2u);
+  EXPECT_EQ(int(after[0].ListRecNo), 2);
+  EXPECT_EQ(after[0].ListCode.trimmed(), "CCC");
+  EXPECT_EQ(int(after[1].ListRecNo), 1);
+}
+
+// Cut off at each change in turn, lists and names told apart; the same import again then gives what
+// an undisturbed one gives.
+TEST_F(ImportTest, AnImportThatWasCutOffIsCompletedByTheSameImport) {
+  const auto lay = [this] {
+    std::filesystem::remove_all(home.path() + "/drive_c/korawin/data");
+    home.Put(kHostData + "Names.dat", Bytes(std::vector{Security("BBB"), Security("DDD")}));
+    for (const char* code : {"BBB", "DDD"})
+      home.Put(kHostData + code + ".WDT", Bytes(std::vector{NewPriceRec("20240101")}));
+    std::vector<ListRec> list(2);
+    list[0].ListRecNo = 2;
+    list[0].ListCode.set("DDD");
+    list[1].ListRecNo = 1;
+    list[1].ListCode.set("BBB");
+    for (const char* name : {"SubListA.Dat", "SubListZ.Dat"})
+      home.Put(kHostData + name, Bytes(list));
+  };
+  const std::vector<std::string> sources{
+      Source("a.csv", "Code,Date,Close\nAAA,20240102,1\nBBB,20240102,1\n"),
+      Source("b.csv", "Code,Date,Close\nCCC,20240102,1\n")};
+  lay();
+  ASSERT_TRUE(Import(sources));
+  const auto whole = DataFiles();
+  int points = 0;
+  for (int at = 1;; ++at) {
+    lay();
+    const pid_t child = ::fork();
+    if (child == 0) {
+      io.Reset(at);
+      io.kills = true;
+      ::_exit(Import(sources) ? 0 : 1);
+    }
+    int status = 0;
+    ASSERT_EQ(::waitpid(child, &status, 0), child);
+    if (!WIFSIGNALED(status)) break;
+    ++points;
+    io.Reset();
+    for (const NameRec& name : Names())
+      EXPECT_GE(Prices(std::string(name.Code.trimmed())).size(), 1u) << at;
+    ASSERT_TRUE(Import(sources)) << at << LastSaid();
+    auto after = DataFiles();
+    std::erase_if(after, [](const auto& file) { return file.first.ends_with('~'); });
+    EXPECT_EQ(after, whole) << at;
+  }
+  EXPECT_GT(points, 20);
 }

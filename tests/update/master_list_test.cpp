@@ -35,7 +35,10 @@ TEST_F(MasterTest, MakesRecordsOrderedByCodeAndAnIndex) {
   ASSERT_EQ(bytes.size(), 5u * 62);
   EXPECT_EQ(bytes.substr(0, 6), "1AUX  ");
   EXPECT_EQ(bytes.substr(3 * 62, 62),
-            "ORE   4 1121" "Ore Mining Ltd                    " " " "Ord            ");
+            "ORE   4 1121"
+            "Ore Mining Ltd                    "
+            " "
+            "Ord            ");
   EXPECT_EQ(home.Get(kHostSystem + "KoraName.idx"),
             "0,2,0,0,0,0,0,0,0,0,0,0,0,0,3,0,0,0,0,0,0,0,0,0,0,5\r\n");
 }
@@ -58,13 +61,14 @@ TEST_F(MasterTest, AStartBeyondTheListFindsNothing) {
   Make(kList);
   EXPECT_EQ(Find("ZAP", 6).code, "");
   EXPECT_EQ(Find("ZAP", 0).code, "");
-  EXPECT_EQ(Find("ORE", 5).code, "");   // begins behind it
+  EXPECT_EQ(Find("ORE", 5).code, "");  // begins behind it
   EXPECT_EQ(Find("OBX").code, "");
 }
 
 TEST_F(MasterTest, ALetterWithoutEntryFindsNothingAndTheRowsStay) {
   Make(kList);
-  std::vector<EditorRow> rows{{"QQQ", "Keep", "", "4", "1", "001"}, {"1AUX", "Keep", "", "", "", ""}};
+  std::vector<EditorRow> rows{{"QQQ", "Keep", "", "4", "1", "001"},
+                              {"1AUX", "Keep", "", "", "", ""}};
   EXPECT_TRUE(UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs));
   EXPECT_EQ(rows[0].name, "Keep");
   EXPECT_EQ(rows[1].name, "Keep");
@@ -74,7 +78,8 @@ TEST_F(MasterTest, ALetterWithoutEntryFindsNothingAndTheRowsStay) {
 TEST_F(MasterTest, TickedItemsKeepWhatTheyHave) {
   Make(kList);
   std::vector<EditorRow> rows{{"BHP", "Mine", "", "", "7", ""}, {"", "Blank", "", "", "", ""}};
-  EXPECT_TRUE(UpdateFromMaster(home.files(), kSystem, rows, {true, true, true, true, true}, dialogs));
+  EXPECT_TRUE(
+      UpdateFromMaster(home.files(), kSystem, rows, {true, true, true, true, true}, dialogs));
   EXPECT_EQ(rows[0].name, "Mine");
   EXPECT_EQ(rows[0].details, "");
   EXPECT_EQ(rows[0].type, "4");
@@ -99,8 +104,9 @@ TEST_F(MasterTest, AMissingListIsTold) {
   std::vector<EditorRow> rows;
   EXPECT_FALSE(UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs));
   EXPECT_EQ(LastTitle(), "KORA Master List");
-  EXPECT_EQ(LastSaid(), "There is no master list (KoraName.Mas) in folder c:\\korawin\\Either "
-                        "download a current file from the KORA web page or ring KORA ");
+  EXPECT_EQ(LastSaid(),
+            "There is no master list (KoraName.Mas) in folder c:\\korawin\\Either "
+            "download a current file from the KORA web page or ring KORA ");
 }
 
 TEST_F(MasterTest, AnIndexThatCannotBeReadIsTold) {
@@ -245,7 +251,8 @@ TEST_F(MasterTest, StoppingInTheMiddleLeavesTheRows) {
 }
 
 TEST_F(MasterTest, OddListsIndexesAndTablesEndInAMessageOrNothing) {
-  const std::string mas = "AAA   4 1121" + std::string(50, 'n') + "BBB   4 1121" + std::string(50, 'n');
+  const std::string mas =
+      "AAA   4 1121" + std::string(50, 'n') + "BBB   4 1121" + std::string(50, 'n');
   std::string table;
   for (int c = 48; c <= 122; ++c) table += std::to_string(c) + "\n";
   const std::string idx = "1,2,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0,0\r\n";
@@ -254,8 +261,8 @@ TEST_F(MasterTest, OddListsIndexesAndTablesEndInAMessageOrNothing) {
   int refused = 0, taken = 0;
   for (const auto& [name, text] : whole) {
     for (const auto& [other, bytes] : whole) home.Put(kHostSystem + other, bytes);
-    Mutator(11).Run({text, ""}, 200, [&](const std::string& damaged) {
-      home.Put(kHostSystem + name, damaged);
+    Mutator(11).Run({text, ""}, 200, [&, file = name](const std::string& damaged) {
+      home.Put(kHostSystem + file, damaged);
       std::vector<EditorRow> rows{{"AAA", "", "", "", "", ""}, {"ZZZ", "z", "", "", "", ""}};
       dialogs.said.clear();
       if (UpdateFromMaster(home.files(), kSystem, rows, {}, dialogs)) {
@@ -289,9 +296,14 @@ TEST_F(MasterTest, AHugeListIsRefused) {
 TEST_F(MasterTest, HostilePlainListsAreRefusedWithTheirLine) {
   Make(kList);
   const auto before = Everything();
-  const std::string utf16("\xFF\xFE" "B\0H\0P\0,\0", 10), nul("BHP,4,1,1,a\0b,c\n", 16);
-  for (const std::string& text : {utf16, nul, std::string(3u << 20, 'q'), std::string("ORE,4,1,1,a,b\rBHP,4,1,1,a,b\r"),
-                                  std::string("../X,4,1,1,a,b\n"), std::string("NUL,4,1,1,a,b\n")}) {
+  const std::string utf16(
+      "\xFF\xFE"
+      "B\0H\0P\0,\0",
+      10),
+      nul("BHP,4,1,1,a\0b,c\n", 16);
+  for (const std::string& text :
+       {utf16, nul, std::string(3u << 20, 'q'), std::string("ORE,4,1,1,a,b\rBHP,4,1,1,a,b\r"),
+        std::string("../X,4,1,1,a,b\n"), std::string("NUL,4,1,1,a,b\n")}) {
     EXPECT_FALSE(Make(text));
     EXPECT_NE(LastSaid().find("list.csv line 1: "), std::string::npos) << LastSaid();
   }

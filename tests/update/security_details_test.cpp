@@ -27,8 +27,9 @@ class DetailsTest : public UpdateFixture {
 
 TEST_F(DetailsTest, TakesTheFileIntoTheStore) {
   EXPECT_FALSE(KoraDetailsReady(home.files(), settings.download));
-  Take("Code|ShortDescription|PARVALUE|My Name\r\nBHP|Big Hole|1.00|x\r\nBHP|second|2\r\n"
-       "ORE|Ore|3|y\r\nX|dropped\r\n|none\r\nno delimiter\r\nABCDEFGH|long");
+  Take(
+      "Code|ShortDescription|PARVALUE|My Name\r\nBHP|Big Hole|1.00|x\r\nBHP|second|2\r\n"
+      "ORE|Ore|3|y\r\nX|dropped\r\n|none\r\nno delimiter\r\nABCDEFGH|long");
   EXPECT_EQ(Sys("STKHeader.txt"), "4\r\nCODE\r\nDescription\r\nPar Value\r\nMY NAME\r\n");
   const std::string store = Sys("SecurityDetails.Stx");
   ASSERT_EQ(store.size(), 4u * 312);
@@ -108,21 +109,36 @@ TEST_F(DetailsTest, ACodeThatComesAgainIsIndexedAtEachChange) {
 
 TEST_F(DetailsTest, EachNameOfTheServiceHasItsLabel) {
   const std::pair<const char*, const char*> labels[] = {
-      {"SHORTDESCRIPTION", "Description"}, {"SECURITYTYPE", "Type"},
-      {"FIRSTACTIVEDATE", "First Active"}, {"FIRSTQUOTEDDATE", "First Quoted"},
-      {"LASTQUOTEDATE", "Last Quoted"}, {"SUSPENSIONSTARTDATE", "Suspension Start"},
-      {"SUSPENSIONENDDATE", "Suspension End"}, {"TOTALCLASSISSUE", "Total Issued"},
-      {"PARVALUE", "Par Value"}, {"PAIDUPVALUE", "Paid Value"},
-      {"ASSETBACKING", "Asset backing"}, {"DIVENDRATEPERSHARE", "DPS"},
-      {"DIVIDENDSPAIDMONTHS", "Div. Mths"}, {"CURRENTDIVIDENDAMOUNT", "Current Div"},
-      {"DIVIDENTTYPE", "Div. Type"}, {"DIVIDENDPAYABLEDATE", "Div. Payable  "},
-      {"EXDATE", "Ex Div Date"}, {"FRANKINGPERCENT", "Franking %"},
-      {"CLASSAFRANKEDAMOUNT", "Class A Franked $"}, {"CLASSBFRANKEDAMOUNT", "Class B Franked $"},
-      {"CLASSCFRANKEDAMOUNT", "Class C Franked $"}, {"GROSSDIVIDENDAMOUNT", "Gross Div."},
-      {"MINAPPLICATIONMONEY", "Min. Applic.Money"}, {"MAXAPPLICATIONMONEY", "Max Applic. Money"},
-      {"APPLICATIONCLOSEDATE", "Applic.Close"}, {"QUOTEDSECURITYINDICATOR", "Security Ind."},
-      {"STAMPDUTYINDICATOR", "Stamp Duty Ind."}, {"SHORTSELLINDICATOR", "Short Sell Ind."},
-      {"PARIPASSUINDICATOR", "Pari Passu Ind."}, {"ANNUALDIVIDENDRATE", "Annual Dividend"}};
+      {"SHORTDESCRIPTION", "Description"},
+      {"SECURITYTYPE", "Type"},
+      {"FIRSTACTIVEDATE", "First Active"},
+      {"FIRSTQUOTEDDATE", "First Quoted"},
+      {"LASTQUOTEDATE", "Last Quoted"},
+      {"SUSPENSIONSTARTDATE", "Suspension Start"},
+      {"SUSPENSIONENDDATE", "Suspension End"},
+      {"TOTALCLASSISSUE", "Total Issued"},
+      {"PARVALUE", "Par Value"},
+      {"PAIDUPVALUE", "Paid Value"},
+      {"ASSETBACKING", "Asset backing"},
+      {"DIVENDRATEPERSHARE", "DPS"},
+      {"DIVIDENDSPAIDMONTHS", "Div. Mths"},
+      {"CURRENTDIVIDENDAMOUNT", "Current Div"},
+      {"DIVIDENTTYPE", "Div. Type"},
+      {"DIVIDENDPAYABLEDATE", "Div. Payable  "},
+      {"EXDATE", "Ex Div Date"},
+      {"FRANKINGPERCENT", "Franking %"},
+      {"CLASSAFRANKEDAMOUNT", "Class A Franked $"},
+      {"CLASSBFRANKEDAMOUNT", "Class B Franked $"},
+      {"CLASSCFRANKEDAMOUNT", "Class C Franked $"},
+      {"GROSSDIVIDENDAMOUNT", "Gross Div."},
+      {"MINAPPLICATIONMONEY", "Min. Applic.Money"},
+      {"MAXAPPLICATIONMONEY", "Max Applic. Money"},
+      {"APPLICATIONCLOSEDATE", "Applic.Close"},
+      {"QUOTEDSECURITYINDICATOR", "Security Ind."},
+      {"STAMPDUTYINDICATOR", "Stamp Duty Ind."},
+      {"SHORTSELLINDICATOR", "Short Sell Ind."},
+      {"PARIPASSUINDICATOR", "Pari Passu Ind."},
+      {"ANNUALDIVIDENDRATE", "Annual Dividend"}};
   std::string header, wanted = std::to_string(std::size(labels)) + "\r\n";
   for (const auto& [name, label] : labels) {
     header += (header.empty() ? "" : "\t") + LCase(name);
@@ -135,14 +151,22 @@ TEST_F(DetailsTest, EachNameOfTheServiceHasItsLabel) {
 TEST_F(DetailsTest, AHeaderInAnotherAlphabetChangesNothing) {
   Take("A|B\r\nBHP|old\r\n");
   const std::string store = Sys("SecurityDetails.Stx");
-  for (const std::string& text :
-       {std::string("\xFF\xFE" "A\0|\0", 6), std::string("A\0|\0B\0", 6), std::string("A\x01""B\n"),
-        std::string("A\xA6" "B\n"), std::string(1 << 20, 'A')}) {
+  for (const std::string& text : {std::string("\xFF\xFE"
+                                              "A\0|\0",
+                                              6),
+                                  std::string("A\0|\0B\0", 6),
+                                  std::string("A\x01"
+                                              "B\n"),
+                                  std::string("A\xA6"
+                                              "B\n"),
+                                  std::string(1 << 20, 'A')}) {
     Take(text);
     EXPECT_EQ(Sys("SecurityDetails.Stx"), store);
     EXPECT_TRUE(home.Exists("drive_c/in/SecurityDetails.Asx.Stk"));
   }
-  Take("\xEF\xBB\xBF" "A|B\nBHP|new\n");
+  Take(
+      "\xEF\xBB\xBF"
+      "A|B\nBHP|new\n");
   EXPECT_EQ(Sys("STKHeader.txt"), "2\r\nA\r\nB\r\n");
 }
 

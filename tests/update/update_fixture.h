@@ -26,14 +26,19 @@ struct FixedClock : Clock {
 };
 
 // Keeps what the update showed.
-struct KeptDisplay : UpdateDisplay {
+struct KeptDisplay : Progress {
   std::vector<std::string> states, targets, firsts, seconds;
   int steps = 0, stopAt = 0;
   bool running = false;
-  void ShowState(std::string_view t) override { states.emplace_back(t); }
-  void ShowTarget(std::string_view t) override { targets.emplace_back(t); }
-  void ShowFirst(std::string_view t) override { firsts.emplace_back(t); }
-  void ShowSecond(std::string_view t) override { seconds.emplace_back(t); }
+  void Show(ProgressLine line, std::string_view text) override {
+    switch (line) {
+      case ProgressLine::kState: states.emplace_back(text); break;
+      case ProgressLine::kTarget: targets.emplace_back(text); break;
+      case ProgressLine::kItem: firsts.emplace_back(text); break;
+      case ProgressLine::kNote: seconds.emplace_back(text); break;
+      case ProgressLine::kDate: break;
+    }
+  }
   void SetRunning(bool value) override { running = value; }
   bool Step(int, int) override { return ++steps != stopAt; }
 };
@@ -60,8 +65,7 @@ class UpdateFixture : public ::testing::Test {
   void Names(const std::vector<NameRec>& recs, std::string folder = "") {
     home.Put((folder.empty() ? kHostData : folder) + "Names.dat", Bytes(recs));
   }
-  void Prices(const std::string& code, const std::vector<PriceRec>& recs,
-              std::string folder = "") {
+  void Prices(const std::string& code, const std::vector<PriceRec>& recs, std::string folder = "") {
     home.Put((folder.empty() ? kHostData : folder) + code + ".WDT", Bytes(recs));
   }
   void Download(const std::string& name, std::string_view text) {
@@ -87,13 +91,12 @@ class UpdateFixture : public ::testing::Test {
   }
 
   UpdateRun Run() {
-    return {home.files(), settings, current, dialogs, clock, display, {}};
+    return {home.files(), settings, current, dialogs, clock, display, {}, mostHeld};
   }
   // Takes in one waiting file, or all of them when none is named.
   UpdateEnd Update(const std::string& name = "") {
     entries.clear();
-    if (BuildDownloadList(home.files(), settings.download, dialogs, entries) !=
-        ListResult::kFilled)
+    if (BuildDownloadList(home.files(), settings.download, dialogs, entries) != ListResult::kFilled)
       return UpdateEnd::kStopped;
     if (name.empty()) return UpdateAllDays(Run(), entries);
     for (size_t i = 0; i < entries.size(); ++i)
@@ -108,7 +111,7 @@ class UpdateFixture : public ::testing::Test {
   std::string LastSaid() { return dialogs.said.empty() ? "" : dialogs.said.back().text; }
   std::string LastTitle() { return dialogs.said.empty() ? "" : dialogs.said.back().title; }
 
-  // Every file below drive C: with its bytes.
+  // Every file below drive C: with its bytes, but for what a kill leaves to be swept.
   std::map<std::string, std::string> Everything() {
     namespace fs = std::filesystem;
     std::map<std::string, std::string> out;
@@ -116,7 +119,7 @@ class UpdateFixture : public ::testing::Test {
     for (const auto& e : fs::recursive_directory_iterator(root))
       if (e.is_regular_file()) {
         const std::string name = e.path().string().substr(root.size());
-        out[name] = home.Get("drive_c/" + name);
+        if (!name.ends_with('~')) out[name] = home.Get("drive_c/" + name);
       }
     return out;
   }
@@ -129,6 +132,7 @@ class UpdateFixture : public ::testing::Test {
   Settings settings;
   CurrentName current;
   DownloadEntries entries;
+  size_t mostHeld = 32u << 20;
 };
 
 }  // namespace kora::test

@@ -8,8 +8,8 @@
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "chart/forms/orientation_choice.h"
+#include "lists/text_print_out.h"
 #include "platform/qt/form_parts.h"
-#include "settings/text_print_out.h"
 
 namespace kora {
 namespace {
@@ -37,8 +37,8 @@ CHTPage::CHTPage(const PrintServices& services, QWidget* parent)
   left_ = AddMargin(grid, 2, "PPLft", "Le&ft margin", page.PPLft);
   right_ = AddMargin(grid, 3, "PPRht", "&Right margin", double(page.PPRht));
   auto* side = new QVBoxLayout;
-  side->addWidget(new OrientationChoice(this, services_.printer, services_.dialogs,
-                                        [this] { Show(); }));
+  side->addWidget(
+      new OrientationChoice(this, services_.printer, services_.dialogs, [this] { Show(); }));
   side->addLayout(grid);
   side->addStretch();
   LayOutPageForm(this, sheet_, side, [this] { Save(); });

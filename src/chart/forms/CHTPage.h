@@ -20,8 +20,8 @@ class CHTPage : public QDialog {
   void reject() override;
 
  private:
-  QDoubleSpinBox* AddMargin(QGridLayout* grid, int row, const char* name,
-                            const char* caption, double twips);
+  QDoubleSpinBox* AddMargin(QGridLayout* grid, int row, const char* name, const char* caption,
+                            double twips);
   void Show();
   void Save();
 

@@ -56,8 +56,8 @@ Page::Page(const PrintServices& services, ChartSize chart, std::string script, Q
   connect(centre, &QPushButton::clicked, this, [this] { Centre(); });
 
   auto* side = new QVBoxLayout;
-  side->addWidget(new OrientationChoice(this, services_.printer, services_.dialogs,
-                                        [this] { Turned(); }));
+  side->addWidget(
+      new OrientationChoice(this, services_.printer, services_.dialogs, [this] { Turned(); }));
   side->addWidget(label1_);
   side->addWidget(increase);
   side->addWidget(decrease);
@@ -77,8 +77,8 @@ void Page::Show() {
                                             : "Printer Page (Portrait)");
   const ChartFrame frame = Frame();
   sheet_->SetSheet(sheet);
-  sheet_->SetBox(QRectF(-double(frame.PrintLeft), -double(frame.PrintTop), frame.width,
-                        frame.height));
+  sheet_->SetBox(
+      QRectF(-double(frame.PrintLeft), -double(frame.PrintTop), frame.width, frame.height));
   sheet_->SetContent([this](QPainter& painter) { PaintChart(painter); });
   label1_->setText("Size " + ToQt(Format(double(setup_.PrintEnlarge), "0.0")));
 }
@@ -106,8 +106,10 @@ void Page::SayEdges() {
 void Page::Step(bool larger) {
   const PrintSetup before = setup_;
   const bool wasOnPage = IsOnPage();
-  if (larger) Enlarge(setup_);
-  else Reduce(services_.printer, chart_, setup_);
+  if (larger)
+    Enlarge(setup_);
+  else
+    Reduce(services_.printer, chart_, setup_);
   const bool leaves = larger && wasOnPage && !IsOnPage();
   if (leaves) setup_ = before;
   Show();

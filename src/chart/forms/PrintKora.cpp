@@ -1,9 +1,12 @@
 #include "chart/forms/PrintKora.h"
 
+#include <QCheckBox>
 #include <QComboBox>
+#include <QFileDialog>
 #include <QGridLayout>
 #include <QLabel>
 #include <QLineEdit>
+#include <QPushButton>
 #include <QSpinBox>
 
 #include "base/runtime_error.h"
@@ -16,6 +19,12 @@ namespace kora {
 namespace {
 
 constexpr int kMostCopies = 99;
+
+// A path of the machine is taken as well as one of the program.
+std::string FileOf(const Files& files, const QString& typed) {
+  const std::string name(Trim(typed.toStdString()));
+  return name.starts_with('/') ? files.DosPath(name) : name;
+}
 
 }  // namespace
 
@@ -38,12 +47,21 @@ PrintKora::PrintKora(const PrintServices& services, PrintChoice& choice, QWidget
   grid->addWidget(text1_, 1, 1);
   grid->addWidget(NewLabel(this, "&File", text2_), 2, 0);
   grid->addWidget(text2_, 2, 1, 1, 2);
+  browse_ = new QPushButton("&Browse...", this);
+  browse_->setObjectName("Command3");
+  browse_->setAutoDefault(false);
+  grid->addWidget(browse_, 2, 3);
+  connect(browse_, &QPushButton::clicked, this, [this] { Browse(); });
+  dark_ = new QCheckBox("&Dark colours on white paper", this);
+  dark_->setObjectName("Check1");
+  dark_->setChecked(services_.settings.charts.DarkPaper);
+  grid->addWidget(dark_, 3, 1, 1, 2);
   grid->setColumnStretch(2, 1);
-  grid->setRowStretch(3, 1);
+  grid->setRowStretch(4, 1);
   auto* buttons = new ButtonRow(this);
   buttons->Add("Command1", "&Print", [this] { Proceed(); });
   buttons->Add("Command2", "&Cancel", [this] { reject(); });
-  grid->addLayout(buttons, 4, 0, 1, 3);
+  grid->addLayout(buttons, 5, 0, 1, 4);
   connect(combo1_, &QComboBox::currentIndexChanged, this, [this] { PrinterChosen(); });
   PrinterChosen();
   QWidget* first = IsPdf() ? static_cast<QWidget*>(text2_) : text1_;
@@ -51,14 +69,34 @@ PrintKora::PrintKora(const PrintServices& services, PrintChoice& choice, QWidget
   text1_->selectAll();
 }
 
-bool PrintKora::IsPdf() const {
-  return combo1_->currentText() == ToQt(QtPrinter::kPdfPrinter);
-}
+bool PrintKora::IsPdf() const { return combo1_->currentText() == ToQt(QtPrinter::kPdfPrinter); }
 
 // A file has no copies, and a queue no file.
 void PrintKora::PrinterChosen() {
   text1_->setEnabled(!IsPdf());
   text2_->setEnabled(IsPdf());
+  browse_->setEnabled(IsPdf());
+}
+
+void PrintKora::Browse() {
+  std::string standing;
+  try {
+    standing = services_.files.HostPath(FileOf(services_.files, text2_->text()));
+  } catch (const RunTimeError&) {
+    // What is no path is no place to begin at.
+  }
+  std::optional<std::string> chosen;
+  if (choice_.pickPdf) {
+    chosen = choice_.pickPdf(standing);
+  } else {
+    const QString file = QFileDialog::getSaveFileName(
+        this, windowTitle(), QString::fromStdString(standing), "PDF files (*.pdf)", nullptr,
+        QFileDialog::DontConfirmOverwrite);
+    if (!file.isEmpty()) chosen = file.toStdString();
+  }
+  if (!chosen) return;
+  if (!EndsNoCase(*chosen, ".pdf")) *chosen += ".pdf";
+  text2_->setText(QString::fromStdString(*chosen));
 }
 
 void PrintKora::Proceed() {
@@ -66,8 +104,8 @@ void PrintKora::Proceed() {
   if (combo1_->currentIndex() < 0) return dialogs.Message(kNoPrinter, kPrinterPage);
   std::string file;
   if (IsPdf()) {
-    file = std::string(Trim(text2_->text().toStdString()));
-    if (file.size() < 5 || !LCase(file).ends_with(".pdf"))
+    file = FileOf(services_.files, text2_->text());
+    if (file.size() < 5 || !EndsNoCase(file, ".pdf"))
       return dialogs.Message("File name invalid", windowTitle().toStdString());
     if (services_.files.CheckFile(file) &&
         dialogs.Ask(file + " already exists - Overwrite", windowTitle().toStdString(),
@@ -78,6 +116,10 @@ void PrintKora::Proceed() {
     services_.printer.SetDevice(combo1_->currentText().toStdString());
   } catch (const RunTimeError& e) {
     return dialogs.Message(std::string("There is an unexpected error - ") + e.what(), "Error");
+  }
+  if (dark_->isChecked() != services_.settings.charts.DarkPaper) {
+    services_.settings.charts.DarkPaper = dark_->isChecked();
+    services_.ini.PutSetting("Charts", "DarkPaper", dark_->isChecked() ? "True" : "False");
   }
   choice_.PrintCancelled = false;
   choice_.PrintCopies = IsPdf() ? std::int16_t(1) : std::int16_t(text1_->value());

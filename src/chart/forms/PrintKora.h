@@ -1,11 +1,15 @@
 #pragma once
 
 #include <QDialog>
+#include <functional>
+#include <optional>
 
 #include "chart/forms/print_services.h"
 
+class QCheckBox;
 class QComboBox;
 class QLineEdit;
+class QPushButton;
 class QSpinBox;
 
 namespace kora {
@@ -15,6 +19,8 @@ struct PrintChoice {
   bool PrintCancelled = true;
   std::int16_t PrintCopies = 1;
   std::string pdfFile;  // DOS path; in: what is proposed
+  // Asks for a file: a host path, nothing when cancelled. Empty: the platform's own dialog.
+  std::function<std::optional<std::string>(const std::string& hostPath)> pickPdf = {};
 };
 
 // How many copies, and on which printer; for a PDF, into which file. Closed by its first button
@@ -28,6 +34,7 @@ class PrintKora : public QDialog {
  private:
   bool IsPdf() const;
   void PrinterChosen();
+  void Browse();
   void Proceed();
 
   PrintServices services_;
@@ -35,6 +42,8 @@ class PrintKora : public QDialog {
   QComboBox* combo1_;
   QSpinBox* text1_;
   QLineEdit* text2_;
+  QPushButton* browse_;
+  QCheckBox* dark_;
 };
 
 }  // namespace kora

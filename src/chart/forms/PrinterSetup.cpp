@@ -45,8 +45,7 @@ PrinterSetup::PrinterSetup(const PrintServices& services, QWidget* parent)
 }
 
 void PrinterSetup::Save() {
-  if (combo1_->currentIndex() < 0)
-    return services_.dialogs.Message(kNoPrinter, kPrinterPage);
+  if (combo1_->currentIndex() < 0) return services_.dialogs.Message(kNoPrinter, kPrinterPage);
   Printer& printer = services_.printer;
   try {
     printer.SetDevice(combo1_->currentText().toStdString());

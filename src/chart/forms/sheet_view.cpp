@@ -93,8 +93,8 @@ void SheetView::paintEvent(QPaintEvent*) {
     inside.scale(scale * fine, scale * fine);
     content_(inside);
     inside.end();
-    picture_ = QPixmap::fromImage(image.scaled(size / 2, Qt::IgnoreAspectRatio,
-                                               Qt::SmoothTransformation));
+    picture_ =
+        QPixmap::fromImage(image.scaled(size / 2, Qt::IgnoreAspectRatio, Qt::SmoothTransformation));
   }
   if (!picture_.isNull()) painter.drawPixmap(box, picture_, QRectF(picture_.rect()));
   painter.setPen(QPen(hasFocus() ? palette().color(QPalette::Highlight) : QColor(Qt::blue), 0));

@@ -16,7 +16,6 @@
 #include "lists/forms/Search.h"
 #include "platform/qt/to_qt.h"
 
-
 namespace kora {
 namespace {
 
@@ -34,8 +33,7 @@ ChtSel::ChtSel(ChtSelServices services, QWidget* parent)
     : SelectionForm("ChtSel", "Chart Selection Menu", std::move(services), parent) {
   combo2_ = new QComboBox(this);
   combo2_->setObjectName("Combo2");
-  for (const OscChoice& osc : OscChoices())
-    combo2_->addItem(ToQt(osc.caption));
+  for (const OscChoice& osc : OscChoices()) combo2_->addItem(ToQt(osc.caption));
   combo2_->setMaxVisibleItems(int(OscChoices().size()));
   combo3_ = new QComboBox(this);
   combo3_->setObjectName("Combo3");
@@ -102,8 +100,8 @@ ChtSel::ChtSel(ChtSelServices services, QWidget* parent)
   rows->addSpacing(fontMetrics().height() / 2);
   rows->addLayout(buttons);
 
-  QWidget* order[] = {text1_,  text2_, vScroll1_, combo1_,  combo4_,   text3_,    text6_,
-                      combo3_, combo2_, oAve1_,   oAve2_,   text7_,    check16_,  text8_,
+  QWidget* order[] = {text1_,  text2_,    vScroll1_, combo1_,   combo4_,  text3_,   text6_,
+                      combo3_, combo2_,   oAve1_,    oAve2_,    text7_,   check16_, text8_,
                       ok_,     command2_, command1_, command6_, command7_};
   for (size_t i = 1; i < std::size(order); ++i) setTabOrder(order[i - 1], order[i]);
 
@@ -164,8 +162,8 @@ QLineEdit* ChtSel::AddSwitch(const char* name) {
 void ChtSel::ColourAverage(QCheckBox* box, bool onGround, int entry) {
   QPalette palette;
   QColor text = ColourOf(services_.colours[size_t(entry)]);
-  const QColor ground = onGround ? ColourOf(services_.colours[kBackground])
-                                 : palette.color(QPalette::Window);
+  const QColor ground =
+      onGround ? ColourOf(services_.colours[kBackground]) : palette.color(QPalette::Window);
   if (!Readable(text, ground)) text = palette.color(QPalette::WindowText);
   if (onGround) palette.setColor(box->backgroundRole(), ground);
   palette.setColor(QPalette::Active, QPalette::WindowText, text);
@@ -219,13 +217,12 @@ void ChtSel::Activated() {
 }
 
 void ChtSel::OpenChtOptions() {
-  auto* options = new ChtOptions(
-      {.selection = services_.selection,
-       .files = services_.files,
-       .settings = services_.settings,
-       .user = services_.user,
-       .chartListNo = services_.state.ChartListNo},
-      this);
+  auto* options = new ChtOptions({.selection = services_.selection,
+                                  .files = services_.files,
+                                  .settings = services_.settings,
+                                  .user = services_.user,
+                                  .chartListNo = services_.state.ChartListNo},
+                                 this);
   options->setAttribute(Qt::WA_DeleteOnClose);
   connect(options, &QDialog::accepted, this, [this] { Activated(); });
   options->open();
@@ -233,9 +230,9 @@ void ChtSel::OpenChtOptions() {
 
 void ChtSel::OpenSearch() {
   if (!services_.selection.MaySearchByName(text2_->text().toStdString())) return;
-  auto* search = new Search(services_.files, services_.dialogs,
-                            services_.settings.paths.CurrentDataPath,
-                            text2_->text().trimmed().toStdString(), this);
+  auto* search =
+      new Search(services_.files, services_.dialogs, services_.settings.paths.CurrentDataPath,
+                 text2_->text().trimmed().toStdString(), this);
   search->setAttribute(Qt::WA_DeleteOnClose);
   connect(search, &QDialog::accepted, this, [this, search] {
     services_.selection.TakeSearch(search->match() ? std::optional(search->match()->record)
@@ -250,8 +247,8 @@ void ChtSel::OpenIndClass() {
   const QString typed = text8_->text();
   services_.selection.StartIndustryPicker();
   check16_->setChecked(true);
-  auto* picker = new IndClass(services_.files, services_.dialogs,
-                              services_.settings.paths.SystemPath, this);
+  auto* picker =
+      new IndClass(services_.files, services_.dialogs, services_.settings.paths.SystemPath, this);
   picker->Select(typed.trimmed().toStdString());
   picker->setAttribute(Qt::WA_DeleteOnClose);
   connect(picker, &QDialog::finished, this, [this, picker, typed](int result) {
@@ -295,8 +292,10 @@ bool ChtSel::FieldMouse(QObject* field, QEvent::Type type) {
   if (type == QEvent::MouseButtonRelease && std::exchange(doubleClicked_, false)) return true;
   if (type == QEvent::MouseButtonDblClick) doubleClicked_ = true;
   if (type == QEvent::MouseButtonRelease && static_cast<QWidget*>(field)->isEnabled()) {
-    if (field == text6_) ClickFinishDate();
-    else if (field == text7_) FieldEnter(text7_);
+    if (field == text6_)
+      ClickFinishDate();
+    else if (field == text7_)
+      FieldEnter(text7_);
   }
   if (type == QEvent::MouseButtonDblClick) {
     if (field == text6_) {

@@ -23,12 +23,16 @@
 #include <QToolButton>
 #include <algorithm>
 #include <cmath>
+#include <new>
 #include <tuple>
 #include <utility>
 #include <vector>
 
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "chartwindow/forms/KoraScroll.h"
+#include "chartwindow/forms/ZoomKora.h"
+#include "indicators/oscillators.h"
 #include "indicators/price_overlays.h"
 #include "platform/qt/picture.h"
 #include "platform/qt/to_qt.h"
@@ -40,9 +44,10 @@ namespace kora {
 namespace {
 
 struct Entry {
-  const char* name;     // empty: a separator
+  const char* name;  // empty: a separator
   const char* caption;
-  const char* code = "";  // of an oscillator
+  const Oscillator* oscillator = nullptr;
+  bool slow = false;
 };
 struct Menu {
   const char* name;
@@ -50,15 +55,36 @@ struct Menu {
   std::vector<Entry> entries;
 };
 
+// The oscillators of the table, the multiple averages among them, and what else has its place
+// here.
+std::vector<Entry> OscillatorEntries() {
+  std::vector<Entry> entries;
+  for (const Oscillator& oscillator : Oscillators()) {
+    if (oscillator.code == "OBV") entries.push_back({"cmMMA", "MM&A (Multiple Moving Averages)"});
+    for (const OscEntry& entry : oscillator.entries)
+      entries.push_back({entry.menu, entry.caption, &oscillator, entry.slow});
+  }
+  const Entry rest[] = {{"cmSwing", "Swin&g"},
+                        {"", ""},
+                        {"cmMMASet", "MMA Se&ttings"},
+                        {"cmuSwingsettings", "Swi&ng Settings"},
+                        {"cmuMOS", "Multi-Oscillator Display Selections"},
+                        {"cmKeepOsc", "&Keep Oscillator"}};
+  entries.insert(entries.end(), std::begin(rest), std::end(rest));
+  return entries;
+}
+
 const std::vector<Menu>& Menus() {
   static const std::vector<Menu> menus = {
-      {"cmFile", "&File",
+      {"cmFile",
+       "&File",
        {{"cmSaveAs", "&Save Chart as"},
         {"cmSSavedCht", "Show Sa&ved Chart"},
         {"cmPageSetup", "Pa&ge Setup"},
         {"cmPrintChart", "&Print Chart"},
         {"cmExit", "&Close"}}},
-      {"cmTools", "&Tools",
+      {"cmTools",
+       "&Tools",
        {{"cmChtDef", "&Chart Defaults"},
         {"cmStkDetails", "Show &Stock Details"},
         {"cmSuperimpose", "&Superimpose"},
@@ -74,46 +100,23 @@ const std::vector<Menu>& Menus() {
         {"cmChtSpaces", "&Change Chart Spacing"},
         {"cmInsOuts", "Highlight &Outside days on Bar Chart"},
         {"cmSLInd", "Stop Loss Indicator"}}},
-      {"cmOptions", "O&ptions",
+      {"cmOptions",
+       "O&ptions",
        {{"cmColours", "&Colours"},
         {"cmfonts", "&Fonts"},
         {"cmVHeight", "&Volume Height"},
         {"cmLineWidth", "&Line Width (Printing)"},
         {"cmBSpaces", "&Blank space at end of chart"}}},
-      {"cmOscillators", "&Oscillators",
-       {{"cmDirect", "&Directional Movement", "DM"},
-        {"cmCoppock", "&Coppock Indicator", "COP"},
-        {"cmElderRay", "&Elder Ray", "ERY"},
-        {"cmFX", "&FX", "FX"},
-        {"cmJHGrail", "Jones Holy Grail", "JHG"},
-        {"cmMacD", "&MACD Histogram and Classic", "MACD"},
-        {"cmMomentum", "Momen&tum", "MOM"},
-        {"cmMMA", "MM&A (Multiple Moving Averages)"},
-        {"cmOBV", "OB&V (On Balance Volume)", "OBV"},
-        {"cmPara", "&Parabolic", "PARA"},
-        {"cmParaAve", "Parabolic on Average 1", "PARAV"},
-        {"cmROC", "&ROC (Rate of Change)", "ROC"},
-        {"cmROCFX", "RO&C and  FX", "R/F"},
-        {"cmRMO", "RM&O (Relative Movement - all data)", "RMO"},
-        {"cmRMX", "RM&X (Relative Movement - chart data)", "RMX"},
-        {"cmRelStrength", "RS&I (Relative Strength Index)", "RSI"},
-        {"cmStochastic", "&Stochastic (Fast)", "STO"},
-        {"cmSlowStoch", "Stoc&hastic (Slow)", "STO"},
-        {"cmVolt", "Volatility", "VTY"},
-        {"cmWilliams", "&Williams %R", "WMS"},
-        {"cmSwing", "Swin&g"},
-        {"", ""},
-        {"cmMMASet", "MMA Se&ttings"},
-        {"cmuSwingsettings", "Swi&ng Settings"},
-        {"cmuMOS", "Multi-Oscillator Display Selections"}}},
+      {"cmOscillators", "&Oscillators", OscillatorEntries()},
   };
   return menus;
 }
 
-const char* CodeOf(const std::string& entry) {
-  for (const Entry& e : Menus().back().entries)
-    if (entry == e.name) return e.code;
-  return "";
+// The entry of an oscillator; null for every other one.
+const Entry* OscillatorEntry(const std::string& name) {
+  for (const Entry& entry : Menus().back().entries)
+    if (name == entry.name) return entry.oscillator ? &entry : nullptr;
+  return nullptr;
 }
 
 int ButtonOf(const std::string& entry) {
@@ -155,13 +158,21 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
                .price = picture1_->surface(),
                .panel = picture2_->surface(),
                .layOut = [this](bool two) { LayOut(two); },
-               .VolumeUnitText = services.VolumeUnitText}) {
+               .popUpTrend = [this] { return PopUpTrend(); },
+               .openZoom = [this](const ZoomBox& box) { OpenZoom(box); },
+               .VolumeUnitText = services.VolumeUnitText}),
+      scroll_({.files = services.files,
+               .dialogs = services.dialogs,
+               .settings = services.settings,
+               .current = services.current,
+               .state = services.state}) {
   setObjectName("Chts");
   setAttribute(Qt::WA_DeleteOnClose);
   setContextMenuPolicy(Qt::NoContextMenu);
   setCentralWidget(area_);
   for (const auto& [picture, name, text] :
-       {std::tuple{picture1_, "Picture1", "Chart"}, {picture2_, "Picture2(0)", "Oscillator"},
+       {std::tuple{picture1_, "Picture1", "Chart"},
+        {picture2_, "Picture2(0)", "Oscillator"},
         {picture4_, "Picture4", "Legend of the reversal marks"}}) {
     picture->setObjectName(name);
     picture->setAccessibleName(text);
@@ -169,14 +180,26 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
     picture->surface().Cls();
     if (picture != picture1_) picture->setFocusPolicy(Qt::NoFocus);
   }
-  picture1_->setMouseTracking(true);
-  picture1_->installEventFilter(this);
+  for (PictureBox* picture : {picture1_, picture2_}) {
+    picture->setMouseTracking(true);
+    picture->installEventFilter(this);
+  }
+  label1_ = new QLabel(area_);
+  label1_->setObjectName("Label1");
+  label1_->setAutoFillBackground(true);
+  label1_->setMargin(4);
+  label1_->setFrameStyle(QFrame::StyledPanel | QFrame::Raised);
+  label1_->hide();
+  timer1_.callOnTimeout(this, [this] {
+    if (!busy_) Do([this] { window_.AutoScrollTick(); });
+  });
   picture2_->hide();
   picture2_->surface().SetVisible(false);
   picture4_->hide();
   setFocusProxy(picture1_);
-  window_.CrossTouched = [this](const Surface& surface, double x1, double y1, double x2,
-                                double y2) { TouchLine(surface, x1, y1, x2, y2); };
+  window_.Touched = [this](const Surface& surface, double x1, double y1, double x2, double y2) {
+    TouchLine(surface, x1, y1, x2, y2);
+  };
   BuildMenus();
   BuildToolBar();
   BuildStatusBar();
@@ -185,14 +208,16 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
   resized_.setSingleShot(true);
   resized_.setInterval(0);
   resized_.callOnTimeout(this, [this] {
-    if (busy_) sizeWaits_ = true;
-    else Do([this] { window_.Resized(); });
+    if (busy_)
+      sizeWaits_ = true;
+    else
+      Do([this] { window_.Resized(); });
   });
   for (PictureBox* picture : {picture1_, picture2_})
     picture->Resized = [this, picture] {
       picture->surface().SetBackColour(s_.colours[kBackground]);
       picture->surface().Cls();
-      window_.ForgetCross();
+      window_.ForgetTool();
       // A hidden panel takes its size when it is needed.
       if (picture->isVisibleTo(area_) && !window_.Loading && !busy_) resized_.start();
     };
@@ -204,7 +229,7 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
 }
 
 Chts::~Chts() {
-  window_.CrossTouched = nullptr;
+  window_.Touched = nullptr;
   window_.Unload();
 }
 
@@ -226,7 +251,8 @@ void Chts::BuildMenus() {
       connect(action, &QAction::triggered, this, [this, name] { Trigger(name); });
     }
   }
-  for (const char* name : {"cmInd", "cmGridLines", "cmPFAuto", "cmInsOuts", "cmMMA", "cmSwing"})
+  for (const char* name :
+       {"cmInd", "cmGridLines", "cmPFAuto", "cmInsOuts", "cmMMA", "cmSwing", "cmKeepOsc"})
     entries_[name]->setCheckable(true);
 }
 
@@ -241,8 +267,7 @@ void Chts::BuildToolBar() {
     const ToolButtonText& text = ToolButtonOf(button);
     for (const int first : {kButtonBack, kButtonBar, kButtonDaily, kButtonGrid, kButtonMulti1})
       if (button == first) toolbar1_->addSeparator();
-    QAction* action =
-        toolbar1_->addAction(QIcon(QString(":/chts/%1.svg").arg(text.key)), text.tip);
+    QAction* action = toolbar1_->addAction(QIcon(QString(":/chts/%1.svg").arg(text.key)), text.tip);
     action->setToolTip(text.tip);
     action->setObjectName(text.key);
     action->setCheckable(true);
@@ -285,7 +310,8 @@ void Chts::BuildFrame() {
   static constexpr const char* kUnits[] = {"Day", "Week", "Month"};
   for (int i = 0; i < 6; ++i) {
     const bool forward = i < 3;
-    auto* button = new QPushButton(QString("%1 %2").arg(kUnits[i % 3], forward ? "+" : "-"), frame1_);
+    auto* button =
+        new QPushButton(QString("%1 %2").arg(kUnits[i % 3], forward ? "+" : "-"), frame1_);
     button->setObjectName(QString("Command31(%1)").arg(i));
     button->setToolTip(QString("The chart ends one %1 %2")
                            .arg(QString(kUnits[i % 3]).toLower(), forward ? "later" : "earlier"));
@@ -322,30 +348,45 @@ std::function<void()> Chts::DeedOf(const std::string& entry) {
   if (entry == "cmGridLines") return deed([&w] { w.ToggleGridLines(); });
   if (entry == "cmInd") return deed([&w] { w.ToggleReversals(); });
   if (entry == "cmInsOuts" && xs) return deed([&w] { w.ToggleOutsideDays(); });
+  if (entry == "cmKeepOsc") return deed([&w] { w.ToggleKeepOscillator(); });
   if (entry == "cmMMA") return deed([&w] { w.ToggleMMA(); });
   if (entry == "cmPFAuto") return deed([&w] { w.TogglePFAuto(); });
+  if (entry == "cmSwing") return deed([&w] { w.ToggleSwing(); });
   if (entry == "cmSuperimpose" && s_.forms["Chart2"]) return deed([&w] { w.StartSuperimpose(); });
   if (entry == "cmSplitScreen" && s_.forms["Chart2"]) return deed([&w] { w.StartSplitScreen(); });
-  if (entry == "cmParaAve" && !s_.settings.words.OptionXT) return {};
-  if (const char* code = CodeOf(entry); *code)
-    return deed([&w, code, slow = entry == "cmSlowStoch"] { w.PickOscillator(code, slow); });
+  if (entry == "cmText") return deed([&w] { w.StartText(); });
+  if (entry == "cmRemAllTrend") return deed([&w] { w.RemoveAllTrendlines(); });
+  if (entry == "cmChtScroll") return [this] { OpenScroll(); };
+  if (const Entry* picked = OscillatorEntry(entry)) {
+    if (picked->oscillator->switchXT && !s_.settings.words.OptionXT) return {};
+    return deed([&w, picked] { w.PickOscillator(picked->oscillator->code, picked->slow); });
+  }
   switch (ButtonOf(entry)) {
     case kButtonRefresh: return deed([&w] { w.Refresh(); });
     case kButtonBack:
     case kButtonForward:
       return deed([&w, forward = entry == "fwd"] {
         w.state().ChartDirection = forward ? 1 : 0;
-        w.SetTB(w.GridOn() ? kButtonGrid : kNoButton);
-        if (w.HasChart()) w.StepChart();
-        else w.NextChart();
+        if (w.view().AutoScroll > 0) w.CancelChartTools();
+        w.SetTB(w.ToolOn() ? w.view().TB : kNoButton);
+        if (w.HasChart())
+          w.StepChart();
+        else
+          w.NextChart();
       });
-    case kButtonBar: return deed([&w] { w.SetStyle('B'); });
-    case kButtonCandle: return deed([&w] { w.SetStyle('C'); });
-    case kButtonLine: return deed([&w] { w.SetStyle('L'); });
-    case kButtonDaily: return deed([&w] { w.SetPeriod("A"); });
-    case kButtonWeekly: return deed([&w] { w.SetPeriod("W"); });
-    case kButtonMonthly: return deed([&w] { w.SetPeriod("M"); });
+    case kButtonBar: return deed([&w] { w.SetStyle(Style::kBar); });
+    case kButtonCandle: return deed([&w] { w.SetStyle(Style::kCandlestick); });
+    case kButtonPF: return deed([&w] { w.SetStyle(Style::kPointFigure); });
+    case kButtonLine: return deed([&w] { w.SetStyle(Style::kLine); });
+    case kButtonDaily: return deed([&w] { w.SetPeriod(Period::kDaily); });
+    case kButtonWeekly: return deed([&w] { w.SetPeriod(Period::kWeekly); });
+    case kButtonMonthly: return deed([&w] { w.SetPeriod(Period::kMonthly); });
+    case kButtonAuto: return deed([&w] { w.ToggleAutoScroll(); });
     case kButtonGrid: return deed([&w] { w.ToggleGrid(); });
+    case kButtonTrend: return deed([&w] { w.ToggleTrendline(); });
+    case kButtonErase: return deed([&w] { w.TellHowToErase(); });
+    case kButtonFib: return deed([&w] { w.ToggleFibonacci(); });
+    case kButtonZoom: return deed([&w] { w.ToggleZoom(); });
     default: break;
   }
   const std::string form = entry == "cspace" ? "cmChtSpaces" : entry;
@@ -369,12 +410,16 @@ void Chts::Trigger(const std::string& entry) {
 
 void Chts::OpenForm(const std::string& entry) {
   ChartState& state = window_.state();
-  if (entry == "cmChtSpaces" && state.ChartStyle == 'P') return;
+  if (entry == "cmChtSpaces" && state.ChartStyle == Style::kPointFigure) return;
+  const bool view = entry == "mo1" || entry == "mo2";
+  if (view && (state.ChartStyle == Style::kPointFigure || !window_.HasChart())) return;
   Do([&] {
     if (entry == "new") window_.StartNewChart();
     if (entry == "cmColours" || entry == "cmSLInd") window_.CancelChartTools();
     if (entry == "cmColours") state.ChartTask = kTaskColours;
     if (entry == "cmChtDef") state.ChartTask = kTaskChartDefaults;
+    if (view) window_.CancelChartTools();
+    if (view) window_.SetTB(ButtonOf(entry));
     if (entry == "cmPageSetup" || entry == "cmPrintChart")
       window_.StartPrinting(entry == "cmPrintChart");
   });
@@ -393,8 +438,8 @@ void Chts::Start() {
   Do([this] { window_.NextChart(); });
 }
 
-void Chts::Command2() {
-  Do([this] { window_.NextChart(); });
+void Chts::ShowChosen() {
+  Do([this] { window_.ShowAt(std::max<int>(window_.state().ChartIndex, 1)); });
 }
 
 void Chts::Refresh() {
@@ -422,12 +467,21 @@ template <typename Deed>
 void Chts::Do(Deed deed) {
   if (busy_) return;
   busy_ = true;
+  // A deed may run a form, and the window may be gone when that one is left.
+  const QPointer<Chts> window(this);
+  Dialogs& dialogs = s_.dialogs;
+  const auto tell = [&dialogs](const char* text) {
+    dialogs.SetBusy(false);
+    dialogs.Message(text, "Charts");
+  };
   try {
     deed();
   } catch (const RunTimeError& e) {
-    s_.dialogs.SetBusy(false);
-    s_.dialogs.Message(e.what(), "Charts");
+    tell(e.what());
+  } catch (const std::bad_alloc&) {
+    tell(ErrorText(kOutOfMemory));
   }
+  if (!window) return;
   busy_ = false;
   ShowView();
   picture1_->update();
@@ -438,24 +492,42 @@ void Chts::Do(Deed deed) {
 // ---- Showing
 
 void Chts::ShowView() {
+  picture1_->setAccessibleName(ToQt(window_.ChartName()));
+  picture2_->setAccessibleName(ToQt(window_.PanelName()));
   const ChartWindowView& view = window_.view();
   const ChartState& state = window_.state();
   setWindowTitle(ToQt(view.Title));
   ShowStatus();
   for (int button = 1; button <= kToolButtons; ++button)
-    entries_[ToolButtonOf(button).key]->setChecked(button == view.TB);
+    entries_[ToolButtonOf(button).key]->setChecked(button == view.TB || ShownOn(button));
   entries_["cmInd"]->setChecked(state.ReversalsOn);
   entries_["cmGridLines"]->setChecked(s_.settings.charts.GridLines);
   entries_["cmPFAuto"]->setChecked(state.PFAutoBox);
   entries_["cmInsOuts"]->setChecked(state.OutsideDaysOn);
   entries_["cmMMA"]->setChecked(state.MMAOn);
+  entries_["cmKeepOsc"]->setChecked(state.KeepOsc);
   entries_["cmSwing"]->setChecked(state.SwingOn);
   PlaceLegend();
+  label1_->setText(ToQt(view.Caption));
+  if (!view.Caption.empty()) {
+    label1_->adjustSize();
+    label1_->move((area_->width() - label1_->width()) / 2, 4);
+    label1_->raise();
+  }
+  label1_->setVisible(!view.Caption.empty());
+  if (view.AutoScroll == 0)
+    timer1_.stop();
+  else if (!timer1_.isActive() || timer1_.interval() != view.AutoScroll)
+    timer1_.start(view.AutoScroll);
+  for (PictureBox* picture : {picture1_, picture2_})
+    picture->setCursor(view.CrossPointer ? Qt::CrossCursor : Qt::ArrowCursor);
   if (view.FrameShown) {
     frame1_->adjustSize();
     QPoint place = frame1_->pos();
-    if (view.Frame) place = QPoint(int(std::lround(view.Frame->left)), int(std::lround(view.Frame->top)));
-    else if (!frameStood_) place = QPoint(60, 60);
+    if (view.Frame)
+      place = QPoint(int(std::lround(view.Frame->left)), int(std::lround(view.Frame->top)));
+    else if (!frameStood_)
+      place = QPoint(60, 60);
     // Within reach, whatever was kept.
     place.setX(std::clamp(place.x(), 0, std::max(0, area_->width() - frame1_->width())));
     place.setY(std::clamp(place.y(), 0, std::max(0, area_->height() - frame1_->height())));
@@ -466,21 +538,46 @@ void Chts::ShowView() {
   frame1_->setVisible(view.FrameShown);
 }
 
+// Whether the chart on show is of the style or period that the button stands for.
+bool Chts::ShownOn(int button) const {
+  if (!window_.Chart.ChartDrawn || window_.ChartFromFile) return false;
+  const ChartRequest& request = window_.Request;
+  switch (button) {
+    case kButtonBar: return request.ChartStyle == Style::kBar;
+    case kButtonCandle: return request.ChartStyle == Style::kCandlestick;
+    case kButtonLine: return request.ChartStyle == Style::kLine;
+    case kButtonPF: return request.ChartStyle == Style::kPointFigure;
+    case kButtonDaily: return request.ChartPeriod == Period::kDaily;
+    case kButtonWeekly: return request.ChartPeriod == Period::kWeekly;
+    case kButtonMonthly: return request.ChartPeriod == Period::kMonthly;
+    default: return false;
+  }
+}
+
 void Chts::ShowStatus() {
   const ChartWindowView& view = window_.view();
   for (size_t i = 0; i < status_.size(); ++i) {
     const QString text = ToQt(view.Panels[i]);
     if (status_[i]->text() != text) status_[i]->setText(text);
+    const StatusWidths widths = StatusBarWidths(width());
+    const bool last = i + 1 == status_.size() && !view.PanelsAlike;
+    const int wide = last ? widths.last : widths.each;
+    if (status_[i]->width() != wide) status_[i]->setFixedWidth(wide);
     if (status_[i]->isVisibleTo(statusBar()) != view.PanelShown[i])
       status_[i]->setVisible(view.PanelShown[i]);
   }
+  // The reading of a tool is told by a screen reader as it moves.
+  QStringList readings;
+  for (size_t i = 2; i < view.Panels.size(); ++i)
+    if (!view.Panels[i].empty()) readings << ToQt(view.Panels[i]);
+  const QString reading = readings.join(", ");
+  if (picture1_->accessibleDescription() != reading) picture1_->setAccessibleDescription(reading);
 }
 
 void Chts::LayOut(bool twoPanes) {
   twoPanes_ = twoPanes;
-  const PaneLayout panes =
-      LayOutPanes(area_->width(), area_->height() + statusBar()->height(), 0,
-                  statusBar()->height(), twoPanes);
+  const PaneLayout panes = LayOutPanes(area_->width(), area_->height() + statusBar()->height(), 0,
+                                       statusBar()->height(), twoPanes);
   picture1_->Place(QRect(0, 0, int(panes.width), int(panes.price)));
   const bool second = panes.panel > 0;
   if (second) picture2_->Place(QRect(0, int(panes.panelTop), int(panes.width), int(panes.panel)));
@@ -508,7 +605,8 @@ void Chts::SizeChanged() {
   // A price of three digits has room in every panel; where it has not, the letters are smaller.
   QFont font = statusBar()->font();
   const auto needed = [&] { return QFontMetricsF(font).horizontalAdvance("Close  000.00") + 8; };
-  while (needed() > widths.each && font.pointSizeF() > 6.5) font.setPointSizeF(font.pointSizeF() - 0.5);
+  while (needed() > widths.each && font.pointSizeF() > 6.5)
+    font.setPointSizeF(font.pointSizeF() - 0.5);
   for (size_t i = 0; i < status_.size(); ++i) {
     if (!status_[i]) continue;
     status_[i]->setFont(font);
@@ -524,10 +622,17 @@ void Chts::TouchLine(const Surface& surface, double x1, double y1, double x2, do
   // The panel may have a scale of its own.
   const double fx = picture->width() / surface.ScaleWidth();
   const double fy = picture->height() / surface.ScaleHeight();
-  picture->update(QRectF(QPointF(std::min(x1, x2) * fx, std::min(y1, y2) * fy),
-                         QPointF(std::max(x1, x2) * fx, std::max(y1, y2) * fy))
-                      .adjusted(-2, -2, 3, 3)
-                      .toAlignedRect());
+  // A sloped line touches few of the pixels of the rectangle that it spans: a piece at a time.
+  constexpr double kPiece = 32;
+  const double dx = (x2 - x1) * fx, dy = (y2 - y1) * fy;
+  const int pieces = std::clamp(int(std::min(std::abs(dx), std::abs(dy)) / kPiece), 1, 64);
+  QRegion touched;
+  for (int i = 0; i < pieces; ++i) {
+    const QPointF from(x1 * fx + dx * i / pieces, y1 * fy + dy * i / pieces);
+    const QPointF to(x1 * fx + dx * (i + 1) / pieces, y1 * fy + dy * (i + 1) / pieces);
+    touched += QRectF(from, to).normalized().adjusted(-2, -2, 3, 3).toAlignedRect();
+  }
+  picture->update(touched);
 }
 
 // ---- Files
@@ -544,14 +649,15 @@ void Chts::SaveAs() {
     dialog.setAcceptMode(QFileDialog::AcceptSave);
     dialog.setFileMode(QFileDialog::AnyFile);
     dialog.setOption(QFileDialog::DontConfirmOverwrite);  // the question is the window's own
-    dialog.setNameFilters({"Saved charts (*.cht)", "Pictures (*.png)", "Drawings (*.svg)",
-                           "Documents (*.pdf)"});
+    dialog.setNameFilters(
+        {"Saved charts (*.cht)", "Pictures (*.png)", "Drawings (*.svg)", "Documents (*.pdf)"});
     dialog.setDefaultSuffix("cht");
     QObject::connect(&dialog, &QFileDialog::filterSelected, &dialog, [&dialog](const QString& f) {
       const QString ending = f.section("*.", 1).chopped(1);
       dialog.setDefaultSuffix(ending);
       if (dialog.selectedFiles().isEmpty()) return;
-      dialog.selectFile(QFileInfo(dialog.selectedFiles().first()).completeBaseName() + "." + ending);
+      dialog.selectFile(QFileInfo(dialog.selectedFiles().first()).completeBaseName() + "." +
+                        ending);
     });
     try {
       dialog.setDirectory(ToQt(s_.files.HostPath(paths.ChartSavePath)));
@@ -570,8 +676,8 @@ void Chts::SaveAs() {
 std::string Chts::MakePictureFile(const std::string& path) {
   const QtRasterSurface& price = picture1_->surface();
   const bool panel = picture2_->isVisibleTo(area_);
-  const PictureSize size{price.Width(), price.Height(),
-                         panel ? picture2_->surface().Height() : 0, 2};
+  const PictureSize size{price.Width(), price.Height(), panel ? picture2_->surface().Height() : 0,
+                         2};
   bool drawn = false;
   std::string bytes = MakePicture(PictureKindOf(path), size, [&](Surface& upper, Surface* lower) {
     drawn = window_.DrawAgain(upper, lower);
@@ -591,8 +697,8 @@ void Chts::ShowSaved() {
       folder = ToQt(s_.files.HostPath(s_.settings.paths.ChartSavePath));
     } catch (const RunTimeError&) {
     }
-    const QString file = QFileDialog::getOpenFileName(this, "Display Saved Chart", folder,
-                                                      "Saved charts (*.cht)");
+    const QString file =
+        QFileDialog::getOpenFileName(this, "Display Saved Chart", folder, "Saved charts (*.cht)");
     if (!file.isEmpty()) path = s_.files.DosPath(file.toStdString());
   }
   if (path) Do([&] { window_.ShowSaved(*path); });
@@ -600,7 +706,7 @@ void Chts::ShowSaved() {
 
 QImage Chts::Picture() {
   QImage both;
-  window_.WithoutCross([&] {
+  window_.WithoutTool([&] {
     const QImage& upper = picture1_->surface().image();
     if (!picture2_->isVisibleTo(area_)) {
       both = upper.copy();
@@ -625,23 +731,67 @@ void Chts::CopyPicture() { QGuiApplication::clipboard()->setImage(Picture()); }
 // ---- Mouse and keys
 
 bool Chts::eventFilter(QObject* object, QEvent* event) {
-  if (object == picture1_ && PictureEvent(event)) return true;
+  if (object == picture1_ && PictureEvent(picture1_, event)) return true;
+  if (object == picture2_ && PictureEvent(picture2_, event)) return true;
   if (object == frame1_ && FrameEvent(event)) return true;
   return QMainWindow::eventFilter(object, event);
 }
 
-bool Chts::PictureEvent(QEvent* event) {
-  if (busy_) return false;
-  if (event->type() == QEvent::MouseMove) {
-    if (!window_.GridOn()) return false;
-    const QPointF at = static_cast<QMouseEvent*>(event)->position();
-    window_.MouseMove(std::floor(at.x()), std::floor(at.y()));
+bool Chts::PictureEvent(PictureBox* picture, QEvent* event) {
+  const bool press = event->type() == QEvent::MouseButtonPress;
+  const bool release = event->type() == QEvent::MouseButtonRelease;
+  if (busy_ || !(press || release || event->type() == QEvent::MouseMove)) return false;
+  const auto* mouse = static_cast<QMouseEvent*>(event);
+  const Surface& surface = picture->surface();
+  const ToolPoint at{std::floor(mouse->position().x() * surface.ScaleWidth() / picture->width()),
+                     std::floor(mouse->position().y() * surface.ScaleHeight() / picture->height()),
+                     picture == picture1_ ? Pane::kPrice : Pane::kPanel};
+  if (!press && !release) {
+    if (!window_.ToolOn()) return false;
+    window_.MouseMove(at);
     ShowStatus();
-  } else if (event->type() == QEvent::MouseButtonRelease &&
-             static_cast<QMouseEvent*>(event)->button() == Qt::LeftButton) {
-    if (window_.GridOn()) Do([this] { window_.MouseClick(); });
+    return false;
   }
+  if (mouse->button() != Qt::LeftButton && mouse->button() != Qt::RightButton) return false;
+  const MouseButton button =
+      mouse->button() == Qt::LeftButton ? MouseButton::kLeft : MouseButton::kRight;
+  if (!window_.ToolOn() && button == MouseButton::kLeft) return false;
+  Do([&] {
+    if (press)
+      window_.MousePress(at, button);
+    else
+      window_.MouseRelease(at, button);
+  });
   return false;
+}
+
+TrendChoice Chts::PopUpTrend() {
+  QMenu menu(this);
+  menu.setObjectName("smTrend");
+  QAction* move = menu.addAction("&Move");
+  move->setObjectName("smMove");
+  QAction* remove = menu.addAction("&Delete");
+  remove->setObjectName("smDelete");
+  const QAction* chosen = menu.exec(QCursor::pos());
+  if (chosen == nullptr) return TrendChoice::kNothing;
+  return chosen == move ? TrendChoice::kMove : TrendChoice::kDelete;
+}
+
+void Chts::OpenZoom(const ZoomBox& box) {
+  QWidget* over = s_.zoomOver ? s_.zoomOver() : this;
+  ZoomKora form({s_.dialogs, window_.Chart, window_.Request, s_.colours, s_.settings.fonts}, box,
+                over, this);
+  form.exec();
+}
+
+void Chts::OpenScroll() {
+  if (window_.state().ChartStyle == Style::kPointFigure || !window_.HasChart()) return;
+  bool ready = false;
+  Do([&] { ready = scroll_.SetScrollBar(); });
+  if (!ready) return;
+  const QPointer<Chts> alive(this);
+  KoraScroll(scroll_, this).exec();
+  if (alive) Do([this] { window_.Redraw(); });
 }
 
 bool Chts::FrameEvent(QEvent* event) {
@@ -671,8 +821,7 @@ bool Chts::FrameEvent(QEvent* event) {
 // The frame around this window has menus of its own, some under the same letters: where this
 // window has the keys, its own menus open.
 bool Chts::OpenMenuByKey(QKeyEvent* event, bool open) {
-  if (event->modifiers() != Qt::AltModifier || event->key() < Qt::Key_A ||
-      event->key() > Qt::Key_Z)
+  if (event->modifiers() != Qt::AltModifier || event->key() < Qt::Key_A || event->key() > Qt::Key_Z)
     return false;
   const QString mnemonic = QString("&") + QChar(event->key());
   for (QAction* menu : menuBar()->actions())
@@ -708,30 +857,64 @@ void Chts::keyPressEvent(QKeyEvent* event) {
   if (event == QKeySequence::Save) return Trigger("cmSaveAs");
   if (event == QKeySequence::Copy) return CopyPicture();
   if (event == QKeySequence::Print) return Trigger("cmPrintChart");
-  const auto cross = [this](auto work) {
-    if (busy_ || !window_.HasChart()) return;
-    work();
-    ShowView();
-  };
+  if (ToolKey(event)) return;
   switch (plain ? event->key() : 0) {
     case Qt::Key_PageDown: return Trigger("fwd");
     case Qt::Key_PageUp: return Trigger("rev");
     case Qt::Key_F5: return Trigger("ref");
-    case Qt::Key_Left: return cross([this] { window_.MoveCross(-1); });
-    case Qt::Key_Right: return cross([this] { window_.MoveCross(1); });
-    case Qt::Key_Home: return cross([this] { window_.CrossToEnd(false); });
-    case Qt::Key_End: return cross([this] { window_.CrossToEnd(true); });
     case Qt::Key_Escape: return Do([this] { window_.CancelChartTools(); });
     default: QMainWindow::keyPressEvent(event);
   }
+}
+
+// The keys of the tool that is on: arrows move its point, ten times as far with Shift, Enter is the
+// click, and a text that is being typed takes every character.
+bool Chts::ToolKey(QKeyEvent* event) {
+  if (busy_ || !window_.HasChart() || event->key() == Qt::Key_Escape) return false;
+  const auto modifiers = event->modifiers() & ~Qt::KeypadModifier;
+  const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+  if (window_.TakesText()) {
+    if (modifiers & (Qt::ControlModifier | Qt::AltModifier | Qt::MetaModifier)) return false;
+    const QString typed = event->text();
+    if (enter)
+      Do([this] { window_.Type(13); });
+    else if (event->key() == Qt::Key_Backspace)
+      Do([this] { window_.Type(8); });
+    else if (!typed.isEmpty())
+      Do([&] {
+        for (const char32_t c : typed.toStdU32String()) window_.Type(c);
+      });
+    return true;
+  }
+  if (modifiers & ~Qt::ShiftModifier) return false;
+  const int far = modifiers & Qt::ShiftModifier ? 10 : 1;
+  const auto move = [&](auto work) {
+    work();
+    ShowView();
+    return true;
+  };
+  switch (event->key()) {
+    case Qt::Key_Left: return move([&] { window_.MovePoint(-far); });
+    case Qt::Key_Right: return move([&] { window_.MovePoint(far); });
+    case Qt::Key_Up: return move([&] { window_.MovePoint(0, -far); });
+    case Qt::Key_Down: return move([&] { window_.MovePoint(0, far); });
+    case Qt::Key_Home: return move([&] { window_.PointToEnd(false); });
+    case Qt::Key_End: return move([&] { window_.PointToEnd(true); });
+    default: break;
+  }
+  if (!enter || !window_.ToolOn()) return false;
+  Do([this] { window_.ClickPoint(); });
+  return true;
 }
 
 void Chts::CloseWindow() {
   if (busy_) return;
   Do([this] { window_.CancelChartTools(); });
   // Within the frame it is the subwindow that closes, and this form in it.
-  if (auto* sub = qobject_cast<QMdiSubWindow*>(parentWidget())) sub->close();
-  else close();
+  if (auto* sub = qobject_cast<QMdiSubWindow*>(parentWidget()))
+    sub->close();
+  else
+    close();
 }
 
 // A composition lets events run; the window has to outlive it.

@@ -9,6 +9,7 @@
 #include <optional>
 #include <string>
 
+#include "chartwindow/chart_scroll.h"
 #include "chartwindow/chart_window.h"
 #include "platform/qt/picture_box.h"
 
@@ -31,11 +32,11 @@ struct ChtsServices {
   ChartState& state;
 
   // The forms of others, by the entry that opens them: "cmChtDef", "cmColours", "cmfonts",
-  // "cmBSpaces", "cmGLSpaces", "cmLineWidth", "cmVHeight", "cmMMASet", "cmChtSpaces" (the tool
+  // "cmBSpaces", "cmGLSpaces", "cmLineWidth", "cmVHeight", "cmMMASet", "cmuSwingsettings", "cmChtSpaces" (the tool
   // bar's "cspace" too), "cmSLInd"; "new" for chart selection, "Chart2" for the second chart of
   // a pair, "OscFrm" for the settings box. They run until the form is closed, but for Chart2
-  // which may stand beside the window, and call Refresh(), Command2() or, as OscFrm does,
-  // window().ShowOscillator() as their rules say. An entry without one is greyed.
+  // which may stand beside the window, and call Refresh(), ShowChosen() or, as OscFrm does,
+  // window().ShowOscillator() as what they change asks for. An entry without one is greyed.
   std::map<std::string, std::function<void()>> forms = {};
 
   // Ask for a file: DOS paths, nothing when cancelled. Empty: the platform's own dialogs.
@@ -45,6 +46,8 @@ struct ChtsServices {
   std::function<std::string(const NameRec&)> VolumeUnitText = {};
   // The window was closed by its user.
   std::function<void()> closed = {};
+  // What the zoom stands over; empty for this window.
+  std::function<QWidget*()> zoomOver = {};
 };
 
 // The chart window, a child of the main window.
@@ -60,9 +63,9 @@ class Chts : public QMainWindow {
 
   // Shows the first chart. To be called once the form has its size.
   void Start();
-  // The hidden buttons: the next chart (chart selection has put ChartIndex one before it), and
-  // the current one once more.
-  void Command2();
+  // The chart at ChartIndex, as chart selection has left it.
+  void ShowChosen();
+  // The current chart once more.
   void Refresh();
   // The second chart of a pair was not chosen: the first is drawn alone again.
   void DropSecondChart();
@@ -96,6 +99,7 @@ class Chts : public QMainWindow {
   template <typename Deed>
   void Do(Deed deed);
   void ShowView();
+  bool ShownOn(int button) const;
   void ShowStatus();
   void LayOut(bool twoPanes);
   void PlaceLegend();
@@ -107,7 +111,11 @@ class Chts : public QMainWindow {
   std::string MakePictureFile(const std::string& path);
   void CloseWindow();
   bool OpenMenuByKey(QKeyEvent* event, bool open);
-  bool PictureEvent(QEvent* event);
+  bool PictureEvent(PictureBox* picture, QEvent* event);
+  bool ToolKey(QKeyEvent* event);
+  TrendChoice PopUpTrend();
+  void OpenZoom(const ZoomBox& box);
+  void OpenScroll();
   bool FrameEvent(QEvent* event);
   void TouchLine(const Surface& surface, double x1, double y1, double x2, double y2);
 
@@ -117,11 +125,14 @@ class Chts : public QMainWindow {
   PictureBox* picture2_;
   PictureBox* picture4_;
   QFrame* frame1_ = nullptr;
+  QLabel* label1_ = nullptr;
   QToolBar* toolbar1_ = nullptr;
   std::array<QLabel*, ChartWindowView::kPanels> status_{};
   std::map<std::string, QAction*> entries_;
   ChartWindow window_;
+  ChartScroll scroll_;
   QTimer resized_;
+  QTimer timer1_;
   bool twoPanes_ = false;
   bool busy_ = false;
   bool sizeWaits_ = false;

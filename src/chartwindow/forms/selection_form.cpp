@@ -1,11 +1,11 @@
 #include "chartwindow/forms/selection_form.h"
 
-#include <QMouseEvent>
 #include <QComboBox>
 #include <QGridLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
+#include <QMouseEvent>
 #include <QPushButton>
 #include <QScreen>
 #include <QScrollBar>
@@ -63,6 +63,7 @@ SelectionForm::SelectionForm(const char* name, const QString& title, ChtSelServi
   });
 
   text3_ = AddShown("Text3", 6);
+  text3_->setAccessibleName("Spacing");
   label4_ = AddCaption("Chart &Spacing", text3_);
   label4_->setObjectName("Label4");
   connect(text3_, &QLineEdit::textEdited, this,
@@ -185,8 +186,10 @@ bool SelectionForm::FieldEnter(QObject* field) {
   Refresh();
   // What was typed stays where it led nowhere.
   if (entered == ChartSelection::Entered::kNothing) text1_->setText(typed);
-  if (entered == ChartSelection::Entered::kFound) ok_->setFocus();
-  else text1_->selectAll();
+  if (entered == ChartSelection::Entered::kFound)
+    ok_->setFocus();
+  else
+    text1_->selectAll();
   return true;
 }
 
@@ -214,14 +217,9 @@ void SelectionForm::keyPressEvent(QKeyEvent* event) {
     case Qt::Key_Enter:
       if (auto* button = qobject_cast<QAbstractButton*>(focusWidget())) button->click();
       return;
-    case Qt::Key_PageUp:
-      vScroll1_->triggerAction(QAbstractSlider::SliderSingleStepSub);
-      return;
-    case Qt::Key_PageDown:
-      vScroll1_->triggerAction(QAbstractSlider::SliderSingleStepAdd);
-      return;
-    default:
-      QDialog::keyPressEvent(event);
+    case Qt::Key_PageUp: vScroll1_->triggerAction(QAbstractSlider::SliderSingleStepSub); return;
+    case Qt::Key_PageDown: vScroll1_->triggerAction(QAbstractSlider::SliderSingleStepAdd); return;
+    default: QDialog::keyPressEvent(event);
   }
 }
 

@@ -26,9 +26,9 @@ struct ChtSelServices {
   const Settings& settings;
   const SettingsFile& user;
   const ChartColours& colours;
-  std::function<void()> showChart;     // the chart window's NextChart
-  std::function<void()> showWindow;    // shows the chart window, on the way from the start
-  std::function<void()> closed;        // the chart window closes, the menus come back
+  std::function<void()> showChart;           // the chart window's NextChart
+  std::function<void()> showWindow;          // shows the chart window, on the way from the start
+  std::function<void()> closed;              // the chart window closes, the menus come back
   std::function<void()> secondDropped = {};  // the second chart of a pair was not chosen
   // Chart defaults, modally; `averagesChanged` is called when an average was switched or saved.
   std::function<void(const std::function<void()>& averagesChanged)> openChtDef;

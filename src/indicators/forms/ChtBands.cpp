@@ -7,8 +7,8 @@
 
 #include "base/runtime_error.h"
 #include "indicators/price_overlays.h"
+#include "looks/look_settings.h"
 #include "platform/qt/form_parts.h"
-#include "store/look_settings.h"
 
 namespace kora {
 
@@ -40,8 +40,8 @@ void ChtBands::Save() {
       FocusField(text_[0]);
       return;
     }
-  } catch (const RunTimeError&) {
-    services_.dialogs.Message(kNotSavedMessage, kNotSavedTitle);
+  } catch (const RunTimeError& e) {
+    services_.dialogs.Message(NotSavedText(e), kNotSavedTitle);
     return;
   }
   accept();

@@ -12,16 +12,8 @@
 namespace kora {
 namespace {
 
-// As the form names the periods, in the order of OscKeys().
-constexpr const char* kPeriodCaptions[] = {
-    "Stochastic K",        "Stochastic D",         "FX periods",          "FX average",
-    "ROC periods",         "ROC average",          "RSI periods",         "RMO periods",
-    "RMO average",         "RMX periods",          "RMX average",         "MACD EMA 1",
-    "MACD EMA 2",          "MACD EMA 3 signal",    "Williams %R period",  "Elder Ray  period",
-    "Directional Move DX", "Directional Move ADX", "Momentum  period",    "Coppock",
-    "Jones Holy Grail",    "Volatility"};
-static_assert(std::size(kPeriodCaptions) == 22);
-constexpr int kRowsAColumn = 11;
+constexpr size_t kColumns = 2;  // of periods
+constexpr int kLongestPeriod = 32767;
 
 }  // namespace
 
@@ -41,9 +33,16 @@ class ToggleBox : public QPushButton {
   void Set(bool value) {
     value_ = value;
     setText(value ? on_ : off_);
+    if (!what_.isEmpty()) setAccessibleName(what_ + ": " + text());
+  }
+  // What the words are about, for those who can't see the label.
+  void Call(const QString& what) {
+    what_ = what.simplified();
+    Set(value_);
   }
 
  private:
+  QString what_;
   QString on_, off_;
   bool value_ = false;
 };
@@ -73,7 +72,15 @@ ChtDef::ChtDef(ChtDefServices services, QWidget* parent)
   buttons->Add("Command2", "&Close", [this] { reject(); });
   buttons->Add("Command3", "Change Sca&les", [this] { OpenScales(); })
       ->setEnabled(bool(services_.openScales));
+  saved_ = NewLabel(this, {});
+  saved_->setObjectName("Saved");
+  buttons->insertWidget(0, saved_);
   layout->addLayout(buttons);
+  for (QLineEdit* field : findChildren<QLineEdit*>())
+    connect(field, &QLineEdit::textEdited, saved_, &QLabel::clear);
+  for (QAbstractButton* box : findChildren<QAbstractButton*>())
+    if (box->objectName() != "Command1")
+      connect(box, &QAbstractButton::clicked, saved_, &QLabel::clear);
 
   connect(avOne_, &QPushButton::clicked, this, [this] { AverageSwitched(); });
   connect(avTwo_, &QPushButton::clicked, this, [this] { AverageSwitched(); });
@@ -100,12 +107,13 @@ void ChtDef::AddHeads(QGridLayout* grid, int column) {
 }
 
 void ChtDef::AddPeriods(QGridLayout* grid) {
-  for (int i = 0; i < 22; ++i) {
-    const int column = i < kRowsAColumn ? 0 : 4;
-    if (i % kRowsAColumn == 0) AddHeads(grid, column);
-    const OscKey& key = OscKeys()[size_t(i)];
-    periods_[size_t(i)] = AddTwin(grid, 1 + i % kRowsAColumn, column, kPeriodCaptions[i],
-                                  key.daily, key.twin);
+  const std::span<const OscKey> keys = OscKeys();
+  const size_t rows = (keys.size() + kColumns - 1) / kColumns;
+  for (size_t i = 0; i < keys.size(); ++i) {
+    const int column = int(i / rows) * 4, row = int(i % rows);
+    if (row == 0) AddHeads(grid, column);
+    periods_.push_back(
+        AddTwin(grid, 1 + row, column, keys[i].caption, keys[i].daily, keys[i].twin));
   }
 }
 
@@ -114,7 +122,7 @@ void ChtDef::AddSwitches(QGridLayout* grid) {
   AddHeads(grid, kColumn);
   const auto average = [&](int row, const char* caption, const char* name) {
     auto* box = new ToggleBox(this, name, "ON", "OFF");
-    box->setAccessibleDescription(caption);
+    box->Call(caption);
     grid->addWidget(box, row, kColumn + 3);
     return box;
   };
@@ -124,10 +132,9 @@ void ChtDef::AddSwitches(QGridLayout* grid) {
   avTwo_ = average(2, "Average 2", "AvTwo");
 
   int row = 3;
-  const auto toggle = [&](const char* caption, const char* name, const char* on,
-                          const char* off) {
+  const auto toggle = [&](const char* caption, const char* name, const char* on, const char* off) {
     auto* box = new ToggleBox(this, name, on, off);
-    box->setAccessibleDescription(caption);
+    box->Call(caption);
     grid->addWidget(NewLabel(this, caption, box), row, kColumn);
     grid->addWidget(box, row++, kColumn + 1, 1, 2);
     return box;
@@ -192,7 +199,7 @@ ChartDefaults ChtDef::Typed() const {
                                fields.second->text().toStdString()};
   };
   ChartDefaults form;
-  for (size_t i = 0; i < periods_.size(); ++i) form.periods[i] = twin(periods_[i]);
+  for (const Twin& fields : periods_) form.periods.push_back(twin(fields));
   form.average1 = twin(average1_);
   form.average2 = twin(average2_);
   form.CompFile = compFile_->text().toStdString();
@@ -211,7 +218,26 @@ ChartDefaults ChtDef::Typed() const {
   return form;
 }
 
+QLineEdit* ChtDef::FirstFault() const {
+  std::vector<Twin> all = periods_;
+  all.insert(all.end(), {average1_, average2_});
+  for (const Twin& fields : all)
+    for (QLineEdit* field : {fields.first, fields.second}) {
+      bool whole = false;
+      const int value = field->text().trimmed().toInt(&whole);
+      if (!whole || value < 0 || value > kLongestPeriod) return field;
+    }
+  return nullptr;
+}
+
 void ChtDef::Save() {
+  saved_->clear();
+  if (QLineEdit* fault = FirstFault()) {
+    services_.dialogs.Message("Value must be between 0 and " + std::to_string(kLongestPeriod),
+                              windowTitle().toStdString());
+    FocusField(fault);
+    return;
+  }
   const DefaultsSaved saved = SaveChartDefaults(services_.ini, services_.files, services_.dialogs,
                                                 Typed(), services_.settings);
   if (saved == DefaultsSaved::kCompareFile) {
@@ -221,6 +247,7 @@ void ChtDef::Save() {
   // As it was kept: a text that was no number is 0 now.
   Fill(DefaultsFromSettings(services_.settings));
   if (services_.averagesChanged) services_.averagesChanged();
+  saved_->setText("Saved");
 }
 
 // Takes effect before a save.

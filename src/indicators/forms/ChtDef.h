@@ -3,11 +3,13 @@
 #include <QDialog>
 #include <functional>
 #include <utility>
+#include <vector>
 
 #include "indicators/chart_defaults.h"
 
 class QCheckBox;
 class QGridLayout;
+class QLabel;
 class QLineEdit;
 
 namespace kora {
@@ -22,11 +24,11 @@ struct ChtDefServices {
   Dialogs& dialogs;
   Settings& settings;
   const ChartColours& colours;
-  std::string chartPeriod;              // "A", "W", "M"
+  Period chartPeriod;
   ChtDefOpener opener;
-  std::function<void()> readSettings;   // reads the keys anew when the form opens
-  std::function<void()> openScales;     // the form of manual scales
-  std::function<void()> refreshChart;   // the chart window's refresh button
+  std::function<void()> readSettings;  // reads the keys anew when the form opens
+  std::function<void()> openScales;    // the form of manual scales
+  std::function<void()> refreshChart;  // the chart window's refresh button
   // An average was switched, or all was saved: the settings hold what charts are to take.
   std::function<void()> averagesChanged;
 };
@@ -50,16 +52,19 @@ class ChtDef : public QDialog {
   void AddSwitches(QGridLayout* grid);
   void Fill(const ChartDefaults& form);
   ChartDefaults Typed() const;
+  // The first box whose text is no period, or nothing.
+  QLineEdit* FirstFault() const;
   void Save();
   void OpenScales();
   void AverageSwitched();
 
   ChtDefServices services_;
-  std::array<Twin, 22> periods_;
+  std::vector<Twin> periods_;  // in the order of OscKeys()
   Twin average1_, average2_;
   ToggleBox *avOne_, *avTwo_, *avCalc_, *scMethod_;
   ToggleBox *bars_, *lines_, *volumes_, *cutVols_, *showOsc_;
   QCheckBox *fxRev_, *fillIn_, *rfAve_;
+  QLabel* saved_;
   QLineEdit* compFile_;
 };
 

@@ -4,7 +4,7 @@
 #include <array>
 #include <cstdint>
 
-#include "store/forms/look_services.h"
+#include "looks/forms/look_services.h"
 
 class QLineEdit;
 

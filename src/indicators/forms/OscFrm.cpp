@@ -22,22 +22,22 @@ OscFrm::OscFrm(OscFrmServices services, std::string_view oscCode, QWidget* paren
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("OscFrm");
   auto* grid = new QGridLayout(this);
-  if (services_.chartStyle == 'P') {
+  if (services_.chartStyle == Style::kPointFigure) {
     setWindowTitle("Point and Figure");
+    setMinimumWidth(fontMetrics().averageCharWidth() * 36);  // room for the title
     fields_.push_back(
         AddField("Text1", "Box Value ", Str(services_.boxValue), kFieldLimit, kFieldLimit));
   } else if ((box_ = FindOscBox(oscCode))) {
-    setWindowTitle(box_->caption);
+    setWindowTitle(box_->boxCaption);
     FillOscDefaults(services_.settings.osc, services_.chartPeriod);
     for (const OscField& field : box_->fields) {
-      const std::int16_t period =
-          (services_.settings.osc.*field.value).For(services_.chartPeriod);
+      const std::int16_t period = services_.settings.osc[field.key].For(services_.chartPeriod);
       fields_.push_back(AddField(QString("Text%1").arg(fields_.size() + 1), field.label,
                                  Str(std::int32_t(period)), kFieldLimit, kFieldLimit));
     }
     if (box_->compares)
-      compare_ = AddField("Text5", kCompareLabel, services_.settings.osc.CompFile, 36,
-                          kCompareLimit);
+      compare_ =
+          AddField("Text5", kCompareLabel, services_.settings.osc.CompFile, 36, kCompareLimit);
   }
   grid->setColumnStretch(1, 1);
   AddOkCancel(this, grid, [this] { Save(); });
@@ -81,7 +81,7 @@ bool OscFrm::eventFilter(QObject* object, QEvent* event) {
 }
 
 void OscFrm::Save() {
-  if (services_.chartStyle == 'P' ? !SaveBoxValue() : !SavePeriods()) return;
+  if (services_.chartStyle == Style::kPointFigure ? !SaveBoxValue() : !SavePeriods()) return;
   accept();
   if (services_.redraw) services_.redraw();
 }

@@ -15,8 +15,8 @@ struct OscFrmServices {
   const Files& files;
   Dialogs& dialogs;
   Settings& settings;
-  std::string chartPeriod;       // "A", "W", "M"
-  char chartStyle;               // 'P': the box value is asked for
+  Period chartPeriod;
+  Style chartStyle;              // point and figure: the box value is asked for
   float& boxValue;               // of the point-and-figure chart
   std::function<void()> redraw;  // runs the oscillator's routine; empty when not for a redraw
 };
@@ -37,7 +37,7 @@ class OscFrm : public QDialog {
   bool SaveBoxValue();
 
   OscFrmServices services_;
-  const OscBox* box_ = nullptr;
+  const Oscillator* box_ = nullptr;
   std::vector<QLineEdit*> fields_;
   QLineEdit* compare_ = nullptr;
 };

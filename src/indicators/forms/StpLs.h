@@ -2,7 +2,7 @@
 
 #include <QDialog>
 
-#include "store/forms/look_services.h"
+#include "looks/forms/look_services.h"
 
 class QLineEdit;
 class QRadioButton;

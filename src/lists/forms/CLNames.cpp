@@ -40,7 +40,15 @@ CLNames::CLNames(ListFormServices services, QWidget* parent)
 
 bool CLNames::Save() {
   UserListNames names;
-  for (int i = 0; i < kUserLists; ++i) names[size_t(i)] = text1_[i]->text().trimmed().toStdString();
+  for (int i = 0; i < kUserLists; ++i) {
+    std::string& name = names[size_t(i)];
+    name = text1_[i]->text().trimmed().toStdString();
+    if (const std::string why = WhyNotKept(name); !why.empty()) {
+      services_.dialogs.Message(name + " " + why, "Sub-List Names");
+      text1_[i]->setFocus();
+      return false;
+    }
+  }
   if (!SaveSLNames(services_.user, names)) {
     services_.dialogs.Message("Unable to save data", "Sub-List Names");
     return false;
@@ -50,8 +58,8 @@ bool CLNames::Save() {
 }
 
 void CLNames::reject() {
-  if (changed_ && services_.dialogs.Ask(kSaveChanges, "Sub-List Names", Buttons::kYesNo) ==
-                      Answer::kYes &&
+  if (changed_ &&
+      services_.dialogs.Ask(kSaveChanges, "Sub-List Names", Buttons::kYesNo) == Answer::kYes &&
       !Save())
     return;
   QDialog::reject();

@@ -1,29 +1,47 @@
 #pragma once
 
 #include <QDialog>
+#include <functional>
+#include <memory>
 #include <string>
 
-#include "base/files.h"
-#include "lists/industry_classes.h"
-
-class QTableWidget;
+#include "lists/forms/grid.h"
+#include "store/industry_classes.h"
 
 namespace kora {
 
-class Dialogs;
-
-// The table of industry classes, to pick one from.
+// The table of industry classes: to edit, or to pick one from.
 class IndClass : public QDialog {
  public:
-  IndClass(const Files& files, Dialogs& dialogs, const std::string& systemPath, QWidget* parent);
+  enum class Use { kPick, kEdit };
+  // `user` keeps the widths of the columns; null keeps none.
+  IndClass(const Files& files, Dialogs& dialogs, const std::string& systemPath, QWidget* parent,
+           Use use = Use::kPick, SettingsFile* user = nullptr);
+  ~IndClass() override;
 
   // The row of that class is the one in hand.
   void Select(const std::string& id);
   // The id in hand once the form was accepted; empty when there is no class at all.
   std::string chosen() const;
+  // Percent of the size of the table.
+  void SetZoom(int percent);
+  // Asks the user for that size over a form, for the entry "Display".
+  std::function<int(QWidget* over)> changeSize = {};
+
+  // A changed table is saved first.
+  void reject() override;
 
  private:
-  QTableWidget* grid_;
+  class Source;
+
+  void AddEditMenu();
+
+  const Files& files_;
+  Dialogs& dialogs_;
+  const std::string systemPath_;
+  std::unique_ptr<Source> source_;
+  Grid* grid_;
+  bool changed_ = false;
 };
 
 }  // namespace kora

@@ -8,6 +8,7 @@
 #include <QPushButton>
 #include <QSpinBox>
 
+#include "base/text.h"
 #include "store/name_file.h"
 
 namespace kora {
@@ -38,8 +39,9 @@ SubList::SubList(ListFormServices services, QWidget* parent)
   combo1_ = new QComboBox(this);
   combo1_->setObjectName("Combo1");
   list1_ = new CodeList("List1", this);
-  AddEditOptions(list1_, "&Delete Selected Item/s", [this] { DeleteSelected(); },
-                 [this] { DeleteAll(); });
+  list1_->setAccessibleName("Current Chart List");
+  AddEditOptions(
+      list1_, "&Delete Selected Item/s", [this] { DeleteSelected(); }, [this] { DeleteAll(); });
   text2_ = new QLineEdit(this);
   text2_->setObjectName("Text2");
   text2_->setMaxLength(6);
@@ -47,12 +49,12 @@ SubList::SubList(ListFormServices services, QWidget* parent)
   add_ = Button("Command4", "< &Add", this);
   del_ = Button("Command1", "&Del", this);
   list2_ = new CodeList("List2", this);
+  list2_->setAccessibleName("Current name file codes");
   list2_->installEventFilter(this);
   auto* columns = new QSpinBox(this);
   columns->setObjectName("Text1");
   columns->setRange(1, 9);
-  columns->setValue(3);
-  list2_->SetColumns(3);
+  list2_->SetColumns(1);  // with room for the names
   save_ = Button("Command2", "&Save", this);
   auto* close = Button("Command3", "C&lose", this);
 
@@ -97,6 +99,7 @@ SubList::SubList(ListFormServices services, QWidget* parent)
   ComboList();
   StockList();
   Edited();
+  connect(text2_, &QLineEdit::textEdited, this, &SubList::FindWhileTyping);
   connect(combo1_, &QComboBox::activated, this, [this](int index) { ListChosen(index); });
   connect(add_, &QPushButton::clicked, this, [this] { Add(); });
   connect(del_, &QPushButton::clicked, this, [this] { DeleteSelected(); });
@@ -117,19 +120,51 @@ void SubList::ComboList() {
 void SubList::ShowList() {
   codes_.clear();
   changed_ = false;
-  TellErrors(services_.dialogs, kTitle, [this] {
-    codes_ = CodesOf(ReadList(services_.files, services_.settings.paths.CurrentDataPath, ListNo()));
+  const std::string& dataPath = services_.settings.paths.CurrentDataPath;
+  TellErrors(services_.dialogs, kTitle, [&] {
+    listStamp_ = services_.files.Stamp(ListFilePath(dataPath, ListNo()));
+    codes_ = CodesOf(ReadList(services_.files, dataPath, ListNo()));
   });
-  list1_->Show(codes_);
+  list1_->Show(codes_, names_);
   Edited();
 }
 
 void SubList::StockList() {
-  TellErrors(services_.dialogs, kTitle, [this] {
-    for (const NameRec& rec : ReadNames(services_.files, services_.settings.paths.CurrentDataPath))
-      if (!rec.Code.trimmed().empty()) nameCodes_.emplace_back(rec.Code.trimmed());
+  const std::string& dataPath = services_.settings.paths.CurrentDataPath;
+  nameCodes_.clear();
+  names_.clear();
+  TellErrors(services_.dialogs, kTitle, [&] {
+    namesStamp_ = services_.files.Stamp(NameFilePath(dataPath));
+    for (const NameRec& rec : ReadNames(services_.files, dataPath)) {
+      if (rec.Code.trimmed().empty()) continue;
+      nameCodes_.emplace_back(rec.Code.trimmed());
+      names_.emplace(nameCodes_.back(), FromAnsi(rec.Name.trimmed()));
+    }
   });
-  list2_->Show(nameCodes_);
+  list2_->Show(nameCodes_, names_);
+}
+
+// The first code that begins with what is typed, else the first name with it.
+void SubList::FindWhileTyping(const QString& typed) {
+  const std::string wanted = UCase(Trim(typed.toStdString()));
+  if (wanted.empty()) return;
+  for (const bool byName : {false, true}) {
+    for (size_t i = 0; i < nameCodes_.size(); ++i) {
+      const bool matches = byName ? UCase(names_[nameCodes_[i]]).find(wanted) != std::string::npos
+                                  : UCase(nameCodes_[i]).starts_with(wanted);
+      if (matches) return list2_->SelectOnly(i);
+    }
+  }
+}
+
+void SubList::LookAgain() {
+  const std::string& dataPath = services_.settings.paths.CurrentDataPath;
+  TellErrors(services_.dialogs, kTitle, [&] {
+    if (services_.files.Stamp(NameFilePath(dataPath)) != namesStamp_) StockList();
+    if (list_ >= 0 && !changed_ &&
+        services_.files.Stamp(ListFilePath(dataPath, ListNo())) != listStamp_)
+      ShowList();
+  });
 }
 
 // What can be done now.
@@ -154,7 +189,7 @@ void SubList::ListChosen(int index) {
 void SubList::AddAt(size_t place) {
   if (!AddCode(codes_, nameCodes_[place])) return;
   changed_ = true;
-  list1_->addItem(QString::fromStdString(codes_.back()));
+  list1_->Append(codes_.back(), names_);
   list1_->SelectOnly(codes_.size() - 1);
 }
 
@@ -186,7 +221,7 @@ void SubList::DeleteSelected() {
   if (gone.empty()) return;
   DeleteItems(codes_, gone);
   changed_ = true;
-  list1_->Show(codes_);
+  list1_->Show(codes_, names_);
   if (!codes_.empty()) list1_->SelectOnly(std::min(gone.front(), codes_.size() - 1));
   Edited();
 }
@@ -202,9 +237,17 @@ void SubList::DeleteAll() {
 }
 
 bool SubList::Save() {
-  if (!TellErrors(services_.dialogs, kTitle, [this] {
-        SaveSubList(services_.files, services_.settings.paths.CurrentDataPath, ListNo(), codes_);
-      }))
+  const std::string& dataPath = services_.settings.paths.CurrentDataPath;
+  bool save = true;
+  if (!TellErrors(services_.dialogs, kTitle,
+                  [&] {
+                    const auto held = services_.files.lock().Hold();
+                    save = services_.files.Stamp(ListFilePath(dataPath, ListNo())) == listStamp_ ||
+                           services_.dialogs.Ask(kListChangedOutside, kTitle, Buttons::kYesNo) ==
+                               Answer::kYes;
+                    if (save) SaveSubList(services_.files, dataPath, ListNo(), codes_);
+                  }) ||
+      !save)
     return false;
   ShowList();
   return true;
@@ -223,12 +266,19 @@ void SubList::reject() {
   if (LeaveList()) QDialog::reject();
 }
 
+bool SubList::event(QEvent* event) {
+  if (event->type() == QEvent::WindowActivate) LookAgain();
+  return QDialog::event(event);
+}
+
 bool SubList::eventFilter(QObject* object, QEvent* event) {
   if (event->type() == QEvent::KeyPress) {
     const int key = static_cast<QKeyEvent*>(event)->key();
     if (key == Qt::Key_Return || key == Qt::Key_Enter) {
-      if (object == text2_) AddTyped();
-      else Add();
+      if (object == text2_)
+        AddTyped();
+      else
+        Add();
       return true;
     }
   }

@@ -31,12 +31,16 @@ class SubList : public QDialog {
 
  protected:
   bool eventFilter(QObject* object, QEvent* event) override;
+  bool event(QEvent* event) override;
 
  private:
   void ComboList();
   void ShowList();
   void StockList();
+  // Reads again what another program changed meanwhile.
+  void LookAgain();
   void ListChosen(int index);
+  void FindWhileTyping(const QString& typed);
   void Add();
   void AddTyped();
   void AddAt(size_t place);
@@ -55,6 +59,8 @@ class SubList : public QDialog {
   QPushButton *add_, *del_, *save_;
   int list_ = -1;  // of the combo, from 0
   ListCodes codes_, nameCodes_;
+  FileStamp listStamp_, namesStamp_;  // of the files that they were read from
+  CodeNames names_;
   bool changed_ = false;
 };
 

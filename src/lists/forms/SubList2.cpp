@@ -1,11 +1,15 @@
 #include "lists/forms/SubList2.h"
 
 #include <QComboBox>
+#include <QEvent>
 #include <QGridLayout>
 #include <QGroupBox>
 #include <QLabel>
 #include <QPushButton>
 
+#include "base/runtime_error.h"
+#include "base/text.h"
+#include "store/name_file.h"
 namespace kora {
 namespace {
 
@@ -17,6 +21,12 @@ SubList2::SubList2(ListFormServices services, QWidget* parent)
     : QDialog(parent), services_(services) {
   setObjectName("SubList2");
   setWindowTitle(kTitle);
+  try {
+    for (const NameRec& rec : ReadNames(services_.files, services_.settings.paths.CurrentDataPath))
+      names_.emplace(rec.Code.trimmed(), FromAnsi(rec.Name.trimmed()));
+  } catch (const RunTimeError&) {
+    // The codes alone do; what needs the name file tells of it.
+  }
   auto* grid = new QGridLayout(this);
 
   const char* captions[] = {"&First list", "S&econd list"};
@@ -30,8 +40,9 @@ SubList2::SubList2(ListFormServices services, QWidget* parent)
     caption->setBuddy(combo1_[side]);
     list1_[side] = new CodeList(side == 0 ? "List1(0)" : "List1(1)", this);
     list1_[side]->setAccessibleName(QString(captions[side]).remove('&'));
-    AddEditOptions(list1_[side], "&Delete", [this, side] { DeleteSelected(side); },
-                   [this, side] { DeleteAll(side); });
+    AddEditOptions(
+        list1_[side], "&Delete", [this, side] { DeleteSelected(side); },
+        [this, side] { DeleteAll(side); });
     grid->addWidget(caption, 0, side * 2);
     grid->addWidget(combo1_[side], 1, side * 2);
     grid->addWidget(list1_[side], 2, side * 2);
@@ -55,8 +66,8 @@ SubList2::SubList2(ListFormServices services, QWidget* parent)
     for (int to = 0; to < 2; ++to) {
       const std::string name = "Command1(" + std::to_string(first + to) + ")";
       auto* arrow = button(name.c_str(), to == 0 ? "<--- " : " --->", tip);
-      arrow->setAccessibleName(QString(title) + (to == 0 ? " to the first list"
-                                                         : " to the second list"));
+      arrow->setAccessibleName(QString(title) +
+                               (to == 0 ? " to the first list" : " to the second list"));
       connect(arrow, &QPushButton::clicked, this, [this, to, move] { Transfer(1 - to, move); });
       rows->addWidget(arrow);
     }
@@ -122,10 +133,12 @@ void SubList2::ShowSide(int side) {
   shown.Changed = false;
   if (shown.ChartListNo != 0)
     TellErrors(services_.dialogs, kTitle, [&] {
-      shown.Codes = CodesOf(ReadList(services_.files, services_.settings.paths.CurrentDataPath,
-                                     shown.ChartListNo));
+      stamps_[side] = services_.files.Stamp(
+          ListFilePath(services_.settings.paths.CurrentDataPath, shown.ChartListNo));
+      shown.Codes = CodesOf(
+          ReadList(services_.files, services_.settings.paths.CurrentDataPath, shown.ChartListNo));
     });
-  list1_[side]->Show(shown.Codes);
+  list1_[side]->Show(shown.Codes, names_);
   Edited();
 }
 
@@ -139,8 +152,8 @@ void SubList2::Transfer(int from, bool move) {
     return;
   }
   if (places.empty()) return;
-  if (move) list1_[from]->Show(source.Codes);
-  list1_[1 - from]->Show(target.Codes);
+  if (move) list1_[from]->Show(source.Codes, names_);
+  list1_[1 - from]->Show(target.Codes, names_);
   Edited();
 }
 
@@ -154,15 +167,14 @@ void SubList2::DeleteSelected(int side) {
   if (gone.empty()) return;
   DeleteItems(shown.Codes, gone);
   shown.Changed = true;
-  list1_[side]->Show(shown.Codes);
+  list1_[side]->Show(shown.Codes, names_);
   Edited();
 }
 
 void SubList2::DeleteAll(int side) {
   ListSide& shown = sides_[side];
-  if (shown.Codes.empty() ||
-      services_.dialogs.Ask(DeleteAllFromQuestion(NameOf(side)), kTitle, Buttons::kYesNo) !=
-          Answer::kYes)
+  if (shown.Codes.empty() || services_.dialogs.Ask(DeleteAllFromQuestion(NameOf(side)), kTitle,
+                                                   Buttons::kYesNo) != Answer::kYes)
     return;
   shown.Codes.clear();
   shown.Changed = true;
@@ -173,9 +185,8 @@ void SubList2::DeleteAll(int side) {
 void SubList2::CheckAll() {
   if (!LeaveList(0) || !LeaveList(1)) return;
   services_.dialogs.SetBusy(true);
-  TellErrors(services_.dialogs, kTitle, [this] {
-    CheckAllLists(services_.files, services_.settings.paths.CurrentDataPath);
-  });
+  TellErrors(services_.dialogs, kTitle,
+             [this] { CheckAllLists(services_.files, services_.settings.paths.CurrentDataPath); });
   services_.dialogs.SetBusy(false);
   ShowSide(0);
   ShowSide(1);
@@ -183,10 +194,20 @@ void SubList2::CheckAll() {
 
 bool SubList2::SaveSL(int side) {
   ListSide& shown = sides_[side];
-  if (!TellErrors(services_.dialogs, kTitle, [&] {
-        SaveSubList(services_.files, services_.settings.paths.CurrentDataPath, shown.ChartListNo,
-                    shown.Codes);
-      }))
+  const std::string& dataPath = services_.settings.paths.CurrentDataPath;
+  bool save = true;
+  if (!TellErrors(services_.dialogs, kTitle,
+                  [&] {
+                    const auto held = services_.files.lock().Hold();
+                    const auto stamp =
+                        services_.files.Stamp(ListFilePath(dataPath, shown.ChartListNo));
+                    save = stamp == stamps_[side] ||
+                           services_.dialogs.Ask(kListChangedOutside, kTitle, Buttons::kYesNo) ==
+                               Answer::kYes;
+                    if (save)
+                      SaveSubList(services_.files, dataPath, shown.ChartListNo, shown.Codes);
+                  }) ||
+      !save)
     return false;
   ShowSide(side);
   return true;
@@ -194,11 +215,23 @@ bool SubList2::SaveSL(int side) {
 
 bool SubList2::LeaveList(int side) {
   if (!sides_[side].Changed) return true;
-  if (services_.dialogs.Ask(ChangedQuestion(NameOf(side)), kTitle, Buttons::kYesNo) ==
-      Answer::kYes)
+  if (services_.dialogs.Ask(ChangedQuestion(NameOf(side)), kTitle, Buttons::kYesNo) == Answer::kYes)
     return SaveSL(side);
   sides_[side].Changed = false;
   return true;
+}
+
+// Coming back to the form, a list that another program changed is read again.
+bool SubList2::event(QEvent* event) {
+  if (event->type() == QEvent::WindowActivate)
+    for (const int side : {0, 1})
+      if (const ListSide& shown = sides_[side]; shown.ChartListNo != 0 && !shown.Changed)
+        TellErrors(services_.dialogs, kTitle, [&] {
+          const std::string& dataPath = services_.settings.paths.CurrentDataPath;
+          if (services_.files.Stamp(ListFilePath(dataPath, shown.ChartListNo)) != stamps_[side])
+            ShowSide(side);
+        });
+  return QDialog::event(event);
 }
 
 void SubList2::reject() {

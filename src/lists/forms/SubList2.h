@@ -13,6 +13,9 @@ class SubList2 : public QDialog {
 
   void reject() override;
 
+ protected:
+  bool event(QEvent* event) override;
+
  private:
   void ListChosen(int side, int index);
   void ShowSide(int side);
@@ -31,6 +34,8 @@ class SubList2 : public QDialog {
   CodeList* list1_[2];
   QPushButton* save_;
   ListSide sides_[2];
+  FileStamp stamps_[2];  // of the files that they were read from
+  CodeNames names_;
 };
 
 }  // namespace kora

@@ -3,18 +3,42 @@
 #include <QAction>
 #include <QMenu>
 #include <QResizeEvent>
+#include <QStyledItemDelegate>
 #include <algorithm>
 
+#include "base/home_lock.h"
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "platform/dialogs.h"
 
 namespace kora {
 
+namespace {
+
+constexpr int kNameRole = Qt::UserRole;
+
+// The name beside the code: the item's text stays the code, by which one types to find it.
+class CodeWithName : public QStyledItemDelegate {
+ public:
+  using QStyledItemDelegate::QStyledItemDelegate;
+
+ protected:
+  void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override {
+    QStyledItemDelegate::initStyleOption(option, index);
+    const QString name = index.data(kNameRole).toString();
+    if (!name.isEmpty()) option->text += "\t" + name;
+  }
+};
+
+}  // namespace
+
 bool TellErrors(Dialogs& dialogs, const char* title, const std::function<void()>& work) {
   try {
     work();
     return true;
+  } catch (const HomeIsHeld& e) {
+    dialogs.Message(e.what(), title);
+    return false;
   } catch (const RunTimeError& e) {
     dialogs.Message("There is an unexpected error number " + Str(e.number()) + "\n" + e.what(),
                     title);
@@ -26,16 +50,23 @@ CodeList::CodeList(const char* name, QWidget* parent) : QListWidget(parent) {
   setObjectName(name);
   setSelectionMode(ExtendedSelection);
   setUniformItemSizes(true);
+  setItemDelegate(new CodeWithName(this));
   setMinimumHeight(fontMetrics().height() * 12);
   setMinimumWidth(fontMetrics().averageCharWidth() * 20);
 }
 
-void CodeList::Show(const std::vector<std::string>& codes) {
+void CodeList::Show(const std::vector<std::string>& codes, const CodeNames& names) {
   clear();
-  QStringList texts;
-  texts.reserve(qsizetype(codes.size()));
-  for (const std::string& code : codes) texts.append(QString::fromStdString(code));
-  addItems(texts);
+  for (const std::string& code : codes) Append(code, names);
+}
+
+void CodeList::Append(const std::string& code, const CodeNames& names) {
+  auto* item = new QListWidgetItem(QString::fromStdString(code));
+  if (const auto name = names.find(code); name != names.end()) {
+    item->setData(kNameRole, QString::fromStdString(name->second));
+    item->setToolTip(QString::fromStdString(name->second));
+  }
+  addItem(item);
 }
 
 std::vector<size_t> CodeList::Selected() const {
@@ -83,9 +114,8 @@ void AddEditOptions(CodeList* list, const char* deleteCaption, std::function<voi
   list->addAction(del);  // for its shortcut
   menu->addAction("&Delete All Items", list, std::move(deleteAll))->setObjectName("SlmnuDAI");
   list->setContextMenuPolicy(Qt::CustomContextMenu);
-  QObject::connect(list, &QWidget::customContextMenuRequested, menu, [list, menu](QPoint at) {
-    menu->popup(list->viewport()->mapToGlobal(at));
-  });
+  QObject::connect(list, &QWidget::customContextMenuRequested, menu,
+                   [list, menu](QPoint at) { menu->popup(list->viewport()->mapToGlobal(at)); });
 }
 
 }  // namespace kora

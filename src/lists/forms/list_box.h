@@ -2,6 +2,7 @@
 
 #include <QListWidget>
 #include <functional>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -14,12 +15,16 @@ class Dialogs;
 // Runs `work`; a run-time error is told under `title`. False then.
 bool TellErrors(Dialogs& dialogs, const char* title, const std::function<void()>& work);
 
+// Names by code, shown beside the codes.
+using CodeNames = std::map<std::string, std::string, std::less<>>;
+
 // A list of codes in which several can be selected.
 class CodeList : public QListWidget {
  public:
   CodeList(const char* name, QWidget* parent);
 
-  void Show(const std::vector<std::string>& codes);
+  void Show(const std::vector<std::string>& codes, const CodeNames& names);
+  void Append(const std::string& code, const CodeNames& names);
   // Places of the selected items, in list order.
   std::vector<size_t> Selected() const;
   std::string CodeAt(size_t place) const;

@@ -1,29 +1,22 @@
 #include "platform/headless/console_dialogs.h"
 
+#include <unistd.h>
+
 #include <array>
 #include <cstdio>
-#ifdef _WIN32
-#include <io.h>
-#define KORA_ISATTY(f) _isatty(_fileno(f))
-#else
-#include <unistd.h>
-#define KORA_ISATTY(f) ::isatty(::fileno(f))
-#endif
 
 namespace kora {
 namespace {
 
-void Say(std::string_view text, std::string_view title) {
-  std::fprintf(stderr, "[%.*s] %.*s\n", int(title.size()), title.data(), int(text.size()),
-               text.data());
-}
-
 class ConsoleProgress : public Progress {
  public:
   explicit ConsoleProgress(std::string_view title)
-      : title_(title), show_(KORA_ISATTY(stderr) != 0) {}
-  ~ConsoleProgress() override {
+      : title_(title), show_(::isatty(::fileno(stderr)) != 0) {}
+  ~ConsoleProgress() override { SetRunning(false); }
+  // What is said behind the pass has the line to itself.
+  void SetRunning(bool) override {
     if (show_ && percent_ >= 0) std::fprintf(stderr, "\r\033[K");
+    percent_ = -1;
   }
   bool Step(int done, int total) override {
     const int percent = total > 0 ? int(100.0 * done / total) : 100;
@@ -47,6 +40,16 @@ class ConsoleProgress : public Progress {
 
 ConsoleDialogs::ConsoleDialogs(std::optional<Answer> standing) : standing_(standing) {}
 
+void ConsoleDialogs::Begin(std::string_view piece) {
+  piece_ = piece.empty() ? std::string() : std::string(piece) + ": ";
+  said_ = false;
+}
+
+void ConsoleDialogs::Say(std::string_view text, std::string_view title) const {
+  std::fprintf(stderr, "[%.*s] %s%.*s\n", int(title.size()), title.data(), piece_.c_str(),
+               int(text.size()), text.data());
+}
+
 void ConsoleDialogs::Message(std::string_view text, std::string_view title) {
   said_ = true;
   Say(text, title);
@@ -58,7 +61,8 @@ Answer ConsoleDialogs::Ask(std::string_view text, std::string_view title, Button
     switch (buttons) {
       case Buttons::kOk: return a == Answer::kOk;
       case Buttons::kOkCancel: return a == Answer::kOk || a == Answer::kCancel;
-      case Buttons::kYesNo: return a == Answer::kYes || a == Answer::kNo;
+      case Buttons::kYesNo:
+      case Buttons::kNoYes: return a == Answer::kYes || a == Answer::kNo;
       case Buttons::kYesNoCancel:
         return a == Answer::kYes || a == Answer::kNo || a == Answer::kCancel;
       case Buttons::kRetryCancel: return a == Answer::kRetry || a == Answer::kCancel;
@@ -78,6 +82,7 @@ Answer ConsoleDialogs::Ask(std::string_view text, std::string_view title, Button
     case Buttons::kOkCancel: return Answer::kOk;
     case Buttons::kYesNo:
     case Buttons::kYesNoCancel: return Answer::kYes;
+    case Buttons::kNoYes: return Answer::kNo;
     // Nobody is there to mend what failed, and trying again would never end.
     case Buttons::kRetryCancel: return Answer::kCancel;
   }

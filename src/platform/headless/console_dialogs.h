@@ -23,10 +23,16 @@ class ConsoleDialogs : public Dialogs {
   void SetBusy(bool) override {}
   void Yield() override {}
 
-  // Whether any message was shown: the operation was abandoned.
+  // Begins a piece of the work: messages name it ("[title] ABC: text") until the next one, and
+  // said() starts anew. Empty: the work as a whole.
+  void Begin(std::string_view piece);
+  // Whether any message was shown since then: the operation was abandoned.
   bool said() const { return said_; }
 
  private:
+  void Say(std::string_view text, std::string_view title) const;
+
+  std::string piece_;
   std::optional<Answer> standing_;
   bool said_ = false;
 };

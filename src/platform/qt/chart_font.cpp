@@ -11,9 +11,8 @@ namespace kora {
 
 bool CanBeFace(const SurfaceFont& font) {
   if (font.name.size() > 200 || !(font.size >= 1 && font.size <= 2048)) return false;
-  return std::none_of(font.name.begin(), font.name.end(), [](char c) {
-    return static_cast<unsigned char>(c) < 32 || c == 127;
-  });
+  return std::none_of(font.name.begin(), font.name.end(),
+                      [](char c) { return static_cast<unsigned char>(c) < 32 || c == 127; });
 }
 
 ChartFont MakeChartFont(const SurfaceFont& of) {

@@ -4,6 +4,7 @@
 #include <QGridLayout>
 #include <QLabel>
 #include <QLineEdit>
+#include <QPointer>
 #include <QPushButton>
 #include <QSpinBox>
 #include <QStyle>
@@ -83,6 +84,14 @@ QPushButton* AddOkCancel(QDialog* form, QGridLayout* grid, std::function<void()>
   QPushButton* button = buttons->AddOkCancel(std::move(ok));
   grid->addLayout(buttons, grid->rowCount(), 0, 1, -1);
   return button;
+}
+
+void RunForm(QDialog* form) {
+  struct Owner {
+    QPointer<QDialog> form;
+    ~Owner() { delete form.data(); }
+  } owner{form};
+  form->exec();
 }
 
 void FocusField(QLineEdit* field) {

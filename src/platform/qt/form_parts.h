@@ -50,6 +50,10 @@ class ButtonRow : public QHBoxLayout {
 // spare, and below that OK and Cancel. Returns the OK button.
 QPushButton* AddOkCancel(QDialog* form, QGridLayout* grid, std::function<void()> ok);
 
+// Runs a modal form until it is left and takes it down, also where an exception ends it. The form
+// may go with its parent before that; then nothing is left to take down.
+void RunForm(QDialog* form);
+
 // Focus into the box with its text selected.
 void FocusField(QLineEdit* field);
 void FocusField(QSpinBox* field);

@@ -13,8 +13,10 @@ inline bool CutLine(double x, double y, double dx, double dy, double width, doub
   to = 1;
   const auto cut = [&](double p, double q) {  // keeps t with p * t <= q
     if (p == 0) return q >= 0;
-    if (p < 0) from = std::max(from, q / p);
-    else to = std::min(to, q / p);
+    if (p < 0)
+      from = std::max(from, q / p);
+    else
+      to = std::min(to, q / p);
     return from < to;
   };
   return cut(-dx, x) && cut(dx, width - x) && cut(-dy, y) && cut(dy, height - y);

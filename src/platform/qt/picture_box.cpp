@@ -39,9 +39,9 @@ void PictureBox::paintEvent(QPaintEvent* event) {
   // painter would go over the whole picture for it.
   if (dpr == std::floor(dpr)) {
     for (const QRect& part : event->region())
-      painter.drawImage(QRectF(part), image,
-                        QRectF(part.x() * dpr, part.y() * dpr, part.width() * dpr,
-                               part.height() * dpr));
+      painter.drawImage(
+          QRectF(part), image,
+          QRectF(part.x() * dpr, part.y() * dpr, part.width() * dpr, part.height() * dpr));
   } else {
     painter.drawImage(QPointF(0, 0), image);
   }

@@ -2,9 +2,12 @@
 
 #include <QApplication>
 #include <QElapsedTimer>
+#include <QGridLayout>
 #include <QInputDialog>
 #include <QMessageBox>
 #include <QProgressDialog>
+#include <QSpacerItem>
+#include <QStyle>
 
 #include "platform/qt/to_qt.h"
 
@@ -16,6 +19,21 @@ namespace {
 QWidget* Below() {
   QWidget* modal = QApplication::activeModalWidget();
   return modal ? modal : QApplication::activeWindow();
+}
+
+// A box that is answered, not kept: nothing to minimise or maximise.
+constexpr Qt::WindowFlags kBoxFlags = Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint |
+                                      Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint;
+
+// Widens a box that its title would not fit; the frame sets titles in bold, between its buttons.
+void FitTitle(QMessageBox& box) {
+  auto* grid = qobject_cast<QGridLayout*>(box.layout());
+  if (!grid) return;
+  QFont bold = box.font();
+  bold.setBold(true);
+  const int buttons = 3 * box.style()->pixelMetric(QStyle::PM_TitleBarHeight);
+  const int width = QFontMetrics(bold).horizontalAdvance(box.windowTitle()) + buttons;
+  grid->addItem(new QSpacerItem(width, 0), grid->rowCount(), 0, 1, grid->columnCount());
 }
 
 // While a question stands the pointer is the normal one, whatever goes on behind it.
@@ -47,10 +65,15 @@ class ProgressWindow : public Progress {
     sincePaint_.start();
   }
 
+  void Show(ProgressLine line, std::string_view text) override {
+    if (line == ProgressLine::kItem) item_ = text;
+  }
+
   bool Step(int done, int total) override {
     // The event queue costs more than most steps: it has its turn some thirty times a second.
     if (done < total && sincePaint_.elapsed() < 30) return !window_.wasCanceled();
     sincePaint_.restart();
+    if (!item_.empty()) window_.setLabelText(ToQt(item_));
     window_.setValue(total > 0 ? int(1000.0 * done / total) : 1000);
     QCoreApplication::processEvents();
     return !window_.wasCanceled();
@@ -59,6 +82,7 @@ class ProgressWindow : public Progress {
  private:
   QProgressDialog window_{Below()};
   QElapsedTimer sincePaint_;
+  std::string item_;
 };
 
 }  // namespace
@@ -73,6 +97,7 @@ Answer QtDialogs::Ask(std::string_view text, std::string_view title, Buttons but
   const NormalPointer pointer(busy_);
   QMessageBox box(Below());
   box.setObjectName("MessageBox");
+  box.setWindowFlags(kBoxFlags);
   box.setWindowTitle(ToQt(title));
   box.setTextFormat(Qt::PlainText);
   box.setText(ToQt(text));
@@ -81,17 +106,23 @@ Answer QtDialogs::Ask(std::string_view text, std::string_view title, Buttons but
     case Buttons::kOk: box.setStandardButtons(B::Ok); break;
     case Buttons::kOkCancel: box.setStandardButtons(B::Ok | B::Cancel); break;
     case Buttons::kYesNo: box.setStandardButtons(B::Yes | B::No); break;
+    case Buttons::kNoYes:
+      box.setStandardButtons(B::Yes | B::No);
+      box.setDefaultButton(B::No);
+      break;
     case Buttons::kYesNoCancel: box.setStandardButtons(B::Yes | B::No | B::Cancel); break;
     case Buttons::kRetryCancel: box.setStandardButtons(B::Retry | B::Cancel); break;
   }
   box.setIcon(buttons == Buttons::kOk ? B::Information : B::Question);
-  if (buttons == Buttons::kYesNo) box.setEscapeButton(B::No);
+  const bool declines = buttons == Buttons::kYesNo || buttons == Buttons::kNoYes;
+  if (declines) box.setEscapeButton(B::No);
+  FitTitle(box);
   switch (box.exec()) {
     case B::Ok: return Answer::kOk;
     case B::Yes: return Answer::kYes;
     case B::No: return Answer::kNo;
     case B::Retry: return Answer::kRetry;
-    default: return buttons == Buttons::kYesNo ? Answer::kNo : Answer::kCancel;
+    default: return declines ? Answer::kNo : Answer::kCancel;
   }
 }
 
@@ -100,6 +131,7 @@ std::optional<std::string> QtDialogs::Prompt(std::string_view text, std::string_
   const NormalPointer pointer(busy_);
   QInputDialog box(Below());
   box.setObjectName("Prompt");
+  box.setWindowFlags(kBoxFlags);
   box.setWindowTitle(ToQt(title));
   box.setLabelText(ToQt(text));
   box.setTextValue(ToQt(standing));
@@ -116,8 +148,10 @@ std::unique_ptr<Progress> QtDialogs::StartProgress(std::string_view title) {
 void QtDialogs::SetBusy(bool busy) {
   if (busy == busy_) return;
   busy_ = busy;
-  if (busy) QApplication::setOverrideCursor(Qt::WaitCursor);
-  else QApplication::restoreOverrideCursor();
+  if (busy)
+    QApplication::setOverrideCursor(Qt::WaitCursor);
+  else
+    QApplication::restoreOverrideCursor();
 }
 
 void QtDialogs::Yield() { QCoreApplication::processEvents(); }

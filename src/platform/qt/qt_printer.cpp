@@ -26,19 +26,19 @@
 namespace kora {
 namespace {
 
-constexpr double kTwipsPerUnit = 15;   // of text sizes, which are known in chart units
+constexpr double kTwipsPerUnit = 15;  // of text sizes, which are known in chart units
 constexpr double kTwipsPerPoint = 20;
 constexpr double kTwipsPerDot = kTwipsPerInch / 300;
-constexpr double kPdfEdge = 170;       // 3 mm, as near to the edge as printers come
+constexpr double kPdfEdge = 170;  // 3 mm, as near to the edge as printers come
 constexpr int kPdfResolution = 1440;
 
 struct Paper {
   const char* name;
   QPageSize::PageSizeId id;
 };
-constexpr Paper kPapers[] = {{"A4", QPageSize::A4},         {"A3", QPageSize::A3},
-                             {"A5", QPageSize::A5},         {"Letter", QPageSize::Letter},
-                             {"Legal", QPageSize::Legal},   {"Tabloid", QPageSize::Tabloid}};
+constexpr Paper kPapers[] = {{"A4", QPageSize::A4},       {"A3", QPageSize::A3},
+                             {"A5", QPageSize::A5},       {"Letter", QPageSize::Letter},
+                             {"Legal", QPageSize::Legal}, {"Tabloid", QPageSize::Tabloid}};
 
 std::optional<QPageSize::PageSizeId> PaperId(std::string_view name) {
   for (const Paper& paper : kPapers)
@@ -143,8 +143,8 @@ void QtPaper::SetFont(const SurfaceFont& font) {
 
 const QtPaper::Face& QtPaper::face() const {
   if (face_) return faces_[*face_];
-  const auto known = std::find_if(faces_.begin(), faces_.end(),
-                                  [this](const Face& f) { return f.key == font_; });
+  const auto known =
+      std::find_if(faces_.begin(), faces_.end(), [this](const Face& f) { return f.key == font_; });
   face_ = size_t(known - faces_.begin());
   if (known != faces_.end()) return *known;
 
@@ -374,8 +374,8 @@ std::string QtPrinter::Pdf(const std::string& title) const {
   pdf.setResolution(kPdfResolution);
   pdf.setCreator("KORA Charting");
   pdf.setTitle(ToQt(title));
-  pdf.setPageLayout(QPageLayout(QPageSize(*PaperId(PaperName())), QtOrientation(orientation_),
-                                QMarginsF()));
+  pdf.setPageLayout(
+      QPageLayout(QPageSize(*PaperId(PaperName())), QtOrientation(orientation_), QMarginsF()));
   if (!Paint(pdf)) throw RunTimeError(kDeviceError);
   return bytes.toStdString();
 }

@@ -199,8 +199,10 @@ void QtRasterSurface::AxisLine(bool horizontal, double from, double to, double a
   const int thick = Thickness();
   const int side = Edge(at) - (thick - std::max(1, int(std::floor(dpr_ + 0.5)))) / 2;
   const auto fill = [&](int begin, int end) {
-    if (horizontal) Fill(begin, side, end, side + thick, colour);
-    else Fill(side, begin, side + thick, end, colour);
+    if (horizontal)
+      Fill(begin, side, end, side + thick, colour);
+    else
+      Fill(side, begin, side + thick, end, colour);
   };
   const int begin = Edge(from), end = std::max(EdgeAfter(to), begin + 1);
   const Dashes dashes = Pattern();
@@ -268,9 +270,12 @@ void QtRasterSurface::SlopedLine(double x1, double y1, double x2, double y2, QRg
 void QtRasterSurface::Line(double x1, double y1, double x2, double y2, Colour colour) {
   x1 = UnitX(x1), y1 = UnitY(y1), x2 = UnitX(x2), y2 = UnitY(y2);
   if (!Finite(x1, y1, x2, y2)) return;
-  if (y1 == y2) AxisLine(true, x1, x2, y1, Rgb(colour));
-  else if (x1 == x2) AxisLine(false, y1, y2, x1, Rgb(colour));
-  else SlopedLine(x1, y1, x2, y2, Rgb(colour));
+  if (y1 == y2)
+    AxisLine(true, x1, x2, y1, Rgb(colour));
+  else if (x1 == x2)
+    AxisLine(false, y1, y2, x1, Rgb(colour));
+  else
+    SlopedLine(x1, y1, x2, y2, Rgb(colour));
 }
 
 void QtRasterSurface::Box(double x1, double y1, double x2, double y2, Colour colour) {

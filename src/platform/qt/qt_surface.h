@@ -57,7 +57,7 @@ class QtSurface : public Surface {
     SurfaceFont key;
     QFont font;
     bool standard = true;
-    double ascent = 0;      // of the line; `qtAscent` is what Qt hangs the text from
+    double ascent = 0;  // of the line; `qtAscent` is what Qt hangs the text from
     double qtAscent = 0;
     double height = 0;
     std::unordered_map<std::string, QStaticText> texts;

@@ -7,6 +7,7 @@
 #include <QPushButton>
 #include <QToolButton>
 
+#include "base/runtime_error.h"
 #include "base/text.h"
 #include "platform/qt/form_parts.h"
 #include "settings/forms/Locate.h"
@@ -93,12 +94,12 @@ bool CPath::Fill() {
         "Select NO  to use default paths \nSelect CANCEL to exit KORA ",
         "No Paths selected", Buttons::kYesNoCancel);
     if (answer == Answer::kCancel ||
-        (answer == Answer::kNo && !FindSystemDrive(services_.ini, services_.files,
-                                                   services_.dialogs, settings))) {
+        (answer == Answer::kNo &&
+         !FindSystemDrive(services_.ini, services_.files, services_.dialogs, settings))) {
       services_.endProgram();
       return false;
     }
-  } else if (!ReadPaths(services_.ini, services_.files, services_.dialogs, settings)) {
+  } else if (!ReadSettings(services_.ini, services_.files, services_.dialogs, settings)) {
     services_.endProgram();
     return false;
   }
@@ -145,6 +146,28 @@ void CPath::OpenLocate(int index) {
   locate->open();
 }
 
+// The folder that charts are read from and written to. False when it can't be.
+bool CPath::CheckDataFolder(const std::string& folder) {
+  const Files& files = services_.files;
+  Dialogs& dialogs = services_.dialogs;
+  const std::string title = windowTitle().toStdString();
+  try {
+    if (!files.IsFolder(folder)) {
+      if (dialogs.Ask("Directory " + folder + " does not exist. Create this directory ?",
+                      "Create Directory", Buttons::kYesNo) != Answer::kYes)
+        return true;  // a drive that is not in, say
+      files.MakeFolder(folder);
+    }
+    const std::string trial = folder + "Kora.tmp";
+    files.Open(trial, OpenMode::kCreate);
+    files.Remove(trial);
+    return true;
+  } catch (const RunTimeError& e) {
+    dialogs.Message(folder + " can't be written to: " + e.what(), title);
+    return false;
+  }
+}
+
 bool CPath::Save() {
   Settings& settings = services_.settings;
   Paths entered = settings.paths;
@@ -153,11 +176,26 @@ bool CPath::Save() {
   entered.ChartBackupPath = Entered(text4_->text());
   entered.PfmDataPath = Entered(label10_[0]->text());
   entered.PfmBackupPath = Entered(label10_[1]->text());
-  for (const std::string* path : {&entered.SystemPath, &entered.CurrentDataPath,
-                                  &entered.PfmDataPath, &entered.ChartBackupPath,
-                                  &entered.PfmBackupPath}) {
+  for (const std::string* path :
+       {&entered.SystemPath, &entered.CurrentDataPath, &entered.PfmDataPath,
+        &entered.ChartBackupPath, &entered.PfmBackupPath}) {
     if (!path->empty()) continue;
     services_.dialogs.Message("Directory paths must be entered", windowTitle().toStdString());
+    return false;
+  }
+  for (const auto& [field, path] : {std::pair{text1_, &entered.SystemPath},
+                                    {text2_, &entered.CurrentDataPath},
+                                    {text4_, &entered.ChartBackupPath}}) {
+    const std::string why = WhyNotKept(*path);
+    if (why.empty()) continue;
+    services_.dialogs.Message(*path + " " + why, windowTitle().toStdString());
+    field->setFocus();
+    field->selectAll();
+    return false;
+  }
+  if (!CheckDataFolder(entered.CurrentDataPath)) {
+    text2_->setFocus();
+    text2_->selectAll();
     return false;
   }
   settings.paths = entered;

@@ -42,6 +42,7 @@ class CPath : public QDialog {
   QLineEdit* AddField(const char* name, const char* caption, int row, int browse);
   QLabel* AddLabel(int index, const char* caption, int row);
   void OpenLocate(int index);
+  bool CheckDataFolder(const std::string& folder);
   bool Save();
 
   CPathServices services_;

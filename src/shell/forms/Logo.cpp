@@ -5,8 +5,11 @@
 #include <QPainter>
 #include <QScreen>
 #include <QVBoxLayout>
+#include <QWindow>
 
 #include "base/runtime_error.h"
+#include "base/version.h"
+#include "platform/qt/to_qt.h"
 #include "shell/main_menu.h"
 #include "shell/waiting_downloads.h"
 
@@ -35,11 +38,9 @@ QPixmap Emblem(int unit, int candles, double dpr) {
 }  // namespace
 
 Logo::Logo(Session& session, std::string commandLine)
-    : QWidget(nullptr, Qt::SplashScreen),
-      session_(session),
-      commandLine_(std::move(commandLine)) {
+    : QWidget(nullptr, Qt::SplashScreen), session_(session), commandLine_(std::move(commandLine)) {
   setObjectName("Logo");
-  setWindowTitle("KORA Charting 7F");
+  setWindowTitle(ToQt(kProgramTitle));
   setAttribute(Qt::WA_QuitOnClose, false);
   QPalette colours = palette();
   colours.setColor(QPalette::Window, Qt::black);
@@ -49,7 +50,7 @@ Logo::Logo(Session& session, std::string commandLine)
   QApplication::setWindowIcon(Emblem(7, 4, 1));
 
   auto* column = new QVBoxLayout(this);
-  auto* title = new QLabel("KORA Charting 7F", this);
+  auto* title = new QLabel(ToQt(kProgramTitle), this);
   title->setObjectName("Label1");
   QFont large = font();
   large.setPointSizeF(font().pointSizeF() * 2.2);
@@ -83,7 +84,7 @@ void Logo::ScaleToScreen() {
 
 bool Logo::Start(bool previous) {
   if (previous) {
-    session_.dialogs.Message("You already have this application running.", "KORA Charting 7F");
+    session_.dialogs.Message("You already have this application running.", kProgramTitle);
     return false;
   }
   session_.dialogs.SetBusy(true);
@@ -104,7 +105,7 @@ bool Logo::Start(bool previous) {
   } catch (const RunTimeError& e) {
     // With a folder that can't be one the program stands all the same, so that it can be mended.
     session_.dialogs.Message(std::string(e.what()) + "  " + session_.settings.paths.SystemPath,
-                             "KORA Charting 7F");
+                             kProgramTitle);
   }
   session_.dialogs.Yield();
   timer2_->start();
@@ -116,6 +117,9 @@ void Logo::Timer() {
   session_.settings.PathsMissing = session_.settings.paths.SystemPath.empty();
   main_ = std::make_unique<Main>(session_, commandLine_);
   if (Prepare) Prepare(*main_);
+  // Frames keep a window above the one that it belongs to, whenever that one comes up.
+  main_->winId();
+  if (windowHandle()) windowHandle()->setTransientParent(main_->windowHandle());
   main_->show();
   raise();
   if (session_.settings.PathsMissing) {

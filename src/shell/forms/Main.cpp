@@ -4,6 +4,7 @@
 #include <QApplication>
 #include <QCloseEvent>
 #include <QDesktopServices>
+#include <QKeyEvent>
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QMenu>
@@ -14,16 +15,18 @@
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
+#include "base/version.h"
+#include "looks/forms/F1Size.h"
 #include "platform/qt/to_qt.h"
 #include "shell/forms/AbtKora.h"
 #include "shell/forms/HelpWindow.h"
+#include "shell/forms/help_pages.h"
 #include "shell/main_menu.h"
-#include "update/volume_unit.h"
+#include "store/volume_unit.h"
 
 namespace kora {
 namespace {
 
-constexpr std::string_view kTitle = "KORA Charting 7F";
 constexpr int kTwipsPerPixel = 15;
 
 }  // namespace
@@ -36,29 +39,58 @@ Main::Main(Session& session, std::string commandLine)
                {.disableMenus = [this] { DisableMenus(); },
                 .enableMenus = [this] { EnableMenus(); },
                 .folderChanged = [this] { FolderChanged(); },
-                .printTable =
-                    [this](const TextTable& table, QWidget* over) { desk_.PrintList(table, over); },
+                .printTable = [this](const TextTable& table,
+                                     QWidget* over) { desk_.PrintList(table, over); },
+                .openAdjustments = [this] { Open("mnuAdjExBtn"); },
                 .updated = [this] { desk_.PricesChanged(); }}),
       desk_(session, this, mdi_,
-            {.readSettings = [this] {
-               ReadPaths(session_.ini, session_.files, session_.dialogs, session_.settings);
-             },
+            {.readSettings = [this] { ReadSettingsAnew(session_); },
              .menusBack = [this] { EnableMenus(); },
              .openWMPath = [this](QWidget* over) { return updates_.OpenDestinations(over); },
-             .VolumeUnitText = [this](const NameRec& name) {
-               return VolumeUnitText(session_.files, session_.settings, name.Code.trimmed());
-             }}) {
+             .VolumeUnitText =
+                 [this](const NameRec& name) {
+                   return VolumeUnitText(session_.files, session_.settings, name.Code.trimmed());
+                 }}),
+      adjust_(session, this,
+              {.disableMenus = [this] { DisableMenus(); },
+               .enableMenus = [this] { EnableMenus(); },
+               .printTable = [this](const TextTable& table,
+                                    QWidget* over) { desk_.PrintList(table, over); },
+               .pageSetup = [this](QWidget*) { desk_.OpenTextPage(); },
+               .changeSize = [this](QWidget* over) { return AskTableSize(over); },
+               .adjusted = [this] { desk_.PricesChanged(); }}),
+      names_(session, this,
+             {.printTable = [this](const TextTable& table,
+                                   QWidget* over) { desk_.PrintList(table, over); },
+              .pageSetup = [this](QWidget*) { desk_.OpenTextPage(); },
+              .changeSize = [this](QWidget* over) { return AskTableSize(over); },
+              .namesChanged = [this] { desk_.PricesChanged(); }}),
+      companies_(session, this,
+                 {.printTable = [this](const TextTable& table,
+                                       QWidget* over) { desk_.PrintList(table, over); },
+                  .pageSetup = [this](QWidget*) { desk_.OpenTextPage(); },
+                  .changeSize = [this](QWidget* over) { return AskTableSize(over); },
+                  .namesChanged = [this] { desk_.PricesChanged(); }}),
+      scans_(session, this,
+             {.disableMenus = [this] { DisableMenus(); },
+              .enableMenus = [this] { EnableMenus(); },
+              .printTable = [this](const TextTable& table,
+                                   QWidget* over) { desk_.PrintList(table, over); },
+              .textPage = [this] { desk_.OpenTextPage(); },
+              .showChart = [this](std::int16_t list,
+                                  std::int16_t place) { desk_.ShowChart(list, place); }}) {
   setObjectName("Main");
   mdi_->setObjectName("MDI");
   mdi_->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
   mdi_->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
   mdi_->viewport()->installEventFilter(this);
+  qApp->installEventFilter(this);
   setCentralWidget(mdi_);
   BuildMenu();
   SetOpeners();
   EnableMenus();
   TakeSize();
-  SetTitle();
+  PathsChanged();
 }
 
 void Main::BuildMenu() {
@@ -94,6 +126,8 @@ void Main::SetOpeners() {
   SetOpener("mnuLists", [this] { desk_.OpenLists(); });
   SetOpener("mnuListsUte", [this] { desk_.OpenListUtilities(); });
   SetOpener("mnuRenameCL", [this] { desk_.OpenListNames(); });
+  SetOpener("mnuViewNames", [this] { names_.OpenNames(); });
+  SetOpener("nmIndCl", [this] { names_.OpenClasses(); });
   SetOpener("mnuPaths", [this] { OpenPaths(); });
   SetOpener("mnuExit", [this] { EndProgram(); });
   SetOpener("mnuPntCol", [this] { AskPrinter(); });
@@ -101,8 +135,15 @@ void Main::SetOpeners() {
   SetOpener("mnuBourse", [this] { Download("Dlbourse32.exe"); });
   SetOpener("mnuEIS", [this] { Download("Dleis32.EXE"); });
   SetOpener("mnuDDetails", [this] { updates_.OpenDetails(); });
+  SetOpener("mnuManAdjust", [this] { adjust_.OpenByHand(); });
   SetOpener("mnuModem", [this] { updates_.OpenUpdate(); });
-  SetOpener("mnuSnap", [this] { RunSibling("Quickpeek.EXE"); });
+  SetOpener("mnuFundamtl", [this] { companies_.OpenCompanies(); });
+  SetOpener("mnuAdjExBtn", [this] { adjust_.OpenList(); });
+  SetOpener("mnuSnap", [this] { OpenSnapshot(); });
+  SetOpener("mnuChartScan", [this] { scans_.OpenScan1(); });
+  SetOpener("mnuChartScan2", [this] { scans_.OpenScan2(); });
+  SetOpener("mnuChtScan3", [this] { scans_.OpenScan3(); });
+  SetOpener("mnStats", [this] { scans_.OpenStats(); });
   SetOpener("mnuMMAScan", [this] { RunSibling("Mmascan.EXE"); });
   SetOpener("mnSHlp", [this] { OpenHelp(); });
   SetOpener("mnuAboutKora", [this] {
@@ -124,7 +165,7 @@ void Main::Open(const std::string& entry) {
   try {
     opener->second();
   } catch (const RunTimeError& e) {
-    session_.dialogs.Message(e.what(), kTitle);
+    session_.dialogs.Message(e.what(), kProgramTitle);
   }
 }
 
@@ -151,12 +192,12 @@ void Main::EnableMenus() {
     auto* menu = findChild<QMenu*>(ToQt(entry.name));
     if (!menu || entry.parent.empty()) continue;
     const auto actions = menu->actions();
-    menu->menuAction()->setEnabled(std::any_of(actions.begin(), actions.end(),
-                                               [](QAction* a) { return a->isEnabled(); }));
+    menu->menuAction()->setEnabled(
+        std::any_of(actions.begin(), actions.end(), [](QAction* a) { return a->isEnabled(); }));
   }
 }
 
-void Main::SetTitle() {
+void Main::PathsChanged() {
   setWindowTitle(QString::fromStdString(MainTitle(session_.settings.paths)));
   desk_.PathsChanged();
 }
@@ -187,20 +228,20 @@ bool Main::OpenPaths() {
     cpath_->activateWindow();
     return true;
   }
-  cpath_ = new CPath({.ini = session_.ini,
-                      .files = session_.files,
-                      .dialogs = session_.dialogs,
-                      .settings = session_.settings,
-                      .readAllSettings = [this] {
-                        return ReadAllSettings(session_, commandLine_, true);
-                      },
-                      .pathsSaved = [this] {
-                        EnableMenus();
-                        SetTitle();
-                      },
-                      .endProgram = [this] { EndProgram(); },
-                      .openWMPath = [this] { updates_.OpenDestinations(cpath_); }},
-                     this);
+  cpath_ = new CPath(
+      {.ini = session_.ini,
+       .files = session_.files,
+       .dialogs = session_.dialogs,
+       .settings = session_.settings,
+       .readAllSettings = [this] { return ReadAllSettings(session_, commandLine_, true); },
+       .pathsSaved =
+           [this] {
+             EnableMenus();
+             PathsChanged();
+           },
+       .endProgram = [this] { EndProgram(); },
+       .openWMPath = [this] { updates_.OpenDestinations(cpath_); }},
+      this);
   cpath_->setAttribute(Qt::WA_DeleteOnClose);
   if (!cpath_->Fill()) {
     delete cpath_;
@@ -211,13 +252,38 @@ bool Main::OpenPaths() {
   return true;
 }
 
-void Main::OpenHelp() {
+// F1 opens the guide at the form in hand and F10 the menu, wherever the keyboard is.
+bool Main::TakeKey(const QKeyEvent& key) {
+  if (key.modifiers() != Qt::NoModifier) return false;
+  if (key.key() == Qt::Key_F1) {
+    const QWidget* form = QApplication::activeModalWidget();
+    if (!form) form = QApplication::activeWindow();
+    if (form == this && desk_.window()) form = desk_.window();
+    OpenHelpAt(HelpPageOf(form ? form->objectName() : QString()));
+    return true;
+  }
+  if (key.key() == Qt::Key_F10 && QApplication::activeWindow() == this) {
+    const auto menus = menuBar()->actions();
+    const auto first =
+        std::find_if(menus.begin(), menus.end(), [](QAction* a) { return a->isEnabled(); });
+    if (first != menus.end()) menuBar()->setActiveAction(*first);
+    return true;
+  }
+  return false;
+}
+
+void Main::OpenHelp() { OpenHelpAt("index.html"); }
+
+void Main::OpenHelpAt(const QString& name) {
   const std::string own = session_.settings.paths.SystemPath + "korahlp32.hlp";
-  if (session_.files.CheckFile(own) &&
-      QDesktopServices::openUrl(
-          QUrl::fromLocalFile(QString::fromStdString(session_.files.HostPath(own)))))
+  if (session_.files.CheckFile(own) && QDesktopServices::openUrl(QUrl::fromLocalFile(
+                                           QString::fromStdString(session_.files.HostPath(own)))))
     return;
+  // Below a form that holds the others back the guide must be that form's own, to be read at all.
+  QWidget* modal = QApplication::activeModalWidget();
+  if (help_ && modal && !modal->isAncestorOf(help_)) delete help_;
   if (help_) {
+    help_->ShowPage(name);
     help_->raise();
     help_->activateWindow();
     return;
@@ -227,7 +293,8 @@ void Main::OpenHelp() {
     session_.dialogs.Message("The Help file is missing", "KORA Charting Help");
     return;
   }
-  help_ = new HelpWindow(page);
+  help_ = new HelpWindow(page, modal);
+  help_->ShowPage(name);
   help_->show();
 }
 
@@ -252,18 +319,37 @@ bool Main::RunSibling(const std::string& program) {
   return true;
 }
 
+void Main::OpenSnapshot() {
+  const std::string program = "Quickpeek.EXE";
+  if (session_.files.CheckFile(session_.settings.paths.SystemPath + program))
+    RunSibling(program);
+  else
+    companies_.OpenSnapshot();
+}
+
 void Main::Download(const std::string& program) {
   if (RunSibling(program)) updates_.OpenList();
 }
 
 void Main::FolderChanged() {
-  SetTitle();
+  PathsChanged();
+  scans_.FolderChanged();
   if (cpath_) cpath_->ShowChartData();
 }
 
 void Main::AskPrinter() {
   AskPrinterColours(session_.files, session_.settings.paths.SystemPath, session_.dialogs,
                     session_.printer);
+}
+
+int Main::AskTableSize(QWidget* over) {
+  F1Size form({.ini = session_.ini,
+               .settings = session_.settings,
+               .dialogs = session_.dialogs,
+               .saved = {}},
+              over);
+  form.exec();
+  return session_.settings.Zoom;
 }
 
 void Main::EndProgram() {
@@ -283,6 +369,9 @@ void Main::closeEvent(QCloseEvent* event) {
 
 // A window that fills the frame goes on filling it when the frame changes its size.
 bool Main::eventFilter(QObject* object, QEvent* event) {
+  if (event->type() == QEvent::KeyPress && object->isWidgetType() &&
+      TakeKey(*static_cast<QKeyEvent*>(event)))
+    return true;
   if (object == mdi_->viewport() && event->type() == QEvent::Resize) {
     const QSize before = mdiSize_;
     mdiSize_ = mdi_->viewport()->size();

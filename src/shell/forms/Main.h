@@ -7,13 +7,20 @@
 #include <string>
 
 #include "settings/forms/CPath.h"
+#include "shell/forms/adjust_desk.h"
 #include "shell/forms/chart_desk.h"
+#include "shell/forms/company_desk.h"
+#include "shell/forms/name_desk.h"
+#include "shell/forms/scan_desk.h"
 #include "shell/forms/update_desk.h"
 #include "shell/session.h"
 
+class QKeyEvent;
 class QMdiArea;
 
 namespace kora {
+
+class HelpWindow;
 
 // The main window: a frame with the menu, over the windows of the work.
 class Main : public QMainWindow {
@@ -28,7 +35,7 @@ class Main : public QMainWindow {
   void DisableMenus();
   void EnableMenus();
 
-  void SetTitle();
+  void PathsChanged();
   // The folder form, asking first where the paths are missing. False when the program ends
   // instead.
   bool OpenPaths();
@@ -48,13 +55,18 @@ class Main : public QMainWindow {
   void TakeSize();
   void KeepSize();
   void OpenHelp();
+  void OpenHelpAt(const QString& page);
+  bool TakeKey(const QKeyEvent& key);
   // Runs a program of the program folder and waits for its end, without limit. False when the
   // main window was closed meanwhile.
   bool RunSibling(const std::string& program);
+  // The sibling program where it is installed, otherwise the form of the program's own.
+  void OpenSnapshot();
   // A download program, then the list of what it left.
   void Download(const std::string& program);
   void FolderChanged();
   void AskPrinter();
+  int AskTableSize(QWidget* over);  // percent
   void EndProgram();
 
   Session& session_;
@@ -62,8 +74,12 @@ class Main : public QMainWindow {
   QMdiArea* mdi_;
   UpdateDesk updates_;
   ChartDesk desk_;
+  AdjustDesk adjust_;
+  NameDesk names_;
+  CompanyDesk companies_;
+  ScanDesk scans_;
   QPointer<CPath> cpath_;
-  QPointer<QWidget> help_;
+  QPointer<HelpWindow> help_;
   std::map<std::string, std::function<void()>> openers_;
   QSize mdiSize_;
   bool closed_ = false;

@@ -15,20 +15,25 @@
 #include "indicators/forms/ChtBands.h"
 #include "indicators/forms/ChtDef.h"
 #include "indicators/forms/MMASet.h"
+#include "indicators/forms/MultiOsc.h"
 #include "indicators/forms/OscFrm.h"
 #include "indicators/forms/StpLs.h"
+#include "indicators/forms/SwingSet.h"
+#include "lists/chart_list.h"
 #include "lists/forms/CLNames.h"
 #include "lists/forms/SubList.h"
 #include "lists/forms/SubList2.h"
-#include "store/forms/BlankSpc.h"
-#include "store/forms/ChtFonts.h"
-#include "store/forms/ChtSp.h"
-#include "store/forms/ColNew.h"
-#include "store/forms/FinDate.h"
-#include "store/forms/GLSpaces.h"
-#include "store/forms/PLW.h"
-#include "store/forms/Scales.h"
-#include "store/forms/VHeight.h"
+#include "looks/forms/BlankSpc.h"
+#include "looks/forms/ChtFonts.h"
+#include "looks/forms/ChtSp.h"
+#include "looks/forms/ColNew.h"
+#include "looks/forms/FinDate.h"
+#include "looks/forms/GLSpaces.h"
+#include "looks/forms/PLW.h"
+#include "looks/forms/Scales.h"
+#include "looks/forms/VHeight.h"
+#include "platform/qt/form_parts.h"
+#include "store/name_file.h"
 
 namespace kora {
 namespace {
@@ -39,6 +44,18 @@ Form* Show(Form* form) {
   form->setAttribute(Qt::WA_DeleteOnClose);
   form->open();
   return form;
+}
+
+// Gives a window another caption and returns the one before.
+std::function<std::string(const std::string&)> CaptionSwapper(QPointer<QWidget> window) {
+  return [window](const std::string& caption) {
+    if (!window) return std::string();
+    const std::string before = window->windowTitle().toStdString();
+    window->setWindowTitle(QString::fromStdString(caption));
+    // Printing leaves no time for what is painted later.
+    if (QWidget* frame = window->parentWidget()) frame->repaint();
+    return before;
+  };
 }
 
 }  // namespace
@@ -59,12 +76,13 @@ ChartDesk::ChartDesk(Session& session, QWidget* over, QMdiArea* mdi, ChartDeskHo
         session_.files.WriteAll(printChoice_.pdfFile, bytes);
       }) {}
 
-QWidget* ChartDesk::Over() const {
-  return chts_ ? static_cast<QWidget*>(chts_.data()) : over_;
-}
+QWidget* ChartDesk::Over() const { return chts_ ? static_cast<QWidget*>(chts_.data()) : over_; }
 
 void ChartDesk::Refresh() {
-  if (chts_ && chts_->window().HasChart()) chts_->Refresh();
+  if (anal_)
+    anal_->Command2();
+  else if (chts_ && chts_->window().HasChart())
+    chts_->Refresh();
 }
 
 LookServices ChartDesk::Look(std::function<void()> saved) {
@@ -72,6 +90,7 @@ LookServices ChartDesk::Look(std::function<void()> saved) {
 }
 
 void ChartDesk::PathsChanged() {
+  CloseView();
   if (chts_) chts_->RefreshTitle();
   selection_.FolderChanged();
 }
@@ -84,9 +103,51 @@ void ChartDesk::OpenCharts() {
     chts_->setFocus();
     return;
   }
+  if (!AnySecurity()) return;
   OpenWindow();
   session_.charts.ChartStartup = true;
   OpenSelection();
+}
+
+void ChartDesk::ShowChart(std::int16_t ChartListNo, std::int16_t place) {
+  if (selectionForm_) delete selectionForm_;
+  if (secondForm_) delete secondForm_;
+  if (!chts_) {
+    // In a run that has not met chart selection yet charts are drawn as the settings have them.
+    selection_.Load();
+    OpenWindow();
+  }
+  ChartState& state = session_.charts;
+  state.ChartListNo = ChartListNo;
+  state.ChartListName = ChartListNo == kFullList ? std::string(" FULL LIST   (Names.Dat)")
+                                                 : ChartListName(session_.user, ChartListNo);
+  state.ICFilterOn = false;
+  state.ICFilter.clear();
+  state.ChartDirection = 1;
+  state.ChartIndex = std::int16_t(place);
+  if (auto* frame = qobject_cast<QMdiSubWindow*>(chts_->parentWidget()))
+    mdi_->setActiveSubWindow(frame);
+  chts_->ShowChosen();
+}
+
+// Without one there is nothing to choose from, and what to do next is told instead.
+bool ChartDesk::AnySecurity() {
+  const std::string& folder = session_.settings.paths.CurrentDataPath;
+  std::string why;
+  try {
+    if (!ReadNames(session_.files, folder).empty()) return true;
+    why = session_.files.IsFolder(folder) ? "There are no securities in " + folder
+                                          : "There is no folder " + folder;
+  } catch (const RunTimeError& e) {
+    why = "The name file in " + folder + " can't be read: " + e.what();
+  }
+  session_.dialogs.Message(
+      why +
+          "\n\nBring prices in (Download, or koractl import), make an invented market with koractl "
+          "demo, or choose another folder in File, Folder Locations.",
+      "CHARTS");
+  hooks_.menusBack();
+  return false;
 }
 
 void ChartDesk::OpenWindow() {
@@ -99,10 +160,13 @@ void ChartDesk::OpenWindow() {
                     .current = session_.current,
                     .state = session_.charts,
                     .VolumeUnitText = hooks_.VolumeUnitText,
-                    .closed = [this] {
-                      if (selectionForm_) selectionForm_->deleteLater();
-                      hooks_.menusBack();
-                    }});
+                    .closed =
+                        [this] {
+                          CloseView();
+                          if (selectionForm_) selectionForm_->deleteLater();
+                          hooks_.menusBack();
+                        },
+                    .zoomOver = [this] { return over_; }});
   WireWindow();
   QMdiSubWindow* frame = mdi_->addSubWindow(chts_);
   frame->setAttribute(Qt::WA_DeleteOnClose);
@@ -115,63 +179,159 @@ void ChartDesk::OpenWindow() {
 
 void ChartDesk::WireWindow() {
   const auto look = [this](auto make) {
-    return [this, make] {
-      auto form = make(Look([this] { Refresh(); }));
-      form->exec();
-      delete form;
-    };
+    return [this, make] { RunForm(make(Look([this] { Refresh(); }))); };
   };
   Chts& w = *chts_;
   w.SetForm("new", [this] { OpenSelection(); });
   w.SetForm("Chart2", [this] { OpenSecondChart(); });
   w.SetForm("OscFrm", [this] { OpenOscFrm(); });
+  w.SetForm("mo1", [this] { OpenView(1); });
+  w.SetForm("mo2", [this] { OpenView(2); });
+  w.SetForm("cmuMOS", [this] { OpenMultiOsc(); });
   w.SetForm("cmChtDef", [this] { OpenChtDef(ChtDefOpener::kChartWindow); });
   w.SetForm("cmChtSpaces", [this] { OpenChtSp(); });
   w.SetForm("cmPageSetup", [this] { OpenPage(); });
   w.SetForm("cmPrintChart", [this] { PrintChart(); });
   w.SetForm("cmColours", [this] {
-    ColNew form({.files = session_.files,
-                 .systemPath = session_.settings.paths.SystemPath,
-                 .dialogs = session_.dialogs,
-                 .colours = session_.colours,
-                 .closed = [this] { Refresh(); }},
-                chts_);
-    form.exec();
+    RunForm(new ColNew({.files = session_.files,
+                        .systemPath = session_.settings.paths.SystemPath,
+                        .dialogs = session_.dialogs,
+                        .colours = session_.colours,
+                        .closed = [this] { Refresh(); }},
+                       chts_));
   });
   w.SetForm("cmfonts", look([this](LookServices s) { return new ChtFonts(s, chts_); }));
   w.SetForm("cmBSpaces", look([this](LookServices s) { return new BlankSpc(s, chts_); }));
   w.SetForm("cmGLSpaces", look([this](LookServices s) { return new GLSpaces(s, chts_); }));
   w.SetForm("cmLineWidth", look([this](LookServices s) { return new PLW(s, chts_); }));
   w.SetForm("cmVHeight", look([this](LookServices s) { return new VHeight(s, chts_); }));
+  w.window().SetAskBoxValue([this](float computed) { return AskBoxValue(computed); });
+  w.SetForm("cmuSwingsettings", [this] { OpenSwingSet(); });
   w.SetForm("cmMMASet", look([this](LookServices s) { return new MMASet(s, chts_); }));
   // The window draws again itself when this one is closed.
-  w.SetForm("cmSLInd", [this] {
-    StpLs form(Look({}), chts_);
-    form.exec();
-  });
+  w.SetForm("cmSLInd", [this] { RunForm(new StpLs(Look({}), chts_)); });
+}
+
+// ---- The multi-oscillator view
+
+void ChartDesk::OpenView(int set) {
+  if (!chts_) return;
+  if (anal_) {
+    mdi_->setActiveSubWindow(qobject_cast<QMdiSubWindow*>(anal_->parentWidget()));
+    anal_->ShowSet(set);
+    return;
+  }
+  chts_->window().AnalPageMode = true;
+  anal_ =
+      new Anal({.view = {.files = session_.files,
+                         .dialogs = session_.dialogs,
+                         .settings = session_.settings,
+                         .user = session_.user,
+                         .colours = session_.colours,
+                         .current = session_.current,
+                         .state = session_.charts,
+                         .VolumeUnitText = hooks_.VolumeUnitText},
+                .print = [this] { PrintView(); },
+                .openMultiOsc = [this] { OpenMultiOsc(); },
+                .returned =
+                    [this] {
+                      if (!anal_) return;
+                      anal_.clear();
+                      if (!chts_) return;
+                      chts_->window().AnalPageMode = false;
+                      mdi_->setActiveSubWindow(qobject_cast<QMdiSubWindow*>(chts_->parentWidget()));
+                      chts_->setFocus();
+                      Refresh();
+                    }},
+               set);
+  QMdiSubWindow* frame = mdi_->addSubWindow(anal_);
+  frame->setAttribute(Qt::WA_DeleteOnClose);
+  frame->setGeometry(chts_->parentWidget()->geometry());
+  frame->show();
+  anal_->setFocus();
+  // One chart is on show at a time: who goes to the chart window leaves the view.
+  QObject::connect(mdi_, &QMdiArea::subWindowActivated, anal_.data(),
+                   [chts = chts_, anal = anal_](QMdiSubWindow* active) {
+                     if (active && chts && anal && active == chts->parentWidget()) anal->Leave();
+                   });
+  QApplication::sendPostedEvents();
+  if (anal_) anal_->Command2();
+}
+
+// Without a chart drawn behind it.
+void ChartDesk::CloseView() {
+  if (!anal_) return;
+  QWidget* frame = anal_->parentWidget();
+  anal_.clear();
+  if (chts_) chts_->window().AnalPageMode = false;
+  frame->close();
+}
+
+void ChartDesk::OpenMultiOsc() {
+  MultiOsc form({session_.user, session_.dialogs}, Over());
+  form.exec();
+  Refresh();
+}
+
+void ChartDesk::PrintView() {
+  if (Printing().printer.Orientation() == kLandscape &&
+      session_.dialogs.Ask("You have your page orientation set as landscape. This may not print "
+                           "correctly. Do you want to continue ?",
+                           "Print Chart", Buttons::kYesNo) != Answer::kYes)
+    return;
+  const std::string name(session_.current.Rec.Code.trimmed());
+  printChoice_.pdfFile = session_.settings.paths.ChartSavePath + name + ".pdf";
+  AskAndPrint(Printing(), printChoice_,
+              {.chart = anal_->Size(),
+               .scriptPath = anal_->view().ScriptPath(),
+               .swapCaption = CaptionSwapper(anal_.data()),
+               .done = {}},
+              anal_);
+}
+
+float ChartDesk::AskBoxValue(float computed) {
+  boxValue_ = computed;
+  RunForm(new OscFrm({.files = session_.files,
+                      .dialogs = session_.dialogs,
+                      .settings = session_.settings,
+                      .chartPeriod = session_.charts.ChartPeriod,
+                      .chartStyle = Style::kPointFigure,
+                      .boxValue = boxValue_,
+                      .redraw = {}},
+                     {}, Over()));
+  return boxValue_;
+}
+
+void ChartDesk::OpenSwingSet() {
+  SwingChoice choice = session_.charts.Swing;
+  RunForm(new SwingSet({session_.dialogs, choice,
+                        [this, &choice] {
+                          session_.charts.Swing = choice;
+                          if (session_.charts.SwingOn) Refresh();
+                        }},
+                       chts_));
 }
 
 void ChartDesk::OpenOscFrm() {
-  OscFrm form({.files = session_.files,
-               .dialogs = session_.dialogs,
-               .settings = session_.settings,
-               .chartPeriod = session_.charts.ChartPeriod,
-               .chartStyle = session_.charts.ChartStyle,
-               .boxValue = boxValue_,
-               .redraw = [this] {
-                 if (chts_) chts_->window().ShowOscillator();
-               }},
-              session_.charts.OscCode, Over());
-  form.exec();
+  RunForm(new OscFrm({.files = session_.files,
+                      .dialogs = session_.dialogs,
+                      .settings = session_.settings,
+                      .chartPeriod = session_.charts.ChartPeriod,
+                      .chartStyle = session_.charts.ChartStyle,
+                      .boxValue = boxValue_,
+                      .redraw =
+                          [this] {
+                            if (chts_) chts_->window().ShowOscillator();
+                          }},
+                     session_.charts.OscCode, Over()));
 }
 
 void ChartDesk::OpenChtSp() {
-  ChtSp form(Look([this] {
-               session_.charts.BarSpacing = session_.settings.charts.Spacing;
-               Refresh();
-             }),
-             session_.charts.ChartStyle, Over());
-  form.exec();
+  RunForm(new ChtSp(Look([this] {
+                      session_.charts.BarSpacing = session_.settings.charts.Spacing;
+                      Refresh();
+                    }),
+                    session_.charts.ChartStyle, Over()));
 }
 
 // ---- Printing
@@ -201,25 +361,18 @@ void ChartDesk::OpenPage() {
 
 void ChartDesk::PrintChart() {
   const QSizeF size = chts_->ChartSize();
-  const ChartWindow& shown = chts_->window();
-  std::string name(session_.current.Rec.Code.trimmed());
-  if (shown.ChartFromFile) {
-    name = shown.SavedChartFile.substr(shown.SavedChartFile.find_last_of('\\') + 1);
-    name = name.substr(0, name.find_last_of('.'));
+  if (chts_->window().ScriptOnShow().empty()) {
+    session_.dialogs.Message("There is no chart to print", "Print Chart");
+    return;
   }
+  std::string name = chts_->window().SuggestedName();
+  name = name.substr(0, name.find_last_of('.'));
   printChoice_.pdfFile = session_.settings.paths.ChartSavePath + name + ".pdf";
   const QPointer<Chts> window = chts_;
   AskAndPrint(Printing(), printChoice_,
               {.chart = {size.width(), size.height()},
                .scriptPath = window->window().ScriptOnShow(),
-               .swapCaption = [window](const std::string& caption) {
-                 if (!window) return std::string();
-                 const std::string before = window->windowTitle().toStdString();
-                 window->setWindowTitle(QString::fromStdString(caption));
-                 // Printing leaves no time for what is painted later.
-                 if (QWidget* frame = window->parentWidget()) frame->repaint();
-                 return before;
-               },
+               .swapCaption = CaptionSwapper(window.data()),
                .done = {}},
               chts_);
 }
@@ -236,34 +389,38 @@ void ChartDesk::OpenPrinterSetup() { Show(new PrinterSetup(Printing(), over_)); 
 // ---- Chart selection
 
 ChtSelServices ChartDesk::SelectionServices() {
-  return {.selection = selection_,
-          .state = session_.charts,
-          .files = session_.files,
-          .dialogs = session_.dialogs,
-          .settings = session_.settings,
-          .user = session_.user,
-          .colours = session_.colours,
-          .showChart = [this] {
+  return {
+      .selection = selection_,
+      .state = session_.charts,
+      .files = session_.files,
+      .dialogs = session_.dialogs,
+      .settings = session_.settings,
+      .user = session_.user,
+      .colours = session_.colours,
+      .showChart =
+          [this] {
             if (!chts_) return;
             over_->activateWindow();
             chts_->setFocus();
-            chts_->Command2();
+            chts_->ShowChosen();
           },
-          .showWindow = [this] {
+      .showWindow =
+          [this] {
             if (!chts_) OpenWindow();
           },
-          .closed = [this] {
+      .closed =
+          [this] {
             if (chts_) chts_->parentWidget()->close();
             hooks_.menusBack();
           },
-          .openChtDef = [this](const auto& averagesChanged) {
+      .openChtDef =
+          [this](const auto& averagesChanged) {
             OpenChtDef(ChtDefOpener::kChartSelection, averagesChanged);
           },
-          .openFinDate = [this] { return OpenFinDate(); },
-          .openChtBands = [this] { OpenChtBands(); },
-          .openWMPath = [this] {
-            return hooks_.openWMPath(selectionForm_ ? selectionForm_.data() : Over());
-          }};
+      .openFinDate = [this] { return OpenFinDate(); },
+      .openChtBands = [this] { OpenChtBands(); },
+      .openWMPath =
+          [this] { return hooks_.openWMPath(selectionForm_ ? selectionForm_.data() : Over()); }};
 }
 
 void ChartDesk::OpenSelection() {
@@ -284,8 +441,7 @@ void ChartDesk::OpenSecondChart() {
   ChtSelServices services = SelectionServices();
   // Leaving it leaves the first chart alone: the next one has the surface to itself.
   services.closed = {};
-  services.secondDropped = [this, index = session_.charts.ChartIndex,
-                            current = session_.current] {
+  services.secondDropped = [this, index = session_.charts.ChartIndex, current = session_.current] {
     session_.charts.ChartIndex = index;
     session_.current = current;
     if (chts_) chts_->DropSecondChart();
@@ -299,12 +455,11 @@ bool ChartDesk::OpenFinDate() {
   ChartState& state = session_.charts;
   std::string date = state.ChosenLimitDate;
   bool on = state.DateLimitOn, chosen = false;
-  FinDate form({.dialogs = session_.dialogs,
-                .FinishDate = date,
-                .FinishDateOn = on,
-                .saved = [&chosen] { chosen = true; }},
-               selectionForm_ ? selectionForm_.data() : Over());
-  form.exec();
+  RunForm(new FinDate({.dialogs = session_.dialogs,
+                       .FinishDate = date,
+                       .FinishDateOn = on,
+                       .saved = [&chosen] { chosen = true; }},
+                      selectionForm_ ? selectionForm_.data() : Over()));
   const auto limit = ParseFileDate(date);
   if (!chosen || !on || !limit) return false;
   state.ChosenLimitDate = date;
@@ -313,51 +468,51 @@ bool ChartDesk::OpenFinDate() {
 }
 
 void ChartDesk::OpenChtBands() {
-  ChtBands form({.files = session_.files,
-                 .dataPath = session_.settings.paths.CurrentDataPath,
-                 .dialogs = session_.dialogs,
-                 .current = session_.current,
-                 .saved = {}},
-                BandForm::kPercentage, selectionForm_ ? selectionForm_.data() : Over());
-  form.exec();
+  RunForm(new ChtBands({.files = session_.files,
+                        .dataPath = session_.settings.paths.CurrentDataPath,
+                        .dialogs = session_.dialogs,
+                        .current = session_.current,
+                        .saved = {}},
+                       BandForm::kPercentage, selectionForm_ ? selectionForm_.data() : Over()));
 }
 
 // ---- Forms of the menu
 
 void ChartDesk::OpenChtDef(ChtDefOpener opener, const std::function<void()>& averagesChanged) {
-  QWidget* parent = opener == ChtDefOpener::kChartSelection && selectionForm_
-                        ? selectionForm_.data()
-                        : Over();
-  ChtDef form({.ini = session_.ini,
-               .files = session_.files,
-               .dialogs = session_.dialogs,
-               .settings = session_.settings,
-               .colours = session_.colours,
-               .chartPeriod = session_.charts.ChartPeriod,
-               .opener = opener,
-               .readSettings = hooks_.readSettings,
-               .openScales = [this] {
-                 Scales scales({.files = session_.files,
-                                .dataPath = session_.settings.paths.CurrentDataPath,
-                                .dialogs = session_.dialogs,
-                                .current = session_.current,
-                                .saved = {}},
-                               Over());
-                 scales.exec();
-               },
-               .refreshChart = [this] { Refresh(); },
-               .averagesChanged = [this, averagesChanged] {
-                 session_.charts.Ma1On = session_.settings.charts.AvOne;
-                 session_.charts.Ma2On = session_.settings.charts.AvTwo;
-                 if (averagesChanged) averagesChanged();
-               }},
-              parent);
-  form.exec();
+  QWidget* parent =
+      opener == ChtDefOpener::kChartSelection && selectionForm_ ? selectionForm_.data() : Over();
+  RunForm(new ChtDef({.ini = session_.ini,
+                      .files = session_.files,
+                      .dialogs = session_.dialogs,
+                      .settings = session_.settings,
+                      .colours = session_.colours,
+                      .chartPeriod = session_.charts.ChartPeriod,
+                      .opener = opener,
+                      .readSettings = hooks_.readSettings,
+                      .openScales =
+                          [this] {
+                            RunForm(new Scales({.files = session_.files,
+                                                .dataPath = session_.settings.paths.CurrentDataPath,
+                                                .dialogs = session_.dialogs,
+                                                .current = session_.current,
+                                                .saved = {}},
+                                               Over()));
+                          },
+                      .refreshChart = [this] { Refresh(); },
+                      .averagesChanged =
+                          [this, averagesChanged] {
+                            session_.charts.Ma1On = session_.settings.charts.AvOne;
+                            session_.charts.Ma2On = session_.settings.charts.AvTwo;
+                            if (averagesChanged) averagesChanged();
+                          }},
+                     parent));
 }
 
 void ChartDesk::OpenDefaults() { OpenChtDef(ChtDefOpener::kShell); }
 
-void ChartDesk::OpenFonts() { Show(new ChtFonts(Look([this] { Refresh(); }), over_)); }
+void ChartDesk::OpenFonts() {
+  Show(new ChtFonts(Look([this] { Refresh(); }), over_));
+}
 
 void ChartDesk::OpenLists() {
   Show(new SubList({session_.files, session_.dialogs, session_.settings, session_.user}, over_));

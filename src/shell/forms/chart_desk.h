@@ -5,13 +5,14 @@
 
 #include "chart/forms/PrintKora.h"
 #include "chartwindow/chart_selection.h"
+#include "chartwindow/forms/Anal.h"
 #include "chartwindow/forms/Chts.h"
 #include "chartwindow/forms/selection_form.h"
 #include "indicators/forms/ChtDef.h"
+#include "lists/text_print_out.h"
+#include "looks/forms/look_services.h"
 #include "platform/qt/qt_printer.h"
-#include "settings/text_print_out.h"
 #include "shell/session.h"
-#include "store/forms/look_services.h"
 
 class QDialog;
 class QMdiArea;
@@ -35,6 +36,9 @@ class ChartDesk {
 
   // The chart window with chart selection over it; a window that stands comes to the front.
   void OpenCharts();
+  // The chart at a place, from 1, of a chart list or of the whole name file; from there the window
+  // pages through that list.
+  void ShowChart(std::int16_t ChartListNo, std::int16_t place);
   void OpenDefaults();       // ChtDef
   void OpenFonts();          // ChtFonts
   void OpenLists();          // SubList
@@ -56,12 +60,19 @@ class ChartDesk {
   void OpenWindow();
   void OpenSelection();
   void OpenSecondChart();
+  void OpenView(int set);
+  void CloseView();
+  void OpenMultiOsc();
+  void PrintView();
+  bool AnySecurity();
   void WireWindow();
   ChtSelServices SelectionServices();
   LookServices Look(std::function<void()> saved);
   void Refresh();
   void OpenChtDef(ChtDefOpener opener, const std::function<void()>& averagesChanged = {});
   void OpenOscFrm();
+  float AskBoxValue(float computed);
+  void OpenSwingSet();
   bool OpenFinDate();
   void OpenChtBands();
   void OpenChtSp();
@@ -75,6 +86,7 @@ class ChartDesk {
   ChartDeskHooks hooks_;
   ChartSelection selection_;
   QPointer<Chts> chts_;
+  QPointer<Anal> anal_;
   QPointer<QDialog> selectionForm_, secondForm_;
   PrintChoice printChoice_;
   QtPrinter printer_;

@@ -1,6 +1,11 @@
 #include "shell/forms/update_desk.h"
 
+#include <utility>
+
+#include "adjust/adjust_list.h"
+#include "adjust/bulletins.h"
 #include "base/text.h"
+#include "store/market_folders.h"
 #include "update/forms/DLList.h"
 #include "update/forms/ModDetails.h"
 #include "update/forms/WMPath.h"
@@ -9,8 +14,7 @@ namespace kora {
 namespace {
 
 bool SetUp(const DownloadSettings& download) {
-  return download.DataService >= 1 && download.DataService <= 5 &&
-         !Trim(download.DLPath).empty();
+  return download.DataService >= 1 && download.DataService <= 5 && !Trim(download.DLPath).empty();
 }
 
 }  // namespace
@@ -67,11 +71,17 @@ void UpdateDesk::OpenList() {
        .dialogs = session_.dialogs,
        .clock = session_.clock,
        .disableMenus = hooks_.disableMenus,
-       .enableMenus = [this, otherFolder] {
-         hooks_.enableMenus();
-         // A whole-market run leaves the folder on the one to view charts from.
-         if (otherFolder()) hooks_.folderChanged();
-       }},
+       .enableMenus =
+           [this, otherFolder] {
+             hooks_.enableMenus();
+             // A whole-market run leaves the folder on the one to view charts from.
+             if (otherFolder()) hooks_.folderChanged();
+           },
+       .CheckBulletins =
+           [this](const std::string& path, const std::string& baseName, Progress& progress) {
+             AdjustListGrew_ |=
+                 CheckBulletins(session_.files, session_.settings, path, baseName, progress) > 0;
+           }},
       over_);
   list->setAttribute(Qt::WA_DeleteOnClose);
   list_ = list;
@@ -81,8 +91,21 @@ void UpdateDesk::OpenList() {
   }
   QObject::connect(list, &QDialog::finished, over_, [this, otherFolder] {
     if (!otherFolder()) hooks_.updated();
+    OfferAdjustments();
   });
   list->open();
+}
+
+void UpdateDesk::OfferAdjustments() {
+  if (!std::exchange(AdjustListGrew_, false)) return;
+  const Settings& settings = session_.settings;
+  std::string folder;
+  if (settings.download.DataService == 1) folder = settings.paths.CurrentDataPath;
+  if (settings.download.DataService == 3)
+    folder = Trim(ReadWmPaths(session_.files, settings.paths.SystemPath)[kWmAsx]);
+  if (folder.empty() || !session_.files.CheckFile(AdjustListPath(folder))) return;
+  session_.dialogs.Message(kAdjustListGrew, kAdjustListGrewTitle);
+  if (hooks_.openAdjustments) hooks_.openAdjustments();
 }
 
 bool UpdateDesk::OpenDestinations(QWidget* over) {

@@ -18,6 +18,8 @@ struct UpdateDeskHooks {
   // Another data folder was chosen: title, and the forms that show it.
   std::function<void()> folderChanged;
   std::function<void(const TextTable&, QWidget* over)> printTable;
+  // The form of an update was left and lines were added to the adjustment list of its folder.
+  std::function<void()> openAdjustments;
   // The form of an update was left, and prices of the data folder may have changed.
   std::function<void()> updated;
 };
@@ -42,6 +44,9 @@ class UpdateDesk {
   Session& session_;
   QWidget* over_;
   UpdateDeskHooks hooks_;
+  void OfferAdjustments();
+
+  bool AdjustListGrew_ = false;
   QPointer<QDialog> details_, list_;
 };
 

@@ -91,8 +91,8 @@ QPushButton* DLList::AddButton(const char* name, const char* caption) {
 
 bool DLList::Fill() {
   services_.disableMenus();
-  const ListResult result = BuildDownloadList(services_.files, services_.settings.download,
-                                              services_.dialogs, entries_);
+  const ListResult result =
+      BuildDownloadList(services_.files, services_.settings.download, services_.dialogs, entries_);
   FillList(0);
   if (result != ListResult::kNothingWaits) return true;
   services_.enableMenus();
@@ -106,8 +106,15 @@ void DLList::FillList(int selected) {
 }
 
 UpdateRun DLList::Run() {
-  return {services_.files, services_.settings, services_.current,       services_.dialogs,
-          services_.clock, *this,              services_.CheckBulletins};
+  return {services_.files,
+          services_.settings,
+          services_.current,
+          services_.dialogs,
+          services_.clock,
+          *this,
+          [this](const std::string& path, const std::string& baseName) {
+            if (services_.CheckBulletins) services_.CheckBulletins(path, baseName, *this);
+          }};
 }
 
 void DLList::UpdateDay() {
@@ -119,7 +126,7 @@ void DLList::UpdateDay() {
     return;
   }
   const bool last = end == UpdateEnd::kAbandoned && selected == list1_->count() - 1;
-  FillList(end == UpdateEnd::kUpdated ? 0 : selected);
+  FillList(IsTaken(end) ? 0 : selected);
   if (entries_.empty() || last) Leave();
 }
 
@@ -136,8 +143,8 @@ void DLList::UpdateAll() {
 
 // Behind a run that stopped: what was done before is off the list.
 void DLList::ListAgain() {
-  const ListResult result = BuildDownloadList(services_.files, services_.settings.download,
-                                              services_.dialogs, entries_);
+  const ListResult result =
+      BuildDownloadList(services_.files, services_.settings.download, services_.dialogs, entries_);
   FillList(0);
   if (result == ListResult::kNothingWaits) Leave();
 }
@@ -146,8 +153,8 @@ void DLList::RemoveDate() {
   const int selected = list1_->currentRow();
   if (running_ || selected < 0) return;
   const std::string entry = entries_[size_t(selected)];
-  if (RemoveDownload(services_.files, services_.settings.download.DLPath, entry,
-                     services_.dialogs, entries_))
+  if (RemoveDownload(services_.files, services_.settings.download.DLPath, entry, services_.dialogs,
+                     entries_))
     FillList(0);
 }
 
@@ -164,17 +171,20 @@ void DLList::reject() {
   Leave();
 }
 
-void DLList::ShowState(std::string_view text) { label2_->setText(ToQt(text)); }
-void DLList::ShowTarget(std::string_view text) { label5_->setText(ToQt(text)); }
-
-void DLList::ShowDate(std::string_view text) {
-  label3_->setText(ToQt(text));
-  ShowTexts();
-}
-
-void DLList::ShowSecond(std::string_view text) {
-  second_ = text;
-  ShowTexts();
+void DLList::Show(ProgressLine line, std::string_view text) {
+  switch (line) {
+    case ProgressLine::kState: label2_->setText(ToQt(text)); break;
+    case ProgressLine::kTarget: label5_->setText(ToQt(text)); break;
+    case ProgressLine::kItem: first_ = text; break;
+    case ProgressLine::kNote:
+      second_ = text;
+      ShowTexts();
+      break;
+    case ProgressLine::kDate:
+      label3_->setText(ToQt(text));
+      ShowTexts();
+      break;
+  }
 }
 
 void DLList::ShowTexts() {
@@ -185,8 +195,8 @@ void DLList::ShowTexts() {
 void DLList::SetRunning(bool running) {
   running_ = running;
   stopAsked_ = false;
-  for (QWidget* widget : std::initializer_list<QWidget*>{command1_, command2_, command3_,
-                                                         command4_, list1_})
+  for (QWidget* widget :
+       std::initializer_list<QWidget*>{command1_, command2_, command3_, command4_, list1_})
     widget->setEnabled(!running);
   QPalette colours;
   if (running) colours.setColor(QPalette::WindowText, Qt::red);
@@ -194,11 +204,11 @@ void DLList::SetRunning(bool running) {
   bar_->setValue(0);
   bar_->setVisible(running);
   services_.dialogs.SetBusy(running);
-  shown_.start();
+  shown_.invalidate();  // the first step shows, however short the run
 }
 
 bool DLList::Step(int done, int total) {
-  if (shown_.elapsed() >= kRefreshMs) {
+  if (!shown_.isValid() || shown_.elapsed() >= kRefreshMs) {
     bar_->setRange(0, total);
     bar_->setValue(done);
     ShowTexts();

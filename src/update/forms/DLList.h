@@ -21,11 +21,12 @@ struct DLListServices {
   const Clock& clock;
   std::function<void()> disableMenus;
   std::function<void()> enableMenus;  // also the place to show the title anew
-  std::function<void(const std::string&, const std::string&)> CheckBulletins = {};
+  std::function<void(const std::string& path, const std::string& baseName, Progress&)>
+      CheckBulletins = {};
 };
 
 // "Update with Downloaded Data ": the files that wait, and taking them in.
-class DLList : public QDialog, private UpdateDisplay {
+class DLList : public QDialog, private Progress {
  public:
   DLList(DLListServices services, QWidget* parent);
 
@@ -36,11 +37,7 @@ class DLList : public QDialog, private UpdateDisplay {
   void reject() override;
 
  private:
-  void ShowState(std::string_view text) override;
-  void ShowDate(std::string_view text) override;
-  void ShowTarget(std::string_view text) override;
-  void ShowFirst(std::string_view text) override { first_ = text; }
-  void ShowSecond(std::string_view text) override;
+  void Show(ProgressLine line, std::string_view text) override;
   void SetRunning(bool running) override;
   bool Step(int done, int total) override;
 
@@ -61,7 +58,7 @@ class DLList : public QDialog, private UpdateDisplay {
   QLabel *label2_, *label3_, *label4_, *label5_, *label8_[2];
   QProgressBar* bar_;
   QPushButton *command1_, *command2_, *command3_, *command4_;
-  QElapsedTimer shown_;       // since the window was last given time
+  QElapsedTimer shown_;  // since the window was last given time
   std::string first_, second_;
   bool running_ = false;
   bool stopAsked_ = false;

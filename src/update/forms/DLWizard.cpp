@@ -55,8 +55,7 @@ DLWizard::DLWizard(UpdateFormServices services, QWidget* parent)
   texts_[5]->setToolTip("Saved as the folder of ASX stocks; Data Destination Paths has its own");
 
   auto* box = new QVBoxLayout(this);
-  box->addWidget(
-      new QLabel("Download packages:  All ASX  Top500  Top150 or All Options", this));
+  box->addWidget(new QLabel("Download packages:  All ASX  Top500  Top150 or All Options", this));
   box->addWidget(kinds);
   box->addWidget(places);
   auto* save = new QPushButton("&Save Settings", this);

@@ -1,68 +1,28 @@
 #include "update/forms/INUpList.h"
 
 #include <QFontDatabase>
-#include <QFrame>
 #include <QGridLayout>
 #include <QHeaderView>
 #include <QLabel>
-#include <QLineEdit>
 #include <QListWidget>
 #include <QMenuBar>
 #include <QPushButton>
 #include <QRadioButton>
-#include <QRegularExpressionValidator>
 #include <QScreen>
-#include <QStyledItemDelegate>
-#include <QTableWidget>
-#include <QTimer>
+#include <algorithm>
 #include <set>
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "lists/forms/RecSav.h"
 
 namespace kora {
 namespace {
 
-constexpr int kSavedMs = 900;
-
-// Takes what a code can be.
-class CodeDelegate : public QStyledItemDelegate {
- public:
-  using QStyledItemDelegate::QStyledItemDelegate;
-  QWidget* createEditor(QWidget* parent, const QStyleOptionViewItem&,
-                        const QModelIndex&) const override {
-    auto* editor = new QLineEdit(parent);
-    editor->setFrame(false);
-    editor->setMaxLength(6);
-    editor->setValidator(new QRegularExpressionValidator(
-        QRegularExpression("[^,\"\\x00-\\x20]*"), editor));
-    return editor;
-  }
-  void setModelData(QWidget* editor, QAbstractItemModel* model,
-                    const QModelIndex& index) const override {
-    const std::string code = static_cast<QLineEdit*>(editor)->text().toStdString();
-    model->setData(index, ToQt(UCase(code)));
-  }
-};
+constexpr const char* kCodeLetters = R"([^,"\x00-\x20]*)";
 
 }  // namespace
-
-// It takes neither the focus nor a place among the windows.
-RecSav::RecSav(QWidget* parent) : QDialog(parent, Qt::ToolTip) {
-  setObjectName("RecSav");
-  auto* frame = new QFrame(this);
-  frame->setFrameStyle(QFrame::Box | QFrame::Raised);
-  auto* around = new QVBoxLayout(this);
-  around->setContentsMargins(0, 0, 0, 0);
-  around->addWidget(frame);
-  auto* box = new QVBoxLayout(frame);
-  const int margin = fontMetrics().height() * 2;
-  box->setContentsMargins(margin, margin / 2, margin, margin / 2);
-  box->addWidget(new QLabel("Saved", frame), 0, Qt::AlignCenter);
-  setAttribute(Qt::WA_DeleteOnClose);
-  QTimer::singleShot(kSavedMs, this, [this] { close(); });
-}
 
 INUpList::INUpList(UpdateFormServices services, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
@@ -84,16 +44,20 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   }
   options_[size_t(UpdateChoiceOf(services_.settings.download))]->setChecked(true);
 
-  ss1_ = new QTableWidget(0, 3, this);
-  ss1_->setObjectName("SS1");
-  ss1_->setHorizontalHeaderLabels({"ASX Code", "CAT.", "Name"});
+  rows_.check = [](int, int column, std::string& text) -> std::optional<Refusal> {
+    if (column == 0) text = UCase(Trim(text));
+    return std::nullopt;
+  };
+  ss1_ = new Grid(rows_, {.dialogs = services_.dialogs, .files = services_.files},
+                  {{.heading = "ASX Code", .chars = 12, .limit = 6, .typing = kCodeLetters},
+                   {.heading = "CAT.", .chars = 7},
+                   {.heading = "Name"}},
+                  "SS1", this);
   ss1_->horizontalHeader()->setStretchLastSection(true);
   ss1_->setMinimumWidth(fontMetrics().averageCharWidth() * 55);
-  ss1_->setSelectionBehavior(QAbstractItemView::SelectRows);
   ss1_->setAccessibleName("Securities to update");
-  ss1_->setTabKeyNavigation(false);
-  ss1_->setWordWrap(false);
-  ss1_->setItemDelegateForColumn(0, new CodeDelegate(ss1_));
+  ss1_->SetDeletable(true, false);
+  ss1_->SetZoom(services_.settings.Zoom);
   list1_ = new QListWidget(this);
   list1_->setObjectName("List1");
   list1_->setAccessibleName("Master list");
@@ -108,26 +72,24 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   grid->setColumnStretch(0, 3);
   grid->setColumnStretch(1, 2);
   connect(command1_, &QPushButton::clicked, this, [this] { AddChecked(); });
-  connect(ss1_, &QTableWidget::itemChanged, this, [this] {
-    if (!loading_) changed_ = true;
-  });
+  ss1_->changed = [this] { changed_ = true; };
 
   AddMenu();
   SaveOrTell(services_.dialogs, windowTitle(), [this] {
     const auto rows = ReadUpdateList(services_.files, services_.settings.paths.SystemPath);
-    ss1_->setRowCount(int(rows.size()));
-    for (size_t i = 0; i < rows.size(); ++i) SetRow(int(i), rows[i]);
+    for (const UpdateRow& row : rows) AddRow(row);
     return true;
   });
+  ss1_->Refresh();
   LoadMaster();
   ShowChoice();
-  loading_ = false;
   const QFontMetrics metrics = fontMetrics();
   resize(QSize(metrics.averageCharWidth() * 130, metrics.height() * 34)
              .boundedTo(screen()->availableSize() * 0.9));
-  ss1_->setColumnWidth(0, metrics.averageCharWidth() * 14);
-  ss1_->setColumnWidth(1, metrics.averageCharWidth() * 9);
 }
+
+// A cell that is open asks the rows once more as it goes.
+INUpList::~INUpList() { delete ss1_; }
 
 void INUpList::AddMenu() {
   auto* bar = new QMenuBar(this);
@@ -143,11 +105,13 @@ void INUpList::AddMenu() {
   entry(file, "ulClose", "&Close", [this] { reject(); });
   QMenu* edit = bar->addMenu("&Edit");
   ulAdd_ = entry(edit, "ulAdd", "&Add Row/s", [this] {
+    if (!ss1_->EndEdit()) return;
     AddRow({});
-    ss1_->setCurrentCell(ss1_->rowCount() - 1, 0);
+    ss1_->Refresh();
+    ss1_->GoTo(rows_.RowCount() - 1, 0);
     ss1_->setFocus();
   });
-  ulDel_ = entry(edit, "ulDel", "&Delete Row/s", [this] { DeleteRows(); });
+  ulDel_ = entry(edit, "ulDel", "&Delete Row/s", [this] { ss1_->DeleteSelected(); });
 }
 
 void INUpList::LoadMaster() {
@@ -169,28 +133,17 @@ void INUpList::LoadMaster() {
 }
 
 void INUpList::AddRow(const UpdateRow& row) {
-  ss1_->insertRow(ss1_->rowCount());
-  SetRow(ss1_->rowCount() - 1, row);
-}
-
-void INUpList::SetRow(int at, const UpdateRow& row) {
-  const std::string category = row.code.empty() ? "" : Format(double(row.category), "##0");
-  ss1_->setItem(at, 0, new QTableWidgetItem(ToQt(row.code)));
-  ss1_->setItem(at, 1, new QTableWidgetItem(ToQt(category)));
-  ss1_->setItem(at, 2, new QTableWidgetItem(ToQt(row.name)));
+  rows_.rows.push_back(
+      {{row.code, row.code.empty() ? "" : Format(double(row.category), "##0"), row.name}});
 }
 
 std::vector<UpdateRow> INUpList::Rows() const {
-  const auto text = [this](int row, int column) {
-    const QTableWidgetItem* item = ss1_->item(row, column);
-    return item ? item->text().toStdString() : std::string();
-  };
   std::vector<UpdateRow> rows;
-  for (int i = 0; i < ss1_->rowCount(); ++i) {
-    const double category = Val(text(i, 1));
-    rows.push_back({UCase(Trim(text(i, 0))),
+  for (int i = 0; i < rows_.RowCount(); ++i) {
+    const double category = Val(rows_.Text(i, 1));
+    rows.push_back({UCase(Trim(rows_.Text(i, 0))),
                     category >= 0 && category <= 99 ? CInt(category) : std::int16_t(0),
-                    std::string(Trim(text(i, 2)))});
+                    std::string(Trim(rows_.Text(i, 2)))});
   }
   return rows;
 }
@@ -204,10 +157,7 @@ UpdateChoice INUpList::Choice() const {
 // The grid lives, on white, while the list is in use; else it is locked and grey.
 void INUpList::ShowChoice() {
   const bool live = Choice() == UpdateChoice::kListed;
-  ss1_->setEditTriggers(live ? QAbstractItemView::DoubleClicked |
-                                   QAbstractItemView::EditKeyPressed |
-                                   QAbstractItemView::AnyKeyPressed
-                             : QAbstractItemView::NoEditTriggers);
+  ss1_->SetLocked(!live);
   QPalette colours = ss1_->palette();
   colours.setColor(QPalette::Base, live ? Qt::white : Qt::lightGray);
   colours.setColor(QPalette::Text, Qt::black);
@@ -218,6 +168,7 @@ void INUpList::ShowChoice() {
 }
 
 void INUpList::AddChecked() {
+  if (!ss1_->EndEdit()) return;
   std::set<std::string> there;
   for (const UpdateRow& row : Rows()) there.insert(row.code);
   for (int i = 0; i < list1_->count(); ++i) {
@@ -228,19 +179,14 @@ void INUpList::AddChecked() {
     AddRow({code, CInt(Val(entry.category)), entry.name});
     changed_ = true;
   }
-  ss1_->sortItems(0);
-}
-
-void INUpList::DeleteRows() {
-  std::set<int, std::greater<>> rows;
-  for (const QModelIndex& index : ss1_->selectionModel()->selectedIndexes())
-    rows.insert(index.row());
-  for (const int row : rows) ss1_->removeRow(row);
-  if (!rows.empty()) changed_ = true;
+  std::stable_sort(
+      rows_.rows.begin(), rows_.rows.end(),
+      [](const TextGrid::Row& a, const TextGrid::Row& b) { return a.cells[0] < b.cells[0]; });
+  ss1_->Refresh();
 }
 
 void INUpList::Print() {
-  EndEditing();
+  if (!ss1_->EndEdit()) return;
   TextTable table{.layout = {.heading = "DOWNLOAD UPDATE LIST",
                              .continued = "  (cont)",
                              .columns = {"ASX Code", "CAT.", "Name"},
@@ -257,16 +203,14 @@ void INUpList::Print() {
 }
 
 // What is being typed into a cell counts.
-void INUpList::EndEditing() { ss1_->setFocus(); }
-
 bool INUpList::Save(QWidget* over) {
-  EndEditing();
+  if (!ss1_->EndEdit()) return false;
   UpdateChoice choice = Choice();
   bool written = false;
   if (!SaveOrTell(services_.dialogs, windowTitle(), [&] {
-        written = SaveUpdateList(services_.files, services_.settings.paths.SystemPath, Rows(),
-                                 choice, services_.ini, services_.settings.download,
-                                 services_.dialogs);
+        written =
+            SaveUpdateList(services_.files, services_.settings.paths.SystemPath, Rows(), choice,
+                           services_.ini, services_.settings.download, services_.dialogs);
         return true;
       }))
     return false;
@@ -278,7 +222,7 @@ bool INUpList::Save(QWidget* over) {
 }
 
 void INUpList::reject() {
-  EndEditing();
+  if (!ss1_->EndEdit()) return;
   if (changed_ && !Save(parentWidget()) &&
       services_.dialogs.Ask("The list could not be saved. Close without saving ?", "Update List",
                             Buttons::kYesNo) != Answer::kYes)

@@ -7,7 +7,6 @@
 #include <QLineEdit>
 #include <QPushButton>
 #include <QTimer>
-
 #include <QToolButton>
 #include <utility>
 
@@ -58,12 +57,12 @@ ModDetails::ModDetails(UpdateFormServices services, QWidget* parent)
   };
   add("Data &Service", combo1_, 0);
   add("Download &Folder", text1_, 1);
-  grid->addWidget(NewLocateButton(services_, "Picture1", text1_,
-                                  [this] {
-                                    return LocateCase{"Download Folder",
-                                                      text1_->text().toStdString()};
-                                  },
-                                  this),
+  grid->addWidget(NewLocateButton(
+                      services_, "Picture1", text1_,
+                      [this] {
+                        return LocateCase{"Download Folder", text1_->text().toStdString()};
+                      },
+                      this),
                   1, 2);
   formatLabel_ = add("File &Names", combo2_, 2);
   divisorLabel_ = add("&Volume Divisor", text2_, 3);
@@ -114,9 +113,9 @@ void ModDetails::ShowService() {
 
 void ModDetails::ProposeFolder() {
   if (!Trim(text1_->text().toStdString()).empty()) return;
-  text1_->setText(ToQt(ProposedDownloadFolder(services_.files,
-                                               ServiceOfIndex(combo1_->currentIndex()),
-                                               services_.settings.paths.SystemPath)));
+  text1_->setText(
+      ToQt(ProposedDownloadFolder(services_.files, ServiceOfIndex(combo1_->currentIndex()),
+                                  services_.settings.paths.SystemPath)));
 }
 
 bool ModDetails::CheckDivisor() {
@@ -140,9 +139,8 @@ bool ModDetails::eventFilter(QObject* object, QEvent* event) {
 
 void ModDetails::Save() {
   if (text2_->isVisible() && !CheckDivisor()) return;
-  const ServiceChoice choice{
-      combo1_->currentIndex(), text1_->text().toStdString(), format_,
-      VolumeDivisorOf(text2_->text().toStdString()).value_or(1)};
+  const ServiceChoice choice{combo1_->currentIndex(), text1_->text().toStdString(), format_,
+                             VolumeDivisorOf(text2_->text().toStdString()).value_or(1)};
   if (!SaveServiceChoice(choice, services_.ini, services_.settings.download, services_.dialogs))
     return;
   accept();

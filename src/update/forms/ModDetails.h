@@ -26,7 +26,7 @@ class ModDetails : public QDialog {
   void Save();
 
   UpdateFormServices services_;
-  std::string format_;  // InternetDLfmt as it is to be stored
+  std::string format_;    // InternetDLfmt as it is to be stored
   bool changed_ = false;  // of Combo1, since it was last chosen from
   QComboBox *combo1_, *combo2_;
   QLineEdit *text1_, *text2_;

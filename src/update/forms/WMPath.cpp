@@ -5,7 +5,6 @@
 #include <QLineEdit>
 #include <QPushButton>
 #include <QRadioButton>
-
 #include <QToolButton>
 
 #include "base/text.h"
@@ -17,9 +16,12 @@ WMPath::WMPath(UpdateFormServices services, QWidget* parent)
     : QDialog(parent), services_(std::move(services)) {
   setObjectName("WMPath");
   setWindowTitle("Data Destination Paths");
-  static constexpr const char* kCaptions[] = {
-      "&ASX ( All or Top 500 / 150 )", "&Indices", "S&FE Futures",
-      "&Overseas",                     "O&ptions", "&Extra stocks"};
+  static constexpr const char* kCaptions[] = {"&ASX ( All or Top 500 / 150 )",
+                                              "&Indices",
+                                              "S&FE Futures",
+                                              "&Overseas",
+                                              "O&ptions",
+                                              "&Extra stocks"};
   const WmPaths lines = ReadWmPaths(services_.files, services_.settings.paths.SystemPath);
   const size_t order[] = {kWmAsx, kWmIndices, kWmFutures, kWmOverseas, kWmOptions, kWmSum};
   auto* grid = new QGridLayout(this);
@@ -59,10 +61,14 @@ WMPath::WMPath(UpdateFormServices services, QWidget* parent)
 
 // Takes effect at once; where there is no folder to take yet, as the paths are saved.
 void WMPath::Choose(int index) {
-  const std::string folder =
-      WithBackslash(Trim(texts_[size_t(index)]->text().toStdString()));
+  const std::string folder = WithBackslash(Trim(texts_[size_t(index)]->text().toStdString()));
   waiting_ = folder.empty();
   if (waiting_) return;
+  if (const std::string why = WhyNotKept(folder); !why.empty()) {
+    services_.dialogs.Message(folder + " " + why, windowTitle().toStdString());
+    texts_[size_t(index)]->setFocus();
+    return;
+  }
   services_.settings.paths.CurrentDataPath = folder;
   services_.ini.PutSetting("KoraPaths", "ChtData", folder);
   if (services_.pathChosen) services_.pathChosen();

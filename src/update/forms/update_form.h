@@ -3,11 +3,11 @@
 #include <functional>
 #include <string>
 
+#include "lists/text_print_out.h"
 #include "platform/dialogs.h"
 #include "platform/qt/to_qt.h"
 #include "settings/locate.h"
 #include "settings/settings.h"
-#include "settings/text_print_out.h"
 
 class QLineEdit;
 class QToolButton;

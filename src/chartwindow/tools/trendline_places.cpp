@@ -1,0 +1,160 @@
+#include "chartwindow/tools/trendline_places.h"
+
+#include <algorithm>
+#include <cmath>
+#include <string>
+#include <string_view>
+#include <utility>
+
+#include "base/numbers.h"
+#include "base/runtime_error.h"
+#include "chartwindow/tools/read_out.h"
+
+namespace kora {
+namespace {
+
+constexpr double kBeyondRight = 10, kBeyondFrame = 20;
+
+// The column at x, beyond the last bar too.
+std::int32_t OpenColumn(const Composition& chart, double x) {
+  return CLng(Divide(x - chart.ChartLeft, chart.BarSpacing));
+}
+
+std::string_view DateAt(const Composition& chart, std::int32_t column) {
+  if (column < 0 || size_t(column) >= chart.Bars.bars.size()) return {};
+  const std::string_view date = chart.Bars[size_t(column)].date();
+  return date == "        " ? std::string_view() : date;
+}
+
+bool IsDigit(char c) { return c >= '0' && c <= '9'; }
+
+// x of the first bar from `first` on with that date or a later one; 0 where there is none.
+double XOfDate(const Composition& chart, std::int32_t first, std::string_view date) {
+  const auto last =
+      std::min<std::int32_t>(chart.Bars.BarCount, std::int32_t(chart.Bars.bars.size()) - 1);
+  for (std::int32_t column = first; column <= last; ++column)
+    if (chart.Bars[size_t(column)].date() >= date) return XOfColumn(chart, column);
+  return 0;
+}
+
+double YOfPrice(const Composition& chart, double price) {
+  if (chart.Price.Logarithmic) return PriceToPixel(chart, price);
+  return chart.ChartBottom -
+         Divide(price - double(chart.Scale.ScaleLow), double(chart.Price.PricePerY));
+}
+
+bool NearFrame(const Composition& chart, double y) {
+  return y > chart.ChartTop - kBeyondFrame && y < chart.ChartBottom + kBeyondFrame;
+}
+
+float KeptPrice(const Composition& chart, double y) {
+  const double price = chart.Price.Price(y);
+  if (!std::isfinite(price)) throw RunTimeError(kOverflow);
+  return CSng(price);
+}
+
+std::optional<TrendlineRec> MakeRecord(const Composition& chart, const ChartRequest& request,
+                                       ScreenLine line) {
+  if (line.x2 < line.x1) {
+    std::swap(line.x1, line.x2);
+    std::swap(line.y1, line.y2);
+  }
+  TrendlineRec rec = EmptyTrendline();
+  rec.TLStartPrice = KeptPrice(chart, line.y1);
+  rec.TLEndPrice = KeptPrice(chart, line.y2);
+  const std::int32_t from = OpenColumn(chart, line.x1), to = OpenColumn(chart, line.x2);
+  if (from > chart.Bars.BarCount || from <= 0) return std::nullopt;
+  const std::string_view start = DateAt(chart, from);
+  if (start.empty()) return std::nullopt;
+  rec.TLStartDate.set(start);
+  if (to >= 1 && to <= chart.Bars.BarCount) {
+    const std::string_view end = DateAt(chart, to);
+    if (end.empty()) return std::nullopt;
+    rec.TLEndDate.set(end);
+  } else {
+    rec.TLEndDate.set("X" + Str(CLng(Divide(line.x2 - line.x1, chart.BarSpacing))));
+  }
+  rec.TLSpacing = CInt(chart.BarSpacing + 1.0);
+  rec.TLPeriod.set(TextOf(request.ChartPeriod));
+  return rec;
+}
+
+std::optional<ScreenLine> Place(const Composition& chart, const ChartRequest& request,
+                                const TrendlineRec& rec) {
+  if (rec.TLPeriod.raw() != TextOf(request.ChartPeriod)) return std::nullopt;
+  const std::string_view start = rec.TLStartDate.raw(), end = rec.TLEndDate.raw();
+  if (rec.TLStartDate.trimmed().empty() || start < DateAt(chart, 1)) return std::nullopt;
+  ScreenLine line;
+  line.x1 = XOfDate(chart, 1, start);
+  if (line.x1 == 0) return std::nullopt;
+  if (IsDigit(end.front())) {
+    line.x2 = XOfDate(chart, 1, end);
+    if (line.x2 == 0) return std::nullopt;
+  } else if (end.front() == 'X') {
+    line.x2 = line.x1 + chart.BarSpacing * Val(end.substr(1));
+  } else {
+    return std::nullopt;
+  }
+  if (rec.TLStartPrice == 0 || rec.TLEndPrice == 0) return std::nullopt;
+  line.y1 = YOfPrice(chart, double(rec.TLStartPrice));
+  line.y2 = YOfPrice(chart, double(rec.TLEndPrice));
+  // What is no number passes none of these.
+  if (!(line.x2 < chart.ChartRight + kBeyondRight) || !(line.x1 > chart.ChartLeft))
+    return std::nullopt;
+  if (!NearFrame(chart, line.y1) || !NearFrame(chart, line.y2)) return std::nullopt;
+  return line;
+}
+
+}  // namespace
+
+std::optional<TrendlineRec> TrendlineOf(const Composition& chart, const ChartRequest& request,
+                                        const ScreenLine& line) {
+  try {
+    return MakeRecord(chart, request, line);
+  } catch (const RunTimeError&) {
+    return std::nullopt;
+  }
+}
+
+std::optional<ScreenLine> PlaceTrendline(const Composition& chart, const ChartRequest& request,
+                                         const TrendlineRec& rec) {
+  try {
+    return Place(chart, request, rec);
+  } catch (const RunTimeError&) {
+    return std::nullopt;
+  }
+}
+
+bool HitsLine(const TrendlineRow& row, double x, double y) {
+  if (row.x1 == 0 || row.x2 == 0) return false;
+  const double x1 = row.x1, y1 = row.y1, x2 = row.x2, y2 = row.y2;
+  double slope = y2 - y1, intercept = x2 * y1 - x1 * y2;
+  if (x1 != x2) {
+    slope /= x2 - x1;
+    intercept /= x2 - x1;
+  }
+  const double at = x * slope + intercept;
+  return at - 2 < y && y < at + 2;
+}
+
+std::optional<NotePlace> PlaceNote(const Composition& chart, const NoteLine& note) {
+  if (!note.readable || note.Price == 0) return std::nullopt;
+  NotePlace place;
+  try {
+    if (note.Date.size() == 8 && std::all_of(note.Date.begin(), note.Date.end(), IsDigit)) {
+      if (note.Date < DateAt(chart, 0)) return std::nullopt;
+      place.x = XOfDate(chart, 0, note.Date);
+    } else {
+      place.x = Val(note.Date);
+    }
+    place.y = PriceToPixel(chart, note.Price);
+  } catch (const RunTimeError&) {
+    return std::nullopt;
+  }
+  if (place.x < chart.ChartLeft || place.x > chart.ChartRight || place.y == 0 ||
+      !NearFrame(chart, place.y))
+    return std::nullopt;
+  return place;
+}
+
+}  // namespace kora

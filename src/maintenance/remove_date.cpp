@@ -1,0 +1,159 @@
+#include "maintenance/remove_date.h"
+
+#include <span>
+#include <unordered_set>
+#include <vector>
+
+#include "base/dates.h"
+#include "base/file_set.h"
+#include "base/home_lock.h"
+#include "base/numbers.h"
+#include "base/runtime_error.h"
+#include "base/text.h"
+#include "maintenance/failures.h"
+#include "platform/dialogs.h"
+#include "platform/progress.h"
+#include "store/market_walk.h"
+#include "store/price_edit.h"
+
+namespace kora {
+namespace {
+
+constexpr const char* kTitle = "Remove Selected Data";
+// Files that are put in place together, and bytes.
+constexpr int kFilesTogether = 64;
+constexpr size_t kBytesTogether = 32u << 20;
+
+// The records without the date; as many as before where it is not there.
+std::vector<PriceRec> Without(std::span<const PriceRec> records, double date, bool latestOnly) {
+  std::vector<PriceRec> kept;
+  size_t latest = records.size();
+  if (latestOnly)
+    for (size_t i = records.size(); i-- > 0 && latest == records.size();)
+      if (Val(records[i].RecDate.raw()) == date) latest = i;
+  kept.reserve(records.size());
+  for (size_t i = 0; i < records.size(); ++i)
+    if (latestOnly ? i != latest : Val(records[i].RecDate.raw()) != date)
+      kept.push_back(records[i]);
+  return kept;
+}
+
+class DateRemoval {
+ public:
+  DateRemoval(const Files& files, std::string folder, std::string date, bool latestOnly)
+      : files_(files),
+        folder_(std::move(folder)),
+        date_(std::move(date)),
+        latestOnly_(latestOnly),
+        set_(files) {}
+
+  void Run(Progress& progress, Dialogs& dialogs, RemovedDate& removed);
+
+  std::string inHand;
+
+ private:
+  void Visit(const MarketItem& item, Progress& progress);
+  void PutInPlace(RemovedDate& removed);
+
+  const Files& files_;
+  const std::string folder_;
+  const std::string date_;  // "yyyymmdd"
+  const bool latestOnly_;
+  FileSet set_;
+  int waiting_ = 0;
+  size_t bytes_ = 0;
+  std::int32_t records_ = 0;
+  std::unordered_set<std::string> seen_;  // files of two names are gone through once
+};
+
+void DateRemoval::Visit(const MarketItem& item, Progress& progress) {
+  const std::string code(item.code);
+  if (!seen_.insert(UCase(code)).second) return;
+  progress.Show(ProgressLine::kState, "Removing " + DateToDisplay(date_) + " from " + code);
+  const auto kept = Without(item.records, Val(date_), latestOnly_);
+  if (kept.size() == item.records.size()) return;
+  StagePrices(set_, folder_ + CodeFileName(code, ".WDT"), kept);
+  ++waiting_;
+  bytes_ += kept.size() * sizeof(PriceRec);
+  records_ += std::int32_t(item.records.size() - kept.size());
+}
+
+void DateRemoval::PutInPlace(RemovedDate& removed) {
+  if (waiting_ == 0) return;
+  set_.Commit();
+  removed.files += waiting_;
+  removed.records += records_;
+  waiting_ = 0;
+  bytes_ = 0;
+  records_ = 0;
+}
+
+void DateRemoval::Run(Progress& progress, Dialogs& dialogs, RemovedDate& removed) {
+  const auto held = files_.lock().Hold();
+  MarketWalk walk(files_, folder_);
+  const WalkPlan plan{.records = kWholeFile, .fewest = 1};
+  std::string code;
+  removed.stopped = !walk.Run(plan, progress, {}, [&](const MarketItem& item) {
+    inHand = folder_ + std::string(item.code) + ".WDT";
+    Visit(item, progress);
+    code = item.code;
+    if (waiting_ >= kFilesTogether || bytes_ >= kBytesTogether) {
+      PutInPlace(removed);
+      removed.last = code;
+    }
+  });
+  inHand = folder_;
+  PutInPlace(removed);
+  removed.last = code;
+  removed.done = true;
+  if (removed.stopped) {
+    progress.Show(ProgressLine::kState, "");
+    dialogs.Message("Stopped behind " + FromAnsi(removed.last) + ": " + Str(removed.files) +
+                        " files were changed, those behind it were not",
+                    kTitle);
+  } else {
+    progress.Show(ProgressLine::kState, " COMPLETED " + folder_);
+  }
+  // A file of no records has nothing to remove.
+  UnreadFiles unread = walk.unread();
+  unread.missing = unread.tooShort = 0;
+  if (unread.total() > 0) dialogs.Message(UnreadText(unread), kTitle);
+}
+
+}  // namespace
+
+RemovedDate RemoveDate(const Files& files, Settings& settings, const std::string& folder,
+                       const std::string& date, bool latestOnly, Progress& progress,
+                       Dialogs& dialogs, RemoveDateBox& focus) {
+  RemovedDate removed;
+  focus = RemoveDateBox::kNone;
+  settings.paths.CurrentDataPath = WithBackslash(Trim(folder));
+  const std::string path = settings.paths.CurrentDataPath;
+  if (path.empty()) {
+    focus = RemoveDateBox::kFolder;
+    return removed;
+  }
+  if (Trim(date).empty()) {
+    focus = RemoveDateBox::kDate;
+    dialogs.Message("Date to remove must be entered.", kTitle);
+    return removed;
+  }
+  const auto wanted = ParseUserDate(Trim(date));
+  if (!wanted) {
+    focus = RemoveDateBox::kDate;
+    dialogs.Message("The date is not a date d/m/yy", kTitle);
+    return removed;
+  }
+  if (!files.IsFolder(path)) {
+    focus = RemoveDateBox::kFolder;
+    dialogs.Message("Cannot find " + path, kTitle);
+    return removed;
+  }
+  DateRemoval removal(files, path, FormatFileDate(*wanted), latestOnly);
+  if (!TellFailure(dialogs, kTitle, path, [&] { removal.Run(progress, dialogs, removed); }) &&
+      !removed.last.empty())
+    dialogs.Message("Done up to " + FromAnsi(removed.last), kTitle);
+  return removed;
+}
+
+}  // namespace kora

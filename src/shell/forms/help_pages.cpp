@@ -1,0 +1,50 @@
+#include "shell/forms/help_pages.h"
+
+#include <QHash>
+
+namespace kora {
+
+QString HelpPageOf(const QString& form) {
+  static const QHash<QString, QString> pages{
+      {"Main", "start.html"},
+      {"CPath", "folders.html"},
+      {"Locate", "folders.html"},
+      {"Chts", "charts.html"},
+      {"Chart2", "charts.html"},
+      {"SaveKora", "charts.html"},
+      {"ChtSel", "selecting.html"},
+      {"ChtOptions", "selecting.html"},
+      {"Search", "selecting.html"},
+      {"FinDate", "selecting.html"},
+      {"ChtBands", "oscillators.html"},
+      {"ChtDef", "oscillators.html"},
+      {"MMASet", "oscillators.html"},
+      {"OscFrm", "oscillators.html"},
+      {"StpLs", "oscillators.html"},
+      {"BlankSpc", "looks.html"},
+      {"ChtFonts", "looks.html"},
+      {"ChtSp", "looks.html"},
+      {"ColNew", "looks.html"},
+      {"GLSpaces", "looks.html"},
+      {"PLW", "looks.html"},
+      {"Scales", "looks.html"},
+      {"VHeight", "looks.html"},
+      {"F1Size", "tables.html"},
+      {"CLNames", "lists.html"},
+      {"SubList", "lists.html"},
+      {"SubList2", "lists.html"},
+      {"IndClass", "lists.html"},
+      {"CHTPage", "printing.html"},
+      {"Page", "printing.html"},
+      {"PrintKora", "printing.html"},
+      {"PrinterSetup", "printing.html"},
+      {"DLList", "update.html"},
+      {"DLWizard", "update.html"},
+      {"INUpList", "update.html"},
+      {"ModDetails", "update.html"},
+      {"WMPath", "update.html"},
+  };
+  return pages.value(form, "index.html");
+}
+
+}  // namespace kora

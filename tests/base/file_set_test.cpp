@@ -1,0 +1,286 @@
+#include "base/file_set.h"
+
+#include <gtest/gtest.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <filesystem>
+#include <map>
+#include <new>
+
+#include "tests/support/error_of.h"
+#include "tests/support/failing_io.h"
+#include "tests/support/temp_home.h"
+
+using namespace kora;
+using namespace kora::test;
+
+namespace {
+
+using Contents = std::map<std::string, std::string>;
+
+Contents ContentsOf(const TempHome& home) {
+  Contents out;
+  for (const auto& entry : std::filesystem::directory_iterator(home.path() + "/drive_c"))
+    out[entry.path().filename().string()] = home.Get("drive_c/" + entry.path().filename().string());
+  return out;
+}
+
+// A change of code as it moves files: histories merged, old files kept beside, and the record
+// that tells of it last.
+void FillSet(FileSet& set) {
+  set.Rename("c:\\OLD.WDT", "c:\\OLD.OLD");
+  set.Rename("c:\\NEW.WDT", "c:\\NEW.OLD");
+  set.Add("c:\\NEW.WDT", "merged");
+  set.Remove("c:\\OLD.Txt");
+  set.Remove("c:\\none.txt");
+  set.Add("c:\\Names.dat", "new names");
+}
+const Contents kBefore{{"NEW.OLD", "very old new"}, {"NEW.WDT", "new"}, {"Names.dat", "names"},
+                       {"OLD.Txt", "notes"},        {"OLD.WDT", "old"}, {"other", "x"}};
+const Contents kAfter{{"NEW.OLD", "new"},
+                      {"NEW.WDT", "merged"},
+                      {"Names.dat", "new names"},
+                      {"OLD.OLD", "old"},
+                      {"other", "x"}};
+
+void PutBefore(const TempHome& home) {
+  std::filesystem::remove_all(home.path() + "/drive_c");
+  for (const auto& [name, bytes] : kBefore) home.Put("drive_c/" + name, bytes);
+}
+
+}  // namespace
+
+TEST(FileSetTest, ASetThatIsNotCommittedLeavesNothing) {
+  TempHome home;
+  home.Put("drive_c/a.dat", "old");
+  {
+    FileSet set(home.files());
+    set.Add("c:\\a.dat", "new");
+    set.Add("c:\\b.dat", "new");
+    EXPECT_EQ(home.Get("drive_c/a.dat"), "old");
+  }
+  EXPECT_EQ(home.Get("drive_c/a.dat"), "old");
+  EXPECT_EQ(home.files().List("c:\\").size(), 1u);
+}
+
+TEST(FileSetTest, AFailureDuringCommitBringsBackAllFiles) {
+  FailingIo io;
+  TempHome home(io);
+  home.Put("drive_c/a.dat", "old a");
+  home.Put("drive_c/c.dat", "old c");
+  FileSet set(home.files());
+  for (const char* name : {"c:\\a.dat", "c:\\b.dat", "c:\\c.dat"}) set.Add(name, "new");
+  io.Reset(
+      16);  // three files made (11 calls), two put in place (3); the third kept aside and renamed
+  EXPECT_EQ(ErrorOf([&] { set.Commit(); }), kDiskFull);
+  EXPECT_EQ(home.Get("drive_c/a.dat"), "old a");
+  EXPECT_EQ(home.Get("drive_c/c.dat"), "old c");
+  EXPECT_EQ(home.files().List("c:\\").size(), 2u);
+}
+
+TEST(FileSetTest, FilesAreFoundInAnyCase) {
+  TempHome home;
+  home.Put("drive_c/Names.dat", "old");
+  FileSet set(home.files());
+  set.Add("c:\\NAMES.DAT", "new");
+  set.Commit();
+  EXPECT_EQ(home.Get("drive_c/Names.dat"), "new");
+  EXPECT_FALSE(home.Exists("drive_c/NAMES.DAT"));
+}
+
+TEST(FileSetTest, MovesRemovesAndWritesTogether) {
+  TempHome home;
+  PutBefore(home);
+  FileSet set(home.files());
+  FillSet(set);
+  set.Stage();
+  EXPECT_EQ(home.Get("drive_c/Names.dat"), "names");
+  set.Commit();
+  EXPECT_EQ(ContentsOf(home), kAfter);
+  EXPECT_TRUE(home.files().CheckFile("c:\\old.old"));
+  EXPECT_FALSE(home.files().CheckFile("c:\\old.wdt"));
+}
+
+TEST(FileSetTest, AFailureAtAnyCallOfAnyKindLeavesAllAsItWas) {
+  for (const int error : {int(kDiskFull), int(kDeviceError), int(kPathAccess)}) {
+    for (int at = 1;; ++at) {
+      ASSERT_LT(at, 100);
+      FailingIo io;
+      TempHome home(io);
+      PutBefore(home);
+      io.Reset(at);
+      io.torn = true;
+      io.error = error;
+      const int raised = ErrorOf([&] {
+        FileSet set(home.files());
+        FillSet(set);
+        set.Commit();
+      });
+      // A copy stands in for a second name that can't be had, and a journal that can't be taken
+      // away is finished, with nothing to do, by the next writer.
+      EXPECT_TRUE(raised == 0 || raised == error) << at;
+      EXPECT_EQ(ContentsOf(home), raised == 0 ? kAfter : kBefore) << at;
+      if (io.calls < at) break;
+    }
+  }
+}
+
+// In a process of its own, killed in place of change `at`. False when it came to its end.
+bool KilledAt(int at, FailingIo& io, TempHome& home) {
+  const pid_t child = ::fork();
+  if (child == 0) {
+    io.Reset(at);
+    io.kills = true;
+    ::_exit(ErrorOf([&] {
+      FileSet set(home.files());
+      FillSet(set);
+      set.Commit();
+    }));
+  }
+  int status = 0;
+  EXPECT_EQ(::waitpid(child, &status, 0), child);
+  if (WIFSIGNALED(status)) return true;
+  EXPECT_EQ(WEXITSTATUS(status), 0);
+  return false;
+}
+
+TEST(FileSetTest, KilledAnywhereAllAreOldOrAllAreNewForTheNextWriter) {
+  FailingIo io;
+  TempHome home(io);
+  int finished = 0;
+  for (int at = 1;; ++at) {
+    ASSERT_LT(at, 100);
+    PutBefore(home);
+    if (!KilledAt(at, io, home)) break;
+    const bool waits = home.Exists("Kora.set~");
+    { const auto held = home.files().lock().Hold(); }
+    Contents now = ContentsOf(home);
+    std::erase_if(now, [](const auto& file) { return file.first.ends_with(".tmp~"); });
+    EXPECT_TRUE(now == kBefore || now == kAfter) << at;
+    if (now == kAfter) {
+      EXPECT_TRUE(waits) << at;
+      ++finished;
+    }
+    EXPECT_FALSE(home.Exists("Kora.set~"));
+  }
+  EXPECT_GT(finished, 5);
+}
+
+TEST(FileSetTest, AJournalCutShortOrOfRubbishIsClearedAwayAndChangesNothing) {
+  TempHome home;
+  PutBefore(home);
+  for (const std::string& journal :
+       {std::string(), std::string("KORA set 1\0D\0", 13), std::string("rubbish"),
+        std::string("KORA set 1\0R\0x\0whole\0", 21), std::string(100000, '\0')}) {
+    home.Put("Kora.set~", journal);
+    { const auto held = home.files().lock().Hold(); }
+    EXPECT_FALSE(home.Exists("Kora.set~"));
+    EXPECT_EQ(ContentsOf(home), kBefore);
+  }
+}
+
+TEST(FileSetTest, AFileThatCameInThePlaceOfAMovedOneIsNotMovedAgain) {
+  TempHome home;
+  home.Put("drive_c/a", "old");
+  const std::string path = home.path() + "/drive_c/a";
+  const HostStatus before = MachineIo().Status(path);
+  std::string journal;
+  for (const std::string& field :
+       {std::string("KORA set 1"), std::string("R"), path, path + ".OLD", std::string(),
+        path + ".old~", std::to_string(before.id), std::to_string(before.size),
+        std::to_string(before.modified), std::string("whole")})
+    journal += field + '\0';
+  home.Put("Kora.set~", journal);
+  std::filesystem::rename(path, path + ".OLD");
+  home.Put("drive_c/a", "new");
+  { const auto held = home.files().lock().Hold(); }
+  EXPECT_EQ(ContentsOf(home), (Contents{{"a", "new"}, {"a.OLD", "old"}}));
+}
+
+TEST(FileSetTest, RunningOutOfMemoryLeavesAllAsItWas) {
+  struct NoMemory : ForwardingIo {
+    int left = 0;
+    void Rename(const std::string& from, const std::string& to) override {
+      if (left-- == 0) throw std::bad_alloc();
+      ForwardingIo::Rename(from, to);
+    }
+  } io;
+  TempHome home(io);
+  for (int before = 0; before < 5; ++before) {
+    PutBefore(home);
+    FileSet set(home.files());
+    FillSet(set);
+    io.left = before;
+    EXPECT_THROW(set.Commit(), std::bad_alloc) << before;
+    EXPECT_EQ(ContentsOf(home), kBefore) << before;
+  }
+}
+
+TEST(FileSetTest, WhereAFileHasOneNameAloneItIsCopiedAside) {
+  struct NoLinks : ForwardingIo {
+    bool failFlush = false;
+    void Link(const std::string&, const std::string&) override { throw RunTimeError(kPathAccess); }
+    void FlushFolder(const std::string&) override {
+      if (failFlush) throw RunTimeError(kDeviceError);
+    }
+  } io;
+  TempHome home(io);
+  home.Put("drive_c/a", "old");
+  io.failFlush = true;
+  EXPECT_EQ(ErrorOf([&] { home.files().WriteAll("c:\\a", "new"); }), kDeviceError);
+  EXPECT_EQ(ContentsOf(home), (Contents{{"a", "old"}}));
+  io.failFlush = false;
+  home.files().WriteAll("c:\\a", "new");
+  EXPECT_EQ(ContentsOf(home), (Contents{{"a", "new"}}));
+}
+
+TEST(FileSetTest, WhatACrashSetAsideIsClearedAwayByTheNextWrite) {
+  TempHome home;
+  home.Put("drive_c/a", "old");
+  home.Put("drive_c/a.old~", "older");
+  home.files().WriteAll("c:\\a", "new");
+  EXPECT_EQ(ContentsOf(home), (Contents{{"a", "new"}}));
+}
+
+TEST(FileSetTest, AReadOnlyFileIsNeitherReplacedNorRemoved) {
+  TempHome home;
+  home.Put("drive_c/a", "old");
+  home.Put("drive_c/b", "b");
+  std::filesystem::permissions(home.path() + "/drive_c/a", std::filesystem::perms(0444));
+  FileSet set(home.files());
+  EXPECT_EQ(ErrorOf([&] { set.Add("c:\\a", "new"); }), kPathAccess);
+  EXPECT_EQ(ErrorOf([&] { set.Remove("c:\\a"); }), kPathAccess);
+  EXPECT_EQ(ErrorOf([&] { set.Rename("c:\\b", "c:\\a"); }), kPathAccess);
+}
+
+TEST(FileSetTest, AMissingFileCannotBeMoved) {
+  TempHome home;
+  home.Put("drive_c/a", "old");
+  FileSet set(home.files());
+  set.Add("c:\\a", "new");
+  set.Rename("c:\\none", "c:\\some");
+  EXPECT_EQ(ErrorOf([&] { set.Commit(); }), kFileNotFound);
+  EXPECT_EQ(ContentsOf(home), (Contents{{"a", "old"}}));
+}
+
+TEST(FileSetTest, ANameThatDiffersInCaseAloneChangesItsCase) {
+  TempHome home;
+  home.Put("drive_c/ore.wdt", "x");
+  FileSet set(home.files());
+  set.Rename("c:\\ORE.WDT", "c:\\ORE.WDT");
+  set.Commit();
+  EXPECT_EQ(ContentsOf(home), (Contents{{"ORE.WDT", "x"}}));
+}
+
+TEST(FileSetTest, AFolderThatCannotBeListedForAFailureOfTheDiskIsTold) {
+  struct Broken : ForwardingIo {
+    std::vector<std::string> List(const std::string&) override { throw RunTimeError(kDeviceError); }
+  } io;
+  TempHome home(io);
+  home.Put("drive_c/Names.dat", "names");
+  // In another case than on the disk, so that the folder has to be looked through: taking the
+  // name file for missing would make an empty one beside it.
+  EXPECT_EQ(ErrorOf([&] { home.files().CheckFile("c:\\NAMES.DAT"); }), kDeviceError);
+  EXPECT_EQ(ErrorOf([&] { home.files().WriteAll("c:\\NAMES.DAT", "x"); }), kDeviceError);
+}
