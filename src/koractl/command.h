@@ -7,20 +7,18 @@
 #include <string>
 #include <vector>
 
+#include "base/io.h"
+#include "koractl/koractl.h"
 #include "platform/dialogs.h"
 
 namespace kora {
-
-// Exit codes.
-inline constexpr int kDone = 0;
-inline constexpr int kAbandoned = 1;  // the message says why; nothing half-written
-inline constexpr int kUsage = 2;      // the command line is wrong
 
 // What stands before the command, and the command chosen.
 struct CommandLine {
   std::optional<std::string> home;  // host folder
   std::vector<std::string> sets;    // SECTION.KEY=VALUE
   std::optional<Answer> answer;
+  Io* io = &MachineIo();     // through which the installation is reached
   double wait = 5;           // seconds for another program that writes the store
   std::function<int()> run;  // gives the exit code
 };

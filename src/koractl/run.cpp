@@ -20,7 +20,7 @@ std::string HomeOf(const CommandLine& line) {
 
 }  // namespace
 
-Run::Run(const CommandLine& line) : dialogs(line.answer), session(HomeOf(line), dialogs) {
+Run::Run(const CommandLine& line) : dialogs(line.answer), session(HomeOf(line), dialogs, *line.io) {
   HomeLock& lock = session.files.lock();
   lock.program = "koractl";
   lock.wait = std::chrono::milliseconds(CLng(line.wait * 1000));
