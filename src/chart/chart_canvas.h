@@ -21,6 +21,16 @@ struct ChartCanvas {
 
   Colour colour(int entry) const { return colours[static_cast<size_t>(entry)]; }
 
+  // Of the prices.
+  Colour LineColour() const {
+    return request.Legible && request.Place == ChartPlace::kOver ? CodeColour()
+                                                                 : colour(kChartLines);
+  }
+  // Of the codes of two charts in one frame.
+  Colour CodeColour() const {
+    return colour(kAverage3 + (request.Place == ChartPlace::kOver ? 1 : 0));
+  }
+
   SurfaceFont Font1(double size) const { return {fonts.Font1Name, size, fonts.Font1Bold, false}; }
   SurfaceFont Font1Bold(double size) const { return {fonts.Font1Name, size, true, false}; }
   SurfaceFont Font2() const { return {fonts.Font2Name, fonts.Font2Points(), false, false}; }

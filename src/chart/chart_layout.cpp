@@ -34,7 +34,8 @@ double DaysToBar(const ChartRequest& request) {
 
 }  // namespace
 
-ChartLayout LayOutChart(const ChartRequest& request, double width, double height, bool panelBelow) {
+ChartLayout LayOutChart(const ChartRequest& request, double width, double height, bool panelBelow,
+                        std::int16_t left) {
   ChartLayout layout;
   switch (request.Place) {
     default:
@@ -50,7 +51,7 @@ ChartLayout LayOutChart(const ChartRequest& request, double width, double height
       layout.ChartBottom = PercentOf(height, 95);
       break;
   }
-  layout.ChartLeft = 42;
+  layout.ChartLeft = left;
   layout.FirstBarX = layout.ChartLeft;
   layout.ChartRight = PercentOf(width, 99);
   layout.ChartMiddle = CInt((layout.ChartRight - layout.ChartLeft) / 2.0 + 36);
@@ -69,6 +70,10 @@ ChartLayout LayOutChart(const ChartRequest& request, double width, double height
   return layout;
 }
 
+std::int32_t RecordsWanted(const ChartRequest& request, const ChartLayout& layout) {
+  return CLng(layout.PlotWidth / layout.BarSpacing * DaysToBar(request));
+}
+
 RecordWindow ChooseWindow(const PriceFile& file, const ChartRequest& request,
                           const ChartLayout& layout, bool wholeFile) {
   RecordWindow window;
@@ -77,7 +82,7 @@ RecordWindow ChooseWindow(const PriceFile& file, const ChartRequest& request,
     window.FirstDataRec = 1;
     return window;
   }
-  const std::int32_t wanted = CLng(layout.PlotWidth / layout.BarSpacing * DaysToBar(request));
+  const std::int32_t wanted = RecordsWanted(request, layout);
   if (request.FinishDateOn) window.LastDataRec = FinishRecord(file, request.FinishDate);
   window.FirstDataRec =
       CInt(std::clamp<double>(double(window.LastDataRec) - wanted, 1, window.LastDataRec));

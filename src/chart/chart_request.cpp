@@ -20,6 +20,7 @@ ChartRequest RequestFromSettings(const Settings& settings) {
   request.HalfGrid = c.HalfGrid;
   request.MovingGrid = c.MovingGrid;
   request.GridSpace = c.GridSpace;
+  request.Legible = c.Legible;
   request.Ma1On = c.AvOne;
   request.Ma2On = c.AvTwo;
   request.MaExp = c.AvCalc;

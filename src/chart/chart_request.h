@@ -54,6 +54,11 @@ struct ChartRequest {
   bool MovingGrid = true;  // vertical grid by date; otherwise every GridSpace bars
   std::int16_t GridSpace = 0;
 
+  // Where a label would not fit: volumes are shortened (670K, 1.8M), ChartLeft moves right until the
+  // longest price has room, a text of the date axis that would touch the one before is left out,
+  // and the second of two charts in one frame is drawn in the colour of its code.
+  bool Legible = false;
+
   bool Ma1On = false, Ma2On = false, MaExp = false;
   std::int16_t Ma1Days = 0, Ma2Days = 0;    // daily charts
   std::int16_t Ma1Weeks = 0, Ma2Weeks = 0;  // weekly and monthly charts

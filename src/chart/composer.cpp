@@ -12,6 +12,7 @@
 #include "chart/chart_failure.h"
 #include "chart/price_averages.h"
 #include "chart/scale_drawing.h"
+#include "chart/styles/price_plot.h"
 #include "chart/styles/style_drawer.h"
 
 namespace kora {
@@ -41,11 +42,13 @@ class Composer {
 
  private:
   void PrepareSurface();
-  void LayOut();
+  void LayOut(std::int16_t left);
   void DrawTitle();
   void OpenData();
+  void ChooseRecords();
   void LoadBars();
   void MakeVolumeRoom();
+  void MakeLabelRoom();
   void AlignSecondChart();
   void DrawEnd();
   void DrawEndTexts();
@@ -75,11 +78,14 @@ void Composer::Run() {
   classText_ = IndustryClassText(services_.files, services_.paths.SystemPath,
                                  request_.Name.IndClass.trimmed());
   PrepareSurface();
-  LayOut();
+  LayOut(request_.Place == ChartPlace::kLower ? std::max(kChartLeft, chart_.UpperLeft)
+                                              : kChartLeft);
   DrawTitle();
   OpenData();
+  ChooseRecords();
   LoadBars();
   MakeVolumeRoom();
+  MakeLabelRoom();
   AlignSecondChart();
   std::function<float(float)> ask;
   if (services_.AskBoxValue)
@@ -137,11 +143,11 @@ void Composer::PrepareSurface() {
   if (!IsSecond(request_.Place)) surface.Cls();
 }
 
-void Composer::LayOut() {
+void Composer::LayOut(std::int16_t left) {
   const Surface& surface = services_.price;
   const bool panelBelow = services_.panel && services_.panel->Visible();
   static_cast<ChartLayout&>(chart_) =
-      LayOutChart(request_, surface.ScaleWidth(), surface.ScaleHeight(), panelBelow);
+      LayOutChart(request_, surface.ScaleWidth(), surface.ScaleHeight(), panelBelow, left);
 }
 
 void Composer::DrawTitle() {
@@ -150,14 +156,14 @@ void Composer::DrawTitle() {
   const double size = services_.fonts.TitleSize;
   const SurfaceFont font = canvas_.Font1(size);
   if (IsSplit(request_.Place)) {
-    const double x = 4.0 * chart_.ChartLeft, y = chart_.ChartTop + 2.0;
+    const double x = 4.0 * kChartLeft, y = chart_.ChartTop + 2.0;
     const Colour colour = canvas_.colour(kChartTitle);
     pen_.Text('T', font, {9.75, x, y, code, colour});
     return;
   }
   if (IsSuperimposed(request_.Place)) {
-    const int which = request_.Place == ChartPlace::kOver ? 1 : 0;
-    pen_.Text('T', font, {9.75, which * 60.0, 2, code, canvas_.colour(kAverage3 + which)});
+    const double x = request_.Place == ChartPlace::kOver ? 60 : 0;
+    pen_.Text('T', font, {9.75, x, 2, code, canvas_.CodeColour()});
     return;
   }
   const std::string title =
@@ -177,12 +183,16 @@ void Composer::OpenData() {
   bars.FirstDataRec = 0;
   bars.LastDataRec = CInt(file_->count());
   if (bars.LastDataRec == 0) throw ChartRefusal{"No Data for " + chart_.DataFile, kChartDisplay};
+}
+
+void Composer::ChooseRecords() {
+  ChartBars& bars = chart_.Bars;
   const RecordWindow window = ChooseWindow(*file_, request_, chart_, style_.readsWholeFile);
   bars.FirstDataRec = window.FirstDataRec;
   bars.LastDataRec = window.LastDataRec;
   if (request_.Place == ChartPlace::kWide && !style_.readsWholeFile)
     services_.price.SetWidth((bars.LastDataRec - bars.FirstDataRec) * double(chart_.BarSpacing) +
-                             120);
+                             120 + (chart_.ChartLeft - kChartLeft));
 }
 
 void Composer::MakeVolumeRoom() {
@@ -199,15 +209,33 @@ void Composer::MakeVolumeRoom() {
   chart_.CloseY.reserve(static_cast<size_t>(std::max(0.0, chart_.PlotWidth)) + 10);
 }
 
+// What a wider scale takes from the plot it takes from its oldest bars; fewer bars may have other
+// labels.
+void Composer::MakeLabelRoom() {
+  if (!request_.Legible || style_.ownScale || IsSuperimposed(request_.Place)) return;
+  constexpr int kTries = 3;
+  for (int i = 0; i < kTries; ++i) {
+    SetUpScale(canvas_, style_.lineScale);
+    const std::int16_t left = LeftOfLabels(canvas_);
+    if (left <= chart_.ChartLeft) return;
+    LayOut(left);
+    ChooseRecords();
+    LoadBars();
+    MakeVolumeRoom();
+  }
+}
+
 // The last bars of two charts stand below each other.
 void Composer::AlignSecondChart() {
   if (IsSecond(request_.Place)) {
     if (chart_.UpperBarCount > chart_.Bars.BarCount)
       chart_.FirstBarX =
-          CInt(chart_.ChartLeft +
-               double(chart_.UpperBarCount - chart_.Bars.BarCount) * chart_.BarSpacing);
+          std::max(chart_.ChartLeft,
+                   CInt(chart_.UpperLeft +
+                        double(chart_.UpperBarCount - chart_.Bars.BarCount) * chart_.BarSpacing));
   } else if (IsSplit(request_.Place) || IsSuperimposed(request_.Place)) {
     chart_.UpperBarCount = chart_.Bars.BarCount;
+    chart_.UpperLeft = chart_.ChartLeft;
   }
 }
 

@@ -36,6 +36,7 @@ struct Composition : ChartLayout {
 
   float LastClose = 0;
   std::int16_t UpperBarCount = 0;  // BarCount of the first of two charts
+  std::int16_t UpperLeft = 0;      // and its ChartLeft
   bool ScaleMissing = false;       // a manual scale was asked for and there is none
   bool ChartDrawn = false;         // the composition ended without a failure
   std::string DataFile;            // "ORE.WDT", for messages

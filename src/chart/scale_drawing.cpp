@@ -1,6 +1,9 @@
 #include "chart/scale_drawing.h"
 
+#include <algorithm>
+#include <array>
 #include <cmath>
+#include <vector>
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
@@ -10,6 +13,8 @@ namespace kora {
 namespace {
 
 constexpr double kLabelGap = 5;  // between a right-aligned label and the frame
+constexpr double kWordX = 14;    // the middle of "VOL"
+constexpr double kDateGap = 2;   // the least between two texts of the date axis
 
 double LnAbove0(double value) {
   if (!(value > 0)) throw RunTimeError(kBadCall);
@@ -21,6 +26,31 @@ std::int32_t RoundedVolume(std::int32_t v) {
   if (v >= 1000) return CLng(RoundHalfEven(v / 100.0) * 100);
   if (v >= 100) return CLng(RoundHalfEven(v / 10.0) * 10);
   return v;
+}
+
+// A tick of the price scale and its label, empty where steps are too many for all to have one.
+struct ScaleTick {
+  int step;
+  double y;
+  std::string label;
+};
+
+std::vector<ScaleTick> ScaleTicks(const ChartCanvas& canvas) {
+  const Composition& chart = canvas.chart;
+  const char* format = canvas.request.Name.RecType != kShare ? "######"
+                       : chart.Scale.Range > 0.1             ? "###.00"
+                                                             : "###.00#";
+  const double low = chart.Scale.ScaleLow, step = chart.Scale.GridStep;
+  const bool fromZero = chart.Scale.ScaleLow == 0.001f;
+  std::vector<ScaleTick> ticks;
+  for (int i = 0; i <= chart.Scale.GridCount; ++i) {
+    const auto v = static_cast<float>(fromZero && i > 0 ? step * i : step * i + low);
+    const double y = chart.Price.Y(v);
+    if (y < chart.ChartTop) break;
+    const bool labelled = chart.Scale.GridCount <= 12 || i <= 6 || i % 2 == 0;
+    ticks.push_back({i, y, labelled ? Format(v, v > 0 && v < 0.2 ? ".00#" : format) : ""});
+  }
+  return ticks;
 }
 
 std::string ModeLine(const ChartCanvas& canvas, bool lineChart, std::string_view classText) {
@@ -44,6 +74,19 @@ std::string ModeLine(const ChartCanvas& canvas, bool lineChart, std::string_view
 }
 
 }  // namespace
+
+std::string ShortVolume(std::int32_t volume) {
+  constexpr const char* kUnits[] = {"K", "M", "B"};
+  if (volume < 1000) return Str(volume);
+  double value = volume;
+  for (const char* unit : kUnits) {
+    value /= 1000;
+    // Two figures below ten, whole ones above; what rounds to a thousand takes the next unit.
+    const double shown = value < 9.95 ? RoundHalfEven(value * 10) / 10 : RoundHalfEven(value);
+    if (shown < 1000) return Str(shown) + unit;
+  }
+  return Str(volume);
+}
 
 void SetVolumeLabel(Composition& chart, std::string unit) {
   chart.Volume.VolBase = chart.Bars.VolMin;
@@ -85,16 +128,30 @@ void DrawVolumePanel(const ChartCanvas& canvas) {
                 double(chart.VolBottom), canvas.colour(kBorder)});
   const int step = CInt((chart.VolBottom - chart.VolTop) / 4.0);
   constexpr const char* kWord[] = {"", "L", "O", "V"};  // from the bottom up
+  struct Row {
+    double y;
+    std::string letter, value;
+  };
+  std::array<Row, 4> rows;
+  bool fit = true;
   for (int i = 0; i <= 3; ++i) {
-    const double y = chart.VolBottom - step * i;
-    if (i > 0)
-      pen.Line('V', {double(chart.ChartLeft - 2), y, double(chart.ChartRight), y,
+    Row& row = rows[size_t(i)];
+    row.y = chart.VolBottom - step * i;
+    row.letter = i == 0 ? chart.VolLabel : kWord[i];
+    row.value = Str(RoundedVolume(chart.Volume.Volume(row.y)));
+    if (canvas.request.Legible)
+      fit = fit && chart.ChartLeft - kLabelGap - canvas.TextWidth(font, row.value) >
+                       (row.letter.empty() ? 0 : kWordX + canvas.TextWidth(font, row.letter) / 2);
+  }
+  for (Row& row : rows) {
+    if (!fit) row.value = ShortVolume(RoundedVolume(chart.Volume.Volume(row.y)));
+    if (row.y < chart.VolBottom)
+      pen.Line('V', {double(chart.ChartLeft - 2), row.y, double(chart.ChartRight), row.y,
                      canvas.colour(kAdjustments)});
-    const std::string letter = i == 0 ? chart.VolLabel : kWord[i];
-    pen.Text('S', font, {font.size, 14 - canvas.TextWidth(font, letter) / 2, y - 4, letter, text});
-    const std::string value = Str(RoundedVolume(chart.Volume.Volume(y)));
-    const double x = chart.ChartLeft - kLabelGap - canvas.TextWidth(font, value);
-    pen.Text('S', font, {font.size, x, y - 4, value, text});
+    const double middle = kWordX - canvas.TextWidth(font, row.letter) / 2;
+    pen.Text('S', font, {font.size, middle, row.y - 4, row.letter, text});
+    const double x = chart.ChartLeft - kLabelGap - canvas.TextWidth(font, row.value);
+    pen.Text('S', font, {font.size, x, row.y - 4, row.value, text});
   }
 }
 
@@ -117,19 +174,11 @@ void DrawScale(const ChartCanvas& canvas, bool lineChart, std::string_view class
   }
   if (IsSuperimposed(request.Place)) return;
 
-  const char* format = request.Name.RecType != kShare ? "######"
-                       : chart.Scale.Range > 0.1      ? "###.00"
-                                                      : "###.00#";
   const SurfaceFont font = canvas.Font1Bold(size);
   const double low = chart.Scale.ScaleLow, step = chart.Scale.GridStep;
-  const bool fromZero = chart.Scale.ScaleLow == 0.001f;
-  for (int i = 0; i <= chart.Scale.GridCount; ++i) {
-    const auto v = static_cast<float>(fromZero && i > 0 ? step * i : step * i + low);
-    const double y = chart.Price.Y(v);
-    if (y < chart.ChartTop) break;
+  for (const auto& [i, y, label] : ScaleTicks(canvas)) {
     pen.Line('L', {left, y, left - 5, y, border}, {left, y, left - 7, y, border});
-    if (chart.Scale.GridCount <= 12 || i <= 6 || i % 2 == 0) {
-      const std::string label = Format(v, v > 0 && v < 0.2 ? ".00#" : format);
+    if (!label.empty()) {
       const double width = canvas.TextWidth(font, label);
       const TextAt at{size, left - kLabelGap - width, y - 6, label, text};
       if (request.ScriptPrintMode)
@@ -147,6 +196,20 @@ void DrawScale(const ChartCanvas& canvas, bool lineChart, std::string_view class
   }
 }
 
+std::int16_t LeftOfLabel(const ChartCanvas& canvas, double width) {
+  const double needed = width + kLabelGap;
+  if (needed <= canvas.chart.ChartLeft) return canvas.chart.ChartLeft;
+  return CInt(std::ceil(needed) + 1);
+}
+
+std::int16_t LeftOfLabels(const ChartCanvas& canvas) {
+  const SurfaceFont font = canvas.Font1Bold(ChartCanvas::kSmallText);
+  double widest = 0;
+  for (const ScaleTick& tick : ScaleTicks(canvas))
+    widest = std::max(widest, canvas.TextWidth(font, tick.label));
+  return LeftOfLabel(canvas, widest);
+}
+
 void DrawFixedGrid(const ChartCanvas& canvas) {
   const Composition& chart = canvas.chart;
   const ChartRequest& request = canvas.request;
@@ -161,6 +224,14 @@ bool DateAxis::Bar(std::string_view yyyymmdd, double x) {
   // A chart laid over another stands on the other's axis.
   return canvas_.request.Place != ChartPlace::kOver && yyyymmdd.substr(0, 6) > lastMonth_ &&
          NewMonth(yyyymmdd, x);
+}
+
+// Whether a text at x is clear of the one before; it is the one before then.
+bool DateAxis::HasRoom(double x, std::string_view text) {
+  if (!canvas_.request.Legible) return true;
+  if (x < textEnd_ + kDateGap) return false;
+  textEnd_ = x + canvas_.TextWidth(canvas_.Font1(ChartCanvas::kSmallText), text);
+  return true;
 }
 
 bool DateAxis::NewMonth(std::string_view yyyymmdd, double x) {
@@ -192,12 +263,13 @@ bool DateAxis::NewMonth(std::string_view yyyymmdd, double x) {
   if (yearMark) {
     pen.Line('D', {x, bottom + 2, x, double(chart.ChartTop), canvas_.colour(kEndOfYear)},
              {x, bottom + 2, x, double(chart.ChartTop), text});
-    canvas_.SmallText(x, bottom + 2, year, text);
+    if (HasRoom(x, year)) canvas_.SmallText(x, bottom + 2, year, text);
   } else if (daily && !monthSkipped_) {
     const double number = Val(month);
-    if (number >= 1 && number <= 12) {
-      const std::string_view letter =
-          std::string_view("JFMAMJJASOND").substr(size_t(number) - 1, 1);
+    const std::string_view letter =
+        number >= 1 && number <= 12 ? std::string_view("JFMAMJJASOND").substr(size_t(number) - 1, 1)
+                                    : std::string_view();
+    if (!letter.empty() && HasRoom(x, letter)) {
       const double size =
           request.ScriptPrintMode ? canvas_.fonts.Font2Points() : ChartCanvas::kSmallText;
       pen.Text('T', canvas_.Font1(ChartCanvas::kSmallText),

@@ -1,5 +1,6 @@
 #include "indicators/osc_panel.h"
 
+#include <algorithm>
 #include <new>
 
 #include "base/dates.h"
@@ -101,6 +102,7 @@ OscPanel::OscPanel(OscHost& hostIn, double units, bool textsBelow)
   }
   host.PanelTop = PanelTop;
   host.PanelBottom = PanelBottom;
+  PanelLeft = std::max(kChartLeft, host.chart.ChartLeft);
   PanelRight = host.chart.ChartRight;
   PlotX = PanelLeft;
   pen.SetScriptY(host.PrintScale,

@@ -72,7 +72,7 @@ class OscPanel {
   explicit OscPanel(OscHost& host, double units = 0, bool textsBelow = false);
 
   std::int16_t PanelTop, PanelBottom;
-  std::int16_t PanelLeft = 42;
+  std::int16_t PanelLeft;  // that of the prices, where their scale has its room
   std::int16_t PanelRight;
   double PlotX;  // of the bar being drawn; PanelLeft at the start
 

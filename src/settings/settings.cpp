@@ -97,6 +97,7 @@ void ReadCharts(const SettingsFile& file, ChartSettings& charts) {
   charts.StopLoss = section.Flag("StopLoss");
   charts.DarkPaper = section.Flag("DarkPaper");
   charts.FitSide = section.Flag("FitSide");
+  charts.Legible = section.Flag("Legible");
   charts.StopLossPct = section.Single("SL Percent");
 }
 
@@ -279,7 +280,8 @@ void SetDefaultPaths(Paths& paths, const std::string& drive) {
 
 void WriteEasings(SettingsFile& file) {
   const SettingsFile::Batch batch(file);
-  for (const char* key : {"DarkPaper", "FitSide"}) file.PutSetting("Charts", key, "True");
+  for (const char* key : {"DarkPaper", "FitSide", "KeepOsc", "Legible"})
+    file.PutSetting("Charts", key, "True");
 }
 
 void WriteDefaultSettings(SettingsFile& file) {
@@ -308,7 +310,6 @@ void WriteDefaultSettings(SettingsFile& file) {
       {"Charts", "Spacing", "2"},
       {"Charts", "Bands", "0"},
       {"Charts", "AutoOsc", "False"},
-      {"Charts", "KeepOsc", "True"},
       {"Charts", "List", "1"},
       {"Charts", "AvOne", "False"},
       {"Charts", "AvTwo", "False"},

@@ -68,6 +68,7 @@ struct ChartSettings {
   bool StopLoss = false;
   float StopLossPct = 0;   // 0 to 100 percent
   bool DarkPaper = false;  // light colours are printed darker: they don't read on white
+  bool Legible = false;    // labels that would not fit are made to: see ChartRequest
   bool FitSide = false;    // a page that was never turned lies as the chart fits it better
 };
 

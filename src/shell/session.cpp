@@ -25,7 +25,8 @@ void FinishInterruptedSet(const Files& files) {
 // What a new installation has besides its folders.
 void MakeFirst(Session& session) {
   WriteEasings(session.ini);
-  session.settings.charts.DarkPaper = session.settings.charts.FitSide = true;
+  ChartSettings& charts = session.settings.charts;
+  charts.DarkPaper = charts.FitSide = charts.Legible = true;
   try {
     WriteColourVariants(session.files, session.settings.paths.SystemPath);
   } catch (const RunTimeError&) {

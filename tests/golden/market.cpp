@@ -25,6 +25,9 @@ GoldenMarket::GoldenMarket() {
   Add("ADVDEC", "Advances and Declines", kAdvanceDecline, 800.0f, 1.0f, 400, 5);
   Add("FUND", "Fund of Funds", kCloseVolume, 1.5f, 0.005f, 400, 13);
   AddWrap();
+  Add("BLUE", "Blue Chip Industries Ltd", kShare, 700.0f, 0.01f, 900, 17, 2021, 700);
+  Add("HEIGHT", "Dizzy Height Index", kIndex, 24000.0f, 0.1f, 500, 19, 2021, 20);
+  Add("AGES", "Rock of Ages Ltd", kShare, 6.0f, 0.01f, 5700, 23, 2002, 30);
   names_[0].OtherDetails.set("ORD SHARES");
   names_[0].IndClass.set("310");
   names_[0].Base = 10;
@@ -58,7 +61,7 @@ void GoldenMarket::AddWrap() {
 }
 
 void GoldenMarket::Add(const char* code, const char* title, std::int16_t type, float start,
-                       float step, int days, std::uint32_t seed) {
+                       float step, int days, std::uint32_t seed, int firstYear, std::int32_t lot) {
   NameRec name = NewNameRec(code);
   name.Name.set(title);
   name.RecType = type;
@@ -72,7 +75,7 @@ void GoldenMarket::Add(const char* code, const char* title, std::int16_t type, f
   };
   float close = start;
   float total = 60;
-  for (std::int32_t n = DayNumber({2021, 3, 1}); int(records.size()) < days; ++n) {
+  for (std::int32_t n = DayNumber({firstYear, 3, 1}); int(records.size()) < days; ++n) {
     const CalendarDate date = DateOfDayNumber(n);
     const int weekday = Weekday(date);
     if (weekday == 1 || weekday == 7 || (date.month == 12 && date.day == 25)) continue;
@@ -84,7 +87,8 @@ void GoldenMarket::Add(const char* code, const char* title, std::int16_t type, f
     const float high = (open > close ? open : close) * (1 + (draw() + 1) * 0.006f);
     const float low = (open < close ? open : close) * (1 - (draw() + 1) * 0.006f);
     const float burst = draw();
-    const auto volume = std::int32_t(4000.0f + 3000.0f * draw() + (burst > 0.96f ? 30000.0f : 0));
+    const auto volume =
+        std::int32_t(4000.0f + 3000.0f * draw() + (burst > 0.96f ? 30000.0f : 0)) * lot;
     if (type == kAdvanceDecline) {
       rec.High = std::nearbyint(400 + 200 * draw());
       rec.Low = std::nearbyint(400 + 200 * draw());

@@ -23,7 +23,7 @@ void Bar(const ChartCanvas& canvas, const BarY& y, double x, Colour colour) {
 }
 
 void Candle(const ChartCanvas& canvas, const BarY& y, double x, Colour) {
-  const Colour lines = canvas.colour(kChartLines);
+  const Colour lines = canvas.LineColour();
   canvas.pen.Line('H', {x, double(y.High), x, double(y.Low), lines});
   const bool fall = y.Close > y.Open;
   const Colour body = fall ? canvas.colour(kCandleDown) : lines;
@@ -82,7 +82,7 @@ void DrawShapes(const StyleWork& work, BarShape shape, bool marked) {
     plot.DrawVolume(x, volumeY);
     if (marked && request.ColourMarks)
       entry = ReversalMark(y, seen > 0 ? &previous : nullptr, seen > 1 ? &beforePrevious : nullptr);
-    shape(canvas, y, x, canvas.colour(entry));
+    shape(canvas, y, x, entry == kChartLines ? canvas.LineColour() : canvas.colour(entry));
     if (smooths) plot.Smooth(y.Close, x);
     beforePrevious = previous;
     previous = y;

@@ -21,7 +21,7 @@ void DrawLine(const StyleWork& work) {
     plot.DrawDate(bar, x);
     if (i > 0 && hasClose)
       canvas.pen.Line('H', {double(x) - chart.BarSpacing, double(lastY), double(x), double(y),
-                            canvas.colour(kChartLines)});
+                            canvas.LineColour()});
     if (smooths) plot.Smooth(y, x);
     plot.DrawVolume(x, volumeY);
   }

@@ -24,6 +24,8 @@ class PointFigure {
   float ChooseBoxValue() const;
   void DrawFrame();
   void DrawScale();
+  std::string ScaleLabel(int i) const;
+  void MakeLabelRoom();
   std::int32_t FirstBar(std::int16_t reversal) const;
   void DrawMove(const PFMove& move);
   void DrawBox(double level, Way way);
@@ -61,6 +63,7 @@ void PointFigure::Run() {
   chart_.Price.PricePerY = CSng(double(BoxValue_) / kBoxPitch);
   chart_.Price.ChartBottom = chart_.ChartBottom;
 
+  MakeLabelRoom();
   plotMark_ = pen_.ScriptMark();
   DrawScale();
   DrawFrame();
@@ -104,20 +107,32 @@ void PointFigure::DrawFrame() {
                  double(chart_.ChartBottom), canvas_.colour(kBorder)});
 }
 
+std::string PointFigure::ScaleLabel(int i) const {
+  const double v = double(BoxValue_) * i * (rows_ / 12) + double(chart_.Scale.ScaleLow);
+  const char* format = canvas_.request.Name.RecType == kShare ? "####.00" : "######";
+  return Format(v, v > 0 && v < 0.1 ? ".00#" : format);
+}
+
+void PointFigure::MakeLabelRoom() {
+  if (!canvas_.request.Legible || IsSuperimposed(canvas_.request.Place)) return;
+  const SurfaceFont font = canvas_.Font1(ChartCanvas::kSmallText);
+  double widest = 0;
+  for (int i = 0; i <= 12; ++i) widest = std::max(widest, canvas_.TextWidth(font, ScaleLabel(i)));
+  chart_.ChartLeft = chart_.FirstBarX = LeftOfLabel(canvas_, widest);
+  chart_.PlotWidth = double(chart_.ChartRight) - chart_.ChartLeft - canvas_.request.BlankSpace;
+}
+
 void PointFigure::DrawScale() {
   const ChartRequest& request = canvas_.request;
   const Colour border = canvas_.colour(kBorder), text = canvas_.colour(kScalesText);
   const double left = chart_.ChartLeft, right = chart_.ChartRight;
-  const int interval = rows_ / 12;
-  const char* format = request.Name.RecType == kShare ? "####.00" : "######";
   const SurfaceFont font = canvas_.Font1(ChartCanvas::kSmallText);
   for (int i = 0; i <= 12; ++i) {
-    const double v = double(BoxValue_) * i * interval + double(chart_.Scale.ScaleLow);
-    const double y = chart_.ChartBottom - double(interval) * kBoxPitch * i;
+    const double y = chart_.ChartBottom - double(rows_ / 12) * kBoxPitch * i;
     pen_.Line('L', {left, y, left - 5, y, border});
     if (request.GridLines && i > 0 && y > chart_.ChartTop)
       pen_.Line('V', {left, y, right, y, canvas_.colour(kFixedGrid)});
-    const std::string label = Format(v, v > 0 && v < 0.1 ? ".00#" : format);
+    const std::string label = ScaleLabel(i);
     const double x = left - 5 - canvas_.TextWidth(font, label);
     const double small = ChartCanvas::kSmallText;
     const double size = request.ScriptPrintMode ? canvas_.fonts.TitleSize : small;
@@ -142,7 +157,7 @@ void PointFigure::DrawBox(double level, Way way) {
   const std::int16_t row = CInt((level - double(chart_.Scale.ScaleLow)) / double(BoxValue_));
   const std::int16_t y = CInt(chart_.ChartBottom - double(kBoxPitch) * row);
   Segment box{double(x_) - kBoxHalf, double(y) - kBoxHalf, double(x_) + kBoxHalf,
-              double(y) + kBoxHalf, canvas_.colour(kChartLines)};
+              double(y) + kBoxHalf, canvas_.LineColour()};
   if (way == Way::kFirst) {
     pen_.FilledBox('B', box, box);
   } else if (yearMark_) {
