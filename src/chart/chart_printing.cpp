@@ -312,6 +312,19 @@ void Enlarge(PrintSetup& setup) {
   setup.PrintEnlarge = float(RoundHalfEven((double(setup.PrintEnlarge) + kStep) * 10) / 10);
 }
 
+void EnlargeToPage(const Printer& printer, ChartSize chart, PrintSetup& setup) {
+  constexpr double kMost = 100;
+  setup.PrintLeft = setup.PrintTop = 0;
+  setup.PrintEnlarge = float(LeastEnlargement(printer, chart, setup));
+  for (;;) {
+    PrintSetup next = setup;
+    Enlarge(next);
+    if (double(next.PrintEnlarge) > kMost || !IsOnPage(printer, FrameOnPage(printer, next, chart)))
+      return;
+    setup = next;
+  }
+}
+
 void Reduce(const Printer& printer, ChartSize chart, PrintSetup& setup) {
   const double least = LeastEnlargement(printer, chart, setup);
   const double next = RoundHalfEven((double(setup.PrintEnlarge) - kStep) * 10) / 10;

@@ -64,6 +64,8 @@ void SetPageDefaults(const Printer& printer, ChartSize chart, PrintSetup& setup)
 // A step of 0.1 up, and down. Reducing stops at 1.2, or at 0.5 in ScriptPrintMode; for a chart
 // that is too large for the page even so, where it fits.
 void Enlarge(PrintSetup& setup);
+// To the largest step at which the chart is on the page, in its middle.
+void EnlargeToPage(const Printer& printer, ChartSize chart, PrintSetup& setup);
 void Reduce(const Printer& printer, ChartSize chart, PrintSetup& setup);
 
 // Plays a chart script on a page of `printer`. True when it held a command. Error 5 for a last

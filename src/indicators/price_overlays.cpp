@@ -200,9 +200,13 @@ std::string MMASetText(const MmaPeriods& periods) {
 }
 
 std::optional<BandValues> ReadBandBoxes(std::string_view first, std::string_view second) {
-  const double a = Val(first), b = Val(second);
-  if (a < 0 || a > 100 || b < 0 || b > 100) return std::nullopt;
-  return BandValues{CInt(a), CInt(b)};
+  // An empty box is 0, which draws the width that bands have by themselves.
+  const auto value = [](std::string_view text) {
+    return Trim(text).empty() ? std::optional(0.0) : Number(text);
+  };
+  const auto a = value(first), b = value(second);
+  if (!a || !b || *a < 0 || *a > 100 || *b < 0 || *b > 100) return std::nullopt;
+  return BandValues{CInt(*a), CInt(*b)};
 }
 
 std::optional<float> ReadStopLossPercent(std::string_view text) {

@@ -131,10 +131,13 @@ void Page::Centre() {
   Show();
 }
 
-// A chart that the turned page has no room for at its place goes to the middle, as large as fits.
+// Turned to landscape the chart takes the sheet. One that the turned page has no room for at its place
+// goes to the middle, as large as fits.
 void Page::Turned() {
   setup_.PrintOrient = services_.printer.Orientation();
-  if (!IsOnPage()) {
+  if (setup_.PrintOrient == kLandscape) {
+    EnlargeToPage(services_.printer, chart_, setup_);
+  } else if (!IsOnPage()) {
     setup_.PrintLeft = setup_.PrintTop = 0;
     setup_.PrintWidth = setup_.PrintHeight = 0;
     SetPageDefaults(services_.printer, chart_, setup_);

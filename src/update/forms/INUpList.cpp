@@ -22,6 +22,13 @@ namespace {
 
 constexpr const char* kCodeLetters = R"([^,"\x00-\x20]*)";
 
+// What is no category is kept as 0.
+std::int16_t CategoryOf(const std::string& text) {
+  const double category = Val(text);
+  return category >= 0 && category <= 99 ? CInt(category) : std::int16_t(0);
+}
+std::string CategoryText(std::int16_t category) { return Format(double(category), "##0"); }
+
 }  // namespace
 
 INUpList::INUpList(UpdateFormServices services, QWidget* parent)
@@ -46,6 +53,8 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
 
   rows_.check = [](int, int column, std::string& text) -> std::optional<Refusal> {
     if (column == 0) text = UCase(Trim(text));
+    // As it will be kept.
+    if (column == 1) text = CategoryText(CategoryOf(text));
     return std::nullopt;
   };
   ss1_ = new Grid(rows_, {.dialogs = services_.dialogs, .files = services_.files},
@@ -133,16 +142,13 @@ void INUpList::LoadMaster() {
 }
 
 void INUpList::AddRow(const UpdateRow& row) {
-  rows_.rows.push_back(
-      {{row.code, row.code.empty() ? "" : Format(double(row.category), "##0"), row.name}});
+  rows_.rows.push_back({{row.code, row.code.empty() ? "" : CategoryText(row.category), row.name}});
 }
 
 std::vector<UpdateRow> INUpList::Rows() const {
   std::vector<UpdateRow> rows;
   for (int i = 0; i < rows_.RowCount(); ++i) {
-    const double category = Val(rows_.Text(i, 1));
-    rows.push_back({UCase(Trim(rows_.Text(i, 0))),
-                    category >= 0 && category <= 99 ? CInt(category) : std::int16_t(0),
+    rows.push_back({UCase(Trim(rows_.Text(i, 0))), CategoryOf(rows_.Text(i, 1)),
                     std::string(Trim(rows_.Text(i, 2)))});
   }
   return rows;
@@ -193,8 +199,7 @@ void INUpList::Print() {
                              .at = {0, 0.15, 0.25}},
                   .rows = {}};
   for (const UpdateRow& row : Rows())
-    if (!row.code.empty())
-      table.rows.push_back({row.code, Format(double(row.category), "##0"), row.name});
+    if (!row.code.empty()) table.rows.push_back({row.code, CategoryText(row.category), row.name});
   if (table.rows.empty()) {
     services_.dialogs.Message("No records to print", "Update List");
     return;

@@ -624,8 +624,8 @@ TEST_F(BandsForm, BollingerValuesAreTheSecondPair) {
 
 TEST_F(BandsForm, ValuesOutOfRangeAreToldAndTheFormStays) {
   Open(BandForm::kPercentage);
-  const std::pair<const char*, const char*> bads[] = {
-      {"101", "5"}, {"-1", "5"}, {"5", "101"}, {"5", "-1"}};
+  const std::pair<const char*, const char*> bads[] = {{"101", "5"}, {"-1", "5"}, {"5", "101"},
+                                                      {"5", "-1"},  {"x", "5"},  {"5", "5a"}};
   for (const auto& [up, down] : bads) {
     Type("Text1", up);
     Type("Text2", down);

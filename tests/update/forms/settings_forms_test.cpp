@@ -392,6 +392,9 @@ TEST_F(UpdateListForm, SavesAChangedListOnClosing) {
   Trigger("ulAdd");
   TypeInto(1, 0, "new");
   TypeInto(1, 1, "500");
+  EXPECT_EQ(Cell(1, 1), "0") << "as it is kept";
+  TypeInto(1, 1, "x");
+  EXPECT_EQ(Cell(1, 1), "0");
   QTest::keyClick(form.get(), Qt::Key_Escape);
   EXPECT_FALSE(form->isVisible());
   EXPECT_EQ(home.Get(kSystem + "Update.Lst"), "ZAP,1,\r\nNEW,0,\r\n");
