@@ -403,7 +403,13 @@ void ChartWindow::LayOut(bool twoPanes) {
     services_.layOut(twoPanes);
   else
     services_.panel.SetVisible(twoPanes);
-  view_.LegendShown = state().ReversalsOn && state().ChartStyle == Style::kBar;
+  ShowLegend();
+}
+
+// Never over a panel's chart, nor over one that was saved.
+void ChartWindow::ShowLegend() {
+  view_.LegendShown = state().ReversalsOn && state().ChartStyle == Style::kBar &&
+                      !services_.panel.Visible() && !ChartFromFile;
 }
 
 ChartServices ChartWindow::Services(Surface& price, Surface* panel, ChartScript* script) {
@@ -445,6 +451,7 @@ bool ChartWindow::Compose(const ChartRequest& request, ChartPlace place) {
     savedMarks_ = {};
   }
   ChartFromFile = false;
+  ShowLegend();
   Request = request;
   Request.Place = place;
   if (place == ChartPlace::kUpper || place == ChartPlace::kUnder) first_ = request;
@@ -531,11 +538,20 @@ bool ChartWindow::ToggleGridLines() {
   return Recompose();
 }
 
+bool ChartWindow::ToggleLegible() {
+  bool& on = services_.settings.charts.Legible;
+  on = !on;
+  services_.ini.PutSetting("Charts", "Legible", on ? "True" : "False");
+  if (!IsPair(arrangement_)) return Recompose();
+  first_.Legible = Request.Legible = on;
+  return RedrawPair();
+}
+
 bool ChartWindow::ToggleReversals() {
   CancelChartTools();
   ChartState& s = state();
   s.ReversalsOn = !s.ReversalsOn;
-  view_.LegendShown = s.ReversalsOn && s.ChartStyle == Style::kBar;
+  ShowLegend();
   return s.ChartStyle == Style::kBar && Recompose();
 }
 
@@ -594,8 +610,10 @@ void ChartWindow::ShowPanel(std::string_view code) {
   // The panel before may have left a scale of its own.
   OwnScale(services_.panel);
   ShowOscillatorPanel(host);
-  panelFrame_ = {
-      .Left = 42, .Right = Chart.ChartRight, .Top = host.PanelTop, .Bottom = host.PanelBottom};
+  panelFrame_ = {.Left = Chart.ChartLeft,
+                 .Right = Chart.ChartRight,
+                 .Top = host.PanelTop,
+                 .Bottom = host.PanelBottom};
   panelCode_ = host.OscCode;
 }
 
@@ -828,6 +846,7 @@ void ChartWindow::ShowSaved(const std::string& path) {
                                  services_.settings.fonts, services_.colours, path);
   // Whatever came of it, the composed chart is gone: nothing reads its tables.
   if (!ChartFromFile) Chart.ChartDrawn = false;
+  ShowLegend();
   RefreshTitle();
 }
 
@@ -887,6 +906,50 @@ bool ChartWindow::StepDateLimit(int index) {
   return Redraw();
 }
 
+bool ChartWindow::MoveTime(TimeStep step, int by) {
+  ChartState& s = state();
+  if (by == 0 || Loading || !HasChart() || ChartFromFile || !Chart.ChartDrawn ||
+      IsPair(arrangement_) || Request.ChartStyle == Style::kPointFigure)
+    return false;
+  const PriceFile file(services_.files,
+                       services_.settings.paths.CurrentDataPath + services_.current.PriceFileName);
+  std::vector<std::int32_t> dates;
+  for (const PriceRec& rec : file.ReadAll()) dates.push_back(CLng(Val(rec.RecDate.raw())));
+  const std::int32_t last = Chart.Bars.LastDataRec;
+  const std::int32_t end =
+      MovedEnd(dates, Request.ChartPeriod, last, RecordsWanted(Request, Chart), step, by);
+  if (end < 1 || end == last) return false;
+  const auto date = ParseFileDate(Format(double(dates[size_t(end) - 1]), "00000000"));
+  if (!date) return false;
+  const bool chosen = s.DateLimitOn && !s.ScrollInUse;
+  if (!chosen && end == std::int32_t(dates.size())) {
+    s.DateLimitOn = s.ScrollInUse = false;
+    return DrawAll();
+  }
+  s.DateLimitOn = true;
+  s.DateLimitDate = FormatFileDate(*date);
+  s.DateLimitText = FormatDisplayDate(*date);
+  s.DateLimitMoved = true;
+  if (!chosen) {
+    s.ScrollInUse = true;
+    s.ChosenLimitDate = s.DateLimitDate;
+    s.ChosenLimitText = FormatUserDate(*date);
+  }
+  return DrawAll();
+}
+
+bool ChartWindow::ChangeSpacing(int by) {
+  ChartState& s = state();
+  if (Loading || !HasChart() || ChartFromFile || IsPair(arrangement_) ||
+      s.ChartStyle == Style::kPointFigure)
+    return false;
+  const bool three = s.ChartStyle == Style::kCandlestick || s.SwingOn;
+  const auto spacing = std::int16_t(std::clamp(int(s.BarSpacing) + by, three ? 3 : 1, 20));
+  if (spacing == s.BarSpacing) return false;
+  s.BarSpacing = services_.settings.charts.Spacing = spacing;
+  return DrawAll();
+}
+
 bool ChartWindow::DropFrame(double x, double y, double width, double height) {
   view_.Frame = FramePlace{y + height / 2, x - width / 2};
   view_.FrameShown = true;
@@ -904,9 +967,15 @@ void ChartWindow::StartNewChart() {
   CancelChartTools();
   s.SuppressScript = false;
   EmptyDrawnLines();
+  pictureGone_ = superimposing;
   if (superimposing) services_.price.Cls();
   services_.price.SetAutoRedraw(false);
   s.ChartTask = kTaskNewChart;
+}
+
+void ChartWindow::BackToChart() {
+  state().ChartTask = kTaskNone;
+  if (std::exchange(pictureGone_, false)) Resized();
 }
 
 void ChartWindow::CancelChartTools() {

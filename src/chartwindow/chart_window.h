@@ -11,6 +11,7 @@
 #include "chart/chart_state.h"
 #include "chart/composer.h"
 #include "chart/composition.h"
+#include "chartwindow/time_walk.h"
 #include "chartwindow/told_once.h"
 #include "chartwindow/tools/arrangement.h"
 #include "chartwindow/tools/chart_tool.h"
@@ -186,6 +187,8 @@ class ChartWindow {
   bool SetStyle(Style style);
   bool SetPeriod(Period period);
   bool ToggleGridLines();
+  // Whether labels that would not fit are made to; kept.
+  bool ToggleLegible();
   bool ToggleReversals();
   bool ToggleOutsideDays();
   bool ToggleMMA();
@@ -238,6 +241,12 @@ class ChartWindow {
 
   // 0 to 2 a day, week or month forward, 3 to 5 backward. The ends of the data are no limit.
   bool StepDateLimit(int index);
+  // Moves the end of the chart through the data, by steps to later bars or, below 0, to earlier
+  // ones. At the newest window the limit goes, and with the next chart, unless it was chosen in
+  // chart selection. False where nothing moves: at an end, on point and figure, on two charts.
+  bool MoveTime(TimeStep step, int by);
+  // Space between bars, 1 to 20; candlesticks and swings need 3. Not for point and figure.
+  bool ChangeSpacing(int by);
   // The frame was dropped at (x, y) of the chart; its size.
   bool DropFrame(double x, double y, double width, double height);
 
@@ -245,6 +254,8 @@ class ChartWindow {
 
   // Before chart selection opens.
   void StartNewChart();
+  // It was left without a choice: the chart on show stands.
+  void BackToChart();
   void CancelChartTools();
   void SetTB(int button) { view_.TB = button; }
   void ToggleGrid();
@@ -301,6 +312,7 @@ class ChartWindow {
   void HideFrame();
   void TakeChosenLimit();
   void LayOut(bool twoPanes);
+  void ShowLegend();
   bool Compose();
   bool Compose(const ChartRequest& request, ChartPlace place);
   bool DrawAll();
@@ -333,6 +345,7 @@ class ChartWindow {
   std::optional<ChartScript> script_;
   ChartRequest first_;             // of the first chart of a pair
   std::string panelCode_;          // the oscillator that was drawn last, empty none
+  bool pictureGone_ = false;       // the picture was cleared for a chart to come
   bool boxKept_ = false;           // the chart to come is the one on show: its box value stands
   std::int16_t SavedSpacing_ = 2;  // of the bars, while a swing is on
   bool panelPicked_ = false;       // from the menu: it is not part of the next chart, unless

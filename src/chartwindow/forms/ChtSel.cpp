@@ -204,6 +204,13 @@ void ChtSel::Leave() {
   if (closed) closed();
 }
 
+// Back to the chart that stands, as if the form had not been opened.
+void ChtSel::Escape() {
+  const auto back = services_.backToChart;
+  if (!back || !back()) return reject();
+  QDialog::reject();
+}
+
 bool ChtSel::event(QEvent* event) {
   const bool taken = SelectionForm::event(event);
   if (event->type() == QEvent::WindowActivate) Activated();

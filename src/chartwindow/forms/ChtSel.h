@@ -15,6 +15,7 @@ class ChtSel : public SelectionForm {
  protected:
   void Refresh() override;
   void Leave() override;
+  void Escape() override;
   bool FieldEnter(QObject* field) override;
   bool FieldMouse(QObject* field, QEvent::Type type) override;
   bool event(QEvent* event) override;

@@ -21,6 +21,7 @@
 #include <QStatusBar>
 #include <QToolBar>
 #include <QToolButton>
+#include <QWheelEvent>
 #include <algorithm>
 #include <cmath>
 #include <new>
@@ -106,7 +107,25 @@ const std::vector<Menu>& Menus() {
         {"cmfonts", "&Fonts"},
         {"cmVHeight", "&Volume Height"},
         {"cmLineWidth", "&Line Width (Printing)"},
-        {"cmBSpaces", "&Blank space at end of chart"}}},
+        {"cmBSpaces", "&Blank space at end of chart"},
+        {"cmLegible", "Legible &Labels"}}},
+      {"cmMove",
+       "&Move",
+       {{"cmNextChart", "&Next Chart\tCtrl+Page Down"},
+        {"cmPrevChart", "&Previous Chart\tCtrl+Page Up"},
+        {"", ""},
+        {"cmOldest", "&Oldest Window\tHome"},
+        {"cmNewest", "Ne&west Window\tEnd"},
+        {"cmEarlier", "&Earlier Window\tPage Up"},
+        {"cmLater", "&Later Window\tPage Down"},
+        {"", ""},
+        {"cmBarBack", "A &Bar Earlier\tCtrl+Left, Wheel"},
+        {"cmBarOn", "A B&ar Later\tCtrl+Right, Wheel"},
+        {"cmMonthBack", "A &Month Earlier\tCtrl+Shift+Left, Shift+Wheel"},
+        {"cmMonthOn", "A Mon&th Later\tCtrl+Shift+Right, Shift+Wheel"},
+        {"", ""},
+        {"cmWider", "W&ider Spacing\tCtrl++, Ctrl+Wheel"},
+        {"cmNarrower", "Na&rrower Spacing\tCtrl+-, Ctrl+Wheel"}}},
       {"cmOscillators", "&Oscillators", OscillatorEntries()},
   };
   return menus;
@@ -118,6 +137,18 @@ const Entry* OscillatorEntry(const std::string& name) {
     if (name == entry.name) return entry.oscillator ? &entry : nullptr;
   return nullptr;
 }
+
+// The entries that move through time.
+struct Move {
+  const char* entry;
+  TimeStep step;
+  int by;
+};
+constexpr Move kMoves[] = {
+    {"cmOldest", TimeStep::kEnd, -1},      {"cmNewest", TimeStep::kEnd, 1},
+    {"cmEarlier", TimeStep::kWindow, -1},  {"cmLater", TimeStep::kWindow, 1},
+    {"cmBarBack", TimeStep::kBar, -1},     {"cmBarOn", TimeStep::kBar, 1},
+    {"cmMonthBack", TimeStep::kMonth, -1}, {"cmMonthOn", TimeStep::kMonth, 1}};
 
 int ButtonOf(const std::string& entry) {
   for (int button = 1; button <= kToolButtons; ++button)
@@ -213,6 +244,9 @@ Chts::Chts(const ChtsServices& services, QWidget* parent)
     else
       Do([this] { window_.Resized(); });
   });
+  wheeled_.setSingleShot(true);
+  wheeled_.setInterval(0);
+  wheeled_.callOnTimeout(this, [this] { TurnWheel(); });
   for (PictureBox* picture : {picture1_, picture2_})
     picture->Resized = [this, picture] {
       picture->surface().SetBackColour(s_.colours[kBackground]);
@@ -251,8 +285,8 @@ void Chts::BuildMenus() {
       connect(action, &QAction::triggered, this, [this, name] { Trigger(name); });
     }
   }
-  for (const char* name :
-       {"cmInd", "cmGridLines", "cmPFAuto", "cmInsOuts", "cmMMA", "cmSwing", "cmKeepOsc"})
+  for (const char* name : {"cmInd", "cmGridLines", "cmPFAuto", "cmInsOuts", "cmMMA", "cmSwing",
+                           "cmKeepOsc", "cmLegible"})
     entries_[name]->setCheckable(true);
 }
 
@@ -349,6 +383,7 @@ std::function<void()> Chts::DeedOf(const std::string& entry) {
   if (entry == "cmInd") return deed([&w] { w.ToggleReversals(); });
   if (entry == "cmInsOuts" && xs) return deed([&w] { w.ToggleOutsideDays(); });
   if (entry == "cmKeepOsc") return deed([&w] { w.ToggleKeepOscillator(); });
+  if (entry == "cmLegible") return deed([&w] { w.ToggleLegible(); });
   if (entry == "cmMMA") return deed([&w] { w.ToggleMMA(); });
   if (entry == "cmPFAuto") return deed([&w] { w.TogglePFAuto(); });
   if (entry == "cmSwing") return deed([&w] { w.ToggleSwing(); });
@@ -357,6 +392,12 @@ std::function<void()> Chts::DeedOf(const std::string& entry) {
   if (entry == "cmText") return deed([&w] { w.StartText(); });
   if (entry == "cmRemAllTrend") return deed([&w] { w.RemoveAllTrendlines(); });
   if (entry == "cmChtScroll") return [this] { OpenScroll(); };
+  if (entry == "cmNextChart") return DeedOf("fwd");
+  if (entry == "cmPrevChart") return DeedOf("rev");
+  for (const Move& move : kMoves)
+    if (entry == move.entry) return deed([&w, &move] { w.MoveTime(move.step, move.by); });
+  if (entry == "cmWider") return deed([&w] { w.ChangeSpacing(1); });
+  if (entry == "cmNarrower") return deed([&w] { w.ChangeSpacing(-1); });
   if (const Entry* picked = OscillatorEntry(entry)) {
     if (picked->oscillator->switchXT && !s_.settings.words.OptionXT) return {};
     return deed([&w, picked] { w.PickOscillator(picked->oscillator->code, picked->slow); });
@@ -446,6 +487,11 @@ void Chts::Refresh() {
   Do([this] { window_.Refresh(); });
 }
 
+void Chts::BackToChart() {
+  Do([this] { window_.BackToChart(); });
+  setFocus();
+}
+
 void Chts::DropSecondChart() {
   Do([this] { window_.DropSecondChart(); });
   Refresh();
@@ -506,6 +552,7 @@ void Chts::ShowView() {
   entries_["cmInsOuts"]->setChecked(state.OutsideDaysOn);
   entries_["cmMMA"]->setChecked(state.MMAOn);
   entries_["cmKeepOsc"]->setChecked(state.KeepOsc);
+  entries_["cmLegible"]->setChecked(s_.settings.charts.Legible);
   entries_["cmSwing"]->setChecked(state.SwingOn);
   PlaceLegend();
   label1_->setText(ToQt(view.Caption));
@@ -737,7 +784,37 @@ bool Chts::eventFilter(QObject* object, QEvent* event) {
   return QMainWindow::eventFilter(object, event);
 }
 
+// Notches that come while a chart is drawn are one move.
+void Chts::TakeWheel(const QWheelEvent& wheel) {
+  const QPoint angle = wheel.angleDelta();
+  const bool control = wheel.modifiers() & Qt::ControlModifier;
+  const WheelUse use = control                                 ? WheelUse::kSpacing
+                       : wheel.modifiers() & Qt::ShiftModifier ? WheelUse::kMonth
+                                                               : WheelUse::kBar;
+  if (use != wheelUse_) wheelAngle_ = 0;
+  wheelUse_ = use;
+  wheelAngle_ += angle.y() != 0 ? angle.y() : angle.x();
+  if (std::abs(wheelAngle_) >= QWheelEvent::DefaultDeltasPerStep) wheeled_.start();
+}
+
+// Up is back in time, and wider.
+void Chts::TurnWheel() {
+  const int notches = wheelAngle_ / QWheelEvent::DefaultDeltasPerStep;
+  if (busy_ || notches == 0) return;
+  wheelAngle_ -= notches * QWheelEvent::DefaultDeltasPerStep;
+  Do([&] {
+    if (wheelUse_ == WheelUse::kSpacing)
+      window_.ChangeSpacing(notches);
+    else
+      window_.MoveTime(wheelUse_ == WheelUse::kMonth ? TimeStep::kMonth : TimeStep::kBar, -notches);
+  });
+}
+
 bool Chts::PictureEvent(PictureBox* picture, QEvent* event) {
+  if (event->type() == QEvent::Wheel) {
+    TakeWheel(*static_cast<QWheelEvent*>(event));
+    return true;
+  }
   const bool press = event->type() == QEvent::MouseButtonPress;
   const bool release = event->type() == QEvent::MouseButtonRelease;
   if (busy_ || !(press || release || event->type() == QEvent::MouseMove)) return false;
@@ -858,9 +935,25 @@ void Chts::keyPressEvent(QKeyEvent* event) {
   if (event == QKeySequence::Copy) return CopyPicture();
   if (event == QKeySequence::Print) return Trigger("cmPrintChart");
   if (ToolKey(event)) return;
+  const auto modifiers = event->modifiers() & ~Qt::KeypadModifier;
+  const bool month = modifiers == (Qt::ControlModifier | Qt::ShiftModifier);
+  if (modifiers == Qt::ControlModifier || month) {
+    switch (event->key()) {
+      case Qt::Key_Left: return Trigger(month ? "cmMonthBack" : "cmBarBack");
+      case Qt::Key_Right: return Trigger(month ? "cmMonthOn" : "cmBarOn");
+      case Qt::Key_Plus:
+      case Qt::Key_Equal: return Trigger("cmWider");
+      case Qt::Key_Minus: return Trigger("cmNarrower");
+      case Qt::Key_PageDown: return Trigger("fwd");
+      case Qt::Key_PageUp: return Trigger("rev");
+      default: break;
+    }
+  }
   switch (plain ? event->key() : 0) {
-    case Qt::Key_PageDown: return Trigger("fwd");
-    case Qt::Key_PageUp: return Trigger("rev");
+    case Qt::Key_PageDown: return Trigger("cmLater");
+    case Qt::Key_PageUp: return Trigger("cmEarlier");
+    case Qt::Key_Home: return Trigger("cmOldest");
+    case Qt::Key_End: return Trigger("cmNewest");
     case Qt::Key_F5: return Trigger("ref");
     case Qt::Key_Escape: return Do([this] { window_.CancelChartTools(); });
     default: QMainWindow::keyPressEvent(event);
@@ -887,6 +980,9 @@ bool Chts::ToolKey(QKeyEvent* event) {
     return true;
   }
   if (modifiers & ~Qt::ShiftModifier) return false;
+  // Without a tool they move the chart.
+  if ((event->key() == Qt::Key_Home || event->key() == Qt::Key_End) && !window_.ToolOn())
+    return false;
   const int far = modifiers & Qt::ShiftModifier ? 10 : 1;
   const auto move = [&](auto work) {
     work();

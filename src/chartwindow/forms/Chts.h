@@ -17,6 +17,7 @@ class QFrame;
 class QLabel;
 class QPushButton;
 class QToolBar;
+class QWheelEvent;
 
 namespace kora {
 
@@ -67,6 +68,8 @@ class Chts : public QMainWindow {
   void ShowChosen();
   // The current chart once more.
   void Refresh();
+  // Chart selection was left without a choice.
+  void BackToChart();
   // The second chart of a pair was not chosen: the first is drawn alone again.
   void DropSecondChart();
   // After the data folder changed.
@@ -111,6 +114,8 @@ class Chts : public QMainWindow {
   std::string MakePictureFile(const std::string& path);
   void CloseWindow();
   bool OpenMenuByKey(QKeyEvent* event, bool open);
+  void TakeWheel(const QWheelEvent& wheel);
+  void TurnWheel();
   bool PictureEvent(PictureBox* picture, QEvent* event);
   bool ToolKey(QKeyEvent* event);
   TrendChoice PopUpTrend();
@@ -133,6 +138,10 @@ class Chts : public QMainWindow {
   ChartScroll scroll_;
   QTimer resized_;
   QTimer timer1_;
+  enum class WheelUse { kBar, kMonth, kSpacing };
+  QTimer wheeled_;
+  WheelUse wheelUse_ = WheelUse::kBar;
+  int wheelAngle_ = 0;  // turned and not used yet
   bool twoPanes_ = false;
   bool busy_ = false;
   bool sizeWaits_ = false;

@@ -28,6 +28,11 @@ SelectionForm::SelectionForm(const char* name, const QString& title, ChtSelServi
   label8_->setFont(bold);
 
   text1_ = AddShown("Text1", 10);
+  connect(text1_, &QLineEdit::textEdited, this, [this] {
+    typed_ = true;
+    style_.reset();
+    period_.reset();
+  });
   text2_ = AddShown("Text2", 38);
   text4_ = AddShown("Text4", 8);
   text5_ = AddShown("Text5", 8);
@@ -51,6 +56,7 @@ SelectionForm::SelectionForm(const char* name, const QString& title, ChtSelServi
   combo1_->setObjectName("Combo1");
   combo1_->addItems({"Bar", "Candlestick", "Line", "Point & Figure"});
   connect(combo1_, &QComboBox::activated, this, [this](int index) {
+    style_ = index;
     services_.selection.ChooseStyle(index);
     Refresh();
   });
@@ -58,6 +64,7 @@ SelectionForm::SelectionForm(const char* name, const QString& title, ChtSelServi
   combo4_->setObjectName("Combo4");
   combo4_->addItems({"Daily", "Weekly", "Monthly"});
   connect(combo4_, &QComboBox::activated, this, [this](int index) {
+    period_ = index;
     services_.selection.ChoosePeriod(index);
     Refresh();
   });
@@ -143,7 +150,11 @@ void SelectionForm::Refresh() {
     if (!field->hasFocus()) field->setCursorPosition(0);
   };
   label8_->setText(QString::fromStdString(view.Label8));
-  set(text1_, view.Text1);
+  if (!typed_ || view.Text1 != shown_) {
+    typed_ = false;
+    shown_ = view.Text1;
+    set(text1_, view.Text1);
+  }
   set(text2_, view.Text2);
   set(text3_, view.Text3);
   set(text4_, view.Text4);
@@ -165,6 +176,7 @@ void SelectionForm::FocusCode() {
 void SelectionForm::ShowChart() {
   // A mnemonic presses the button without taking the focus from the spacing.
   if (text3_->hasFocus()) services_.selection.LeaveSpacing();
+  if (!EnterTyped()) return;
   if (!services_.selection.OK()) return;
   // Closing this form may delete it: what is still called must not live in it.
   const ChtSelServices services = services_;
@@ -179,17 +191,33 @@ void SelectionForm::ShowChart() {
 
 void SelectionForm::reject() { command2_->click(); }
 
+// A code that was typed and not entered is entered first; what was chosen for it since stays.
+bool SelectionForm::EnterTyped() {
+  if (!typed_ || text1_->text().trimmed().isEmpty()) return true;
+  const auto style = style_, period = period_;
+  if (!EnterCode()) return false;
+  if (style) services_.selection.ChooseStyle(*style);
+  if (period) services_.selection.ChoosePeriod(*period);
+  return true;
+}
+
+// False where the code is not there; the focus is on it then.
+bool SelectionForm::EnterCode() {
+  const auto entered = services_.selection.EnterCode(text1_->text().toStdString());
+  // What was typed stays where it led nowhere.
+  typed_ = entered == ChartSelection::Entered::kNothing;
+  Refresh();
+  if (entered == ChartSelection::Entered::kFound) {
+    ok_->setFocus();
+    return true;
+  }
+  FocusCode();
+  return false;
+}
+
 bool SelectionForm::FieldEnter(QObject* field) {
   if (field != text1_) return field == text3_;
-  const QString typed = text1_->text();
-  const auto entered = services_.selection.EnterCode(typed.toStdString());
-  Refresh();
-  // What was typed stays where it led nowhere.
-  if (entered == ChartSelection::Entered::kNothing) text1_->setText(typed);
-  if (entered == ChartSelection::Entered::kFound)
-    ok_->setFocus();
-  else
-    text1_->selectAll();
+  EnterCode();
   return true;
 }
 
@@ -217,6 +245,7 @@ void SelectionForm::keyPressEvent(QKeyEvent* event) {
     case Qt::Key_Enter:
       if (auto* button = qobject_cast<QAbstractButton*>(focusWidget())) button->click();
       return;
+    case Qt::Key_Escape: return Escape();
     case Qt::Key_PageUp: vScroll1_->triggerAction(QAbstractSlider::SliderSingleStepSub); return;
     case Qt::Key_PageDown: vScroll1_->triggerAction(QAbstractSlider::SliderSingleStepAdd); return;
     default: QDialog::keyPressEvent(event);

@@ -3,6 +3,8 @@
 #include <QDialog>
 #include <QEvent>
 #include <functional>
+#include <optional>
+#include <string>
 
 #include "chartwindow/chart_selection.h"
 #include "platform/dialogs.h"
@@ -30,6 +32,8 @@ struct ChtSelServices {
   std::function<void()> showWindow;          // shows the chart window, on the way from the start
   std::function<void()> closed;              // the chart window closes, the menus come back
   std::function<void()> secondDropped = {};  // the second chart of a pair was not chosen
+  // Nothing was chosen: back to the chart on show. False where none stands.
+  std::function<bool()> backToChart = {};
   // Chart defaults, modally; `averagesChanged` is called when an average was switched or saved.
   std::function<void(const std::function<void()>& averagesChanged)> openChtDef;
   std::function<bool()> openFinDate;   // true when a date was chosen
@@ -56,6 +60,7 @@ class SelectionForm : public QDialog {
   // Shows the view.
   virtual void Refresh();
   virtual void Leave() = 0;  // Command2
+  virtual void Escape() { reject(); }
   void ShowChart();
   // The code has the focus, its text selected.
   void FocusCode();
@@ -76,7 +81,13 @@ class SelectionForm : public QDialog {
 
  private:
   void Step(bool up);
+  bool EnterTyped();
+  bool EnterCode();
   bool placed_ = false;
+  // A code was typed for the one shown and is not entered yet; what was chosen since.
+  bool typed_ = false;
+  std::string shown_;
+  std::optional<int> style_, period_;
 };
 
 }  // namespace kora

@@ -99,7 +99,9 @@ void ChartDesk::PathsChanged() {
 
 void ChartDesk::OpenCharts() {
   if (chts_) {
-    mdi_->setActiveSubWindow(qobject_cast<QMdiSubWindow*>(chts_->parentWidget()));
+    auto* frame = qobject_cast<QMdiSubWindow*>(chts_->parentWidget());
+    if (frame->isMinimized() || frame->isShaded()) frame->showNormal();
+    mdi_->setActiveSubWindow(frame);
     chts_->setFocus();
     return;
   }
@@ -430,7 +432,23 @@ void ChartDesk::OpenSelection() {
   }
   // One form at a time works on the selection.
   if (secondForm_) delete secondForm_;
-  selectionForm_ = Show(new ChtSel(SelectionServices(), over_));
+  ChtSelServices services = SelectionServices();
+  services.backToChart = [this, state = session_.charts, current = session_.current,
+                          charts = session_.settings.charts,
+                          folder = session_.settings.paths.CurrentDataPath] {
+    if (!chts_ || state.ChartIndex == 0) return false;
+    if (session_.settings.paths.CurrentDataPath == folder) {
+      const ChartSettings& now = session_.settings.charts;
+      session_.charts = state;
+      session_.current = current;
+      // Set in the defaults meanwhile.
+      if (now.AvOne != charts.AvOne) session_.charts.Ma1On = now.AvOne;
+      if (now.AvTwo != charts.AvTwo) session_.charts.Ma2On = now.AvTwo;
+    }
+    chts_->BackToChart();
+    return true;
+  };
+  selectionForm_ = Show(new ChtSel(std::move(services), over_));
 }
 
 void ChartDesk::OpenSecondChart() {

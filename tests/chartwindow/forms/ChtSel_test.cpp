@@ -438,6 +438,56 @@ TEST_F(ChtSelTest, EscapeClosesAndWrites) {
   EXPECT_EQ(Kept("AvOne"), "True");
 }
 
+TEST_F(ChtSelTest, EscapeGoesBackToTheChartThatStands) {
+  int back = 0;
+  ChtSelServices services = Services();
+  services.backToChart = [&] { return ++back; };
+  Stand(std::make_unique<ChtSel>(std::move(services), nullptr));
+  On<QCheckBox>("OAve1")->setFocus();
+  PressKey(Qt::Key_Space);
+  PressKey(Qt::Key_Escape);
+  EXPECT_FALSE(form->isVisible());
+  EXPECT_EQ(back, 1);
+  EXPECT_EQ(closed, 0);
+  EXPECT_NE(Kept("AvOne"), "True");
+}
+
+TEST_F(ChtSelTest, ShowChartEntersTheCodeThatWasTyped) {
+  Open();
+  QTest::keyClicks(Text("Text1"), "bhp");
+  Press("OK");
+  EXPECT_EQ(shown, 1);
+  EXPECT_EQ(shownIndex, 3);
+}
+
+TEST_F(ChtSelTest, ATypedCodeStaysWhileTypeAndPeriodAreChosenForIt) {
+  Open();
+  QTest::keyClicks(Text("Text1"), "bhp");
+  Choose("Combo4", kWeeklyIndex);
+  EXPECT_EQ(TextOf("Text1"), "bhp");
+  Choose("Combo1", kCandleIndex);
+  PressKey(Qt::Key_H, Qt::AltModifier);
+  ASSERT_TRUE(WaitFor([this] { return shown == 1; }));
+  EXPECT_EQ(shownIndex, 3);
+  EXPECT_EQ(state.ChartPeriod, Period::kWeekly);
+  EXPECT_EQ(state.ChartStyle, Style::kCandlestick);
+}
+
+TEST_F(ChtSelTest, ShowChartOfACodeThatIsNotThereShowsNone) {
+  Open();
+  dialogs.answers = {Answer::kNo};
+  QTest::keyClicks(Text("Text1"), "qqq");
+  Press("OK");
+  ExpectSaid("No record on file for that code - Find nearest code ?", "Chart Selection");
+  EXPECT_EQ(shown, 0);
+  EXPECT_TRUE(form->isVisible());
+  EXPECT_EQ(TextOf("Text1"), "qqq");
+  EXPECT_EQ(Focus(), "Text1");
+  Press("OK");
+  EXPECT_EQ(shown, 0) << "the nearest is shown to be looked at";
+  EXPECT_EQ(TextOf("Text1"), "XAO");
+}
+
 TEST_F(ChtSelTest, CloseFromTheFramePressesClose) {
   Open();
   form->close();

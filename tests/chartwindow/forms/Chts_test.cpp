@@ -164,6 +164,7 @@ TEST_F(ChtsFormTest, EveryEntryOfTheMenusIsThereWithItsCaption) {
       {"cmVHeight", "&Volume Height"},
       {"cmLineWidth", "&Line Width (Printing)"},
       {"cmBSpaces", "&Blank space at end of chart"},
+      {"cmLegible", "Legible &Labels"},
       {"cmDirect", "&Directional Movement"},
       {"cmROCFX", "RO&C and  FX"},
       {"cmRMX", "RM&X (Relative Movement - chart data)"},
@@ -241,10 +242,10 @@ TEST_F(ChtsFormTest, TheToolBarPagesAndChangesTypeAndPeriod) {
 
 TEST_F(ChtsFormTest, TheKeysPageAndRefresh) {
   Open();
-  Key(Qt::Key_PageDown);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_EQ(shown(), "BBB.WDT");
-  Key(Qt::Key_PageUp);
-  Key(Qt::Key_PageUp);
+  Key(Qt::Key_PageUp, Qt::ControlModifier);
+  Key(Qt::Key_PageUp, Qt::ControlModifier);
   EXPECT_EQ(shown(), "CCC.WDT");
   const QImage before = Shown();
   Picture()->surface().Cls();
@@ -252,11 +253,228 @@ TEST_F(ChtsFormTest, TheKeysPageAndRefresh) {
   EXPECT_EQ(Shown(), before);
 }
 
+TEST_F(ChtsFormTest, LegibleLabelsAreSwitchedInTheOptions) {
+  Open();
+  EXPECT_TRUE(Entry("cmLegible")->isChecked()) << "a new installation";
+  EXPECT_TRUE(request().Legible);
+  Entry("cmLegible")->trigger();
+  EXPECT_FALSE(Entry("cmLegible")->isChecked());
+  EXPECT_FALSE(request().Legible);
+  EXPECT_EQ(session->ini.GetSetting("Charts", "Legible"), "False");
+  Entry("cmLegible")->trigger();
+  EXPECT_TRUE(request().Legible);
+  EXPECT_EQ(session->ini.GetSetting("Charts", "Legible"), "True");
+}
+
+TEST_F(ChtsFormTest, LegibleLabelsAreOffWhereTheKeyIsMissing) {
+  session->settings = {};
+  session->ini.PutSetting("Charts", "Legible", "");
+  Open();
+  EXPECT_FALSE(Entry("cmLegible")->isChecked());
+  EXPECT_FALSE(request().Legible);
+}
+
+// A wheel's notches over the chart; up is above 0.
+class ChtsWheelTest : public ChtsFormTest {
+ protected:
+  // 900 days to 4 February 2026; a window of them is smaller.
+  void SetUp() override {
+    ChtsFormTest::SetUp();
+    std::vector<PriceRec> days;
+    for (int i = 0; i < 900; ++i) {
+      const float close = 10.0f + float(i % 7);
+      days.push_back(test::Day(FormatFileDate(DateOfDayNumber(DayNumber({2026, 2, 4}) - 899 + i)),
+                               close, close + 1, close - 1, close, 1000));
+    }
+    home.Put("drive_c/korawin/data/AAA.WDT", test::Bytes(days));
+    Open();
+    wanted = RecordsWanted(request(), form->window().Chart);
+    ASSERT_GT(wanted, 50);
+    ASSERT_LT(wanted, 800);
+  }
+  void Wheel(int notches, Qt::KeyboardModifiers modifiers = Qt::NoModifier) {
+    QWheelEvent event({100, 100}, Picture()->mapToGlobal(QPointF(100, 100)), {},
+                      {0, notches * QWheelEvent::DefaultDeltasPerStep}, Qt::NoButton, modifiers,
+                      Qt::NoScrollPhase, false);
+    QCoreApplication::sendEvent(Picture(), &event);
+  }
+  void Turn(int notches, Qt::KeyboardModifiers modifiers = Qt::NoModifier) {
+    Wheel(notches, modifiers);
+    QCoreApplication::processEvents();
+  }
+  int First() { return form->window().Chart.Bars.FirstDataRec; }
+  int Last() { return form->window().Chart.Bars.LastDataRec; }
+  std::string LastDate() {
+    const ChartBars& bars = form->window().Chart.Bars;
+    return std::string(bars[size_t(bars.BarCount)].date());
+  }
+  int wanted = 0;
+};
+
+TEST_F(ChtsWheelTest, ANotchIsABarAndWithShiftAMonth) {
+  EXPECT_EQ(LastDate(), "20260204");
+  Turn(1);
+  EXPECT_EQ(LastDate(), "20260203");
+  EXPECT_TRUE(session->charts.DateLimitOn);
+  Turn(2);
+  EXPECT_EQ(LastDate(), "20260201");
+  Turn(1, Qt::ShiftModifier);
+  EXPECT_EQ(LastDate(), "20260101");
+  Turn(-1, Qt::ShiftModifier);
+  EXPECT_EQ(LastDate(), "20260201");
+  Turn(-3);
+  EXPECT_EQ(LastDate(), "20260204");
+  EXPECT_FALSE(session->charts.DateLimitOn) << "the newest window has no limit";
+  Turn(-1);
+  EXPECT_EQ(LastDate(), "20260204");
+}
+
+TEST_F(ChtsWheelTest, NotchesThatComeTogetherAreOneMove) {
+  for (int i = 0; i < 20; ++i) Wheel(1);
+  EXPECT_EQ(LastDate(), "20260204") << "nothing is drawn while they come";
+  QCoreApplication::processEvents();
+  EXPECT_EQ(LastDate(), "20260115");
+}
+
+TEST_F(ChtsWheelTest, WithControlTheSpacingChangesFromOneToTwenty) {
+  EXPECT_EQ(request().BarSpacing, 2);
+  Turn(1, Qt::ControlModifier);
+  EXPECT_EQ(request().BarSpacing, 3);
+  Turn(30, Qt::ControlModifier);
+  EXPECT_EQ(request().BarSpacing, 20);
+  Turn(-30, Qt::ControlModifier);
+  EXPECT_EQ(request().BarSpacing, 1);
+  EXPECT_EQ(LastDate(), "20260204");
+  Press("cstick");
+  Turn(4, Qt::ControlModifier);
+  Turn(-30, Qt::ControlModifier);
+  EXPECT_EQ(request().BarSpacing, 3) << "a candle needs three";
+  Press("pf");
+  const QImage boxes = Shown();
+  Turn(1, Qt::ControlModifier);
+  Turn(1);
+  EXPECT_EQ(Shown(), boxes);
+}
+
+TEST_F(ChtsWheelTest, HomeAndEndGoToTheOldestAndNewestWindowThePageKeysAWindow) {
+  Key(Qt::Key_PageUp);
+  EXPECT_EQ(Last(), 900 - wanted);
+  Key(Qt::Key_PageDown);
+  EXPECT_EQ(Last(), 900);
+  Key(Qt::Key_Home);
+  EXPECT_EQ(First(), 1);
+  EXPECT_EQ(Last(), 1 + wanted);
+  Key(Qt::Key_PageUp);
+  EXPECT_EQ(Last(), 1 + wanted) << "nothing is older";
+  Key(Qt::Key_PageDown);
+  EXPECT_EQ(Last(), std::min(900, 1 + 2 * wanted));
+  Key(Qt::Key_End);
+  EXPECT_EQ(Last(), 900);
+  EXPECT_FALSE(session->charts.DateLimitOn);
+  EXPECT_EQ(shown(), "AAA.WDT");
+}
+
+TEST_F(ChtsWheelTest, TheKeysOfTheMenuDoWhatTheWheelDoes) {
+  Key(Qt::Key_Left, Qt::ControlModifier);
+  EXPECT_EQ(LastDate(), "20260203");
+  Key(Qt::Key_Left, Qt::ControlModifier | Qt::ShiftModifier);
+  EXPECT_EQ(LastDate(), "20260103");
+  Key(Qt::Key_Right, Qt::ControlModifier | Qt::ShiftModifier);
+  EXPECT_EQ(LastDate(), "20260203");
+  Key(Qt::Key_Right, Qt::ControlModifier);
+  EXPECT_EQ(LastDate(), "20260204");
+  Key(Qt::Key_Plus, Qt::ControlModifier);
+  EXPECT_EQ(request().BarSpacing, 3);
+  Key(Qt::Key_Minus, Qt::ControlModifier);
+  EXPECT_EQ(request().BarSpacing, 2);
+  EXPECT_FALSE(form->window().ToolOn());
+}
+
+TEST_F(ChtsWheelTest, EveryMoveIsInTheMenuWithItsKey) {
+  const std::pair<const char*, const char*> entries[] = {{"cmNextChart", "Ctrl+Page Down"},
+                                                         {"cmPrevChart", "Ctrl+Page Up"},
+                                                         {"cmOldest", "Home"},
+                                                         {"cmNewest", "End"},
+                                                         {"cmEarlier", "Page Up"},
+                                                         {"cmLater", "Page Down"},
+                                                         {"cmBarBack", "Wheel"},
+                                                         {"cmBarOn", "Wheel"},
+                                                         {"cmMonthBack", "Shift+Wheel"},
+                                                         {"cmMonthOn", "Shift+Wheel"},
+                                                         {"cmWider", "Ctrl+Wheel"},
+                                                         {"cmNarrower", "Ctrl+Wheel"}};
+  for (const auto& [name, key] : entries) {
+    EXPECT_TRUE(Entry(name)->isEnabled()) << name;
+    EXPECT_TRUE(Entry(name)->text().section('\t', 1).endsWith(key)) << name;
+  }
+  Entry("cmBarBack")->trigger();
+  EXPECT_EQ(LastDate(), "20260203");
+  Entry("cmMonthBack")->trigger();
+  EXPECT_EQ(LastDate(), "20260103");
+  Entry("cmOldest")->trigger();
+  EXPECT_EQ(First(), 1);
+  Entry("cmNewest")->trigger();
+  EXPECT_EQ(Last(), 900);
+  Entry("cmWider")->trigger();
+  EXPECT_EQ(request().BarSpacing, 3);
+  Entry("cmNextChart")->trigger();
+  EXPECT_EQ(shown(), "BBB.WDT");
+}
+
+TEST_F(ChtsWheelTest, TheNextChartIsShownToItsNewestDay) {
+  Turn(5);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_FALSE(session->charts.DateLimitOn);
+}
+
+TEST_F(ChtsWheelTest, AnOscillatorOfTheMenuMovesWithTheChart) {
+  Entry("cmRelStrength")->trigger();
+  const QImage panel = Shown("Picture2(0)");
+  Turn(40);
+  EXPECT_TRUE(Box("Picture2(0)")->isVisible());
+  EXPECT_NE(Shown("Picture2(0)"), panel);
+}
+
+TEST_F(ChtsWheelTest, AShortFileStaysWhereItIs) {
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
+  const QImage before = Shown();
+  for (const Qt::Key key : {Qt::Key_PageUp, Qt::Key_Home, Qt::Key_PageDown, Qt::Key_End}) Key(key);
+  Turn(3);
+  Turn(1, Qt::ShiftModifier);
+  EXPECT_EQ(Shown(), before);
+  EXPECT_FALSE(session->charts.DateLimitOn);
+}
+
+TEST_F(ChtsFormTest, TheLegendGoesWhileAPanelIsOpenAndIsNeverOverASavedChart) {
+  Open();
+  Entry("cmKeepOsc")->trigger();
+  Entry("cmInd")->trigger();
+  auto* legend = Box("Picture4");
+  EXPECT_TRUE(legend->isVisible());
+  Entry("cmRelStrength")->trigger();
+  EXPECT_FALSE(legend->isVisible());
+  Press("ref");
+  EXPECT_TRUE(legend->isVisible());
+  save = "c:\\korawin\\chtsave\\x.cht";
+  Entry("cmSaveAs")->trigger();
+  show = save;
+  Entry("cmSSavedCht")->trigger();
+  EXPECT_TRUE(form->window().ChartFromFile);
+  EXPECT_FALSE(legend->isVisible());
+  form->resize(form->width() - 20, form->height() - 20);
+  QTest::qWait(0);
+  EXPECT_FALSE(legend->isVisible());
+  Press("ref");
+  EXPECT_TRUE(legend->isVisible());
+}
+
 TEST_F(ChtsFormTest, TheMenusOpenByTheirKeys) {
   Open();
   for (const auto& [key, name] : {std::pair{Qt::Key_F, "cmFile"},
                                   {Qt::Key_T, "cmTools"},
                                   {Qt::Key_P, "cmOptions"},
+                                  {Qt::Key_M, "cmMove"},
                                   {Qt::Key_O, "cmOscillators"}}) {
     Key(key, Qt::AltModifier);
     auto* menu = Find<QMenu>(form, name);
@@ -560,7 +778,7 @@ TEST_F(ChtsFormTest, AChartIsSavedAndShown) {
   EXPECT_EQ(suggested, "AAA.cht");
   EXPECT_EQ(dialogs.said.back().text, " CHART SAVED ");
   EXPECT_EQ(Saved("a.cht"), home.Get("drive_c/korawin/data/TCht.Tmp"));
-  Key(Qt::Key_PageDown);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_NE(Shown(), picture);
   show = save;
   Entry("cmSSavedCht")->trigger();
@@ -708,13 +926,13 @@ TEST_F(ChtsFormTest, WhileAMessageStandsNothingElseStarts) {
   form->Start();
   session->files.Remove("c:\\korawin\\data\\BBB.WDT");
   nosy.meanwhile = [this] {
-    for (int i = 0; i < 3; ++i) Key(Qt::Key_PageDown);
+    for (int i = 0; i < 3; ++i) Key(Qt::Key_PageDown, Qt::ControlModifier);
     Entry("cmRelStrength")->trigger();
     form->resize(700, 500);
     QCoreApplication::processEvents();
     form->close();
   };
-  Key(Qt::Key_PageDown);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_EQ(nosy.said.size(), 1u);
   ASSERT_TRUE(form) << "it outlives its message";
   EXPECT_TRUE(form->isVisible());
@@ -722,7 +940,7 @@ TEST_F(ChtsFormTest, WhileAMessageStandsNothingElseStarts) {
   nosy.meanwhile = nullptr;
   QCoreApplication::processEvents();
   EXPECT_EQ(nosy.said.size(), 1u) << "the size that came meanwhile does not tell it again";
-  Key(Qt::Key_PageDown);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_EQ(shown(), "CCC.WDT");
 }
 
@@ -730,7 +948,7 @@ TEST_F(ChtsFormTest, AChartThatFailedIsTriedAgainAtAnotherSize) {
   Open();
   const std::string prices = home.Get("drive_c/korawin/data/BBB.WDT");
   session->files.Remove("c:\\korawin\\data\\BBB.WDT");
-  Key(Qt::Key_PageDown);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
   ASSERT_EQ(dialogs.said.size(), 1u);
   form->resize(700, 520);
   QCoreApplication::processEvents();
@@ -747,19 +965,19 @@ TEST_F(ChtsFormTest, AChartThatFailedIsTriedAgainAtAnotherSize) {
 
 TEST_F(ChtsFormTest, ANameFileThatShrinksOrVanishesWhilePagingIsTold) {
   Open();
-  Key(Qt::Key_PageDown);
-  Key(Qt::Key_PageDown);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
   home.Put("drive_c/korawin/data/Names.dat",
            test::Bytes(std::vector<NameRec>{test::Security("BBB")}).substr(0, 95));
-  Key(Qt::Key_PageDown);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(dialogs.said[0].text, " There are no records in Names.Dat for this folder.");
   session->files.Remove("c:\\korawin\\data\\Names.dat");
-  Key(Qt::Key_PageUp);
+  Key(Qt::Key_PageUp, Qt::ControlModifier);
   EXPECT_EQ(dialogs.said.size(), 2u);
   home.Put("drive_c/korawin/data/Names.dat",
            test::Bytes(std::vector<NameRec>{test::Security("BBB")}));
-  Key(Qt::Key_PageDown);
+  Key(Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_EQ(shown(), "BBB.WDT");
   EXPECT_EQ(dialogs.said.size(), 2u);
 }

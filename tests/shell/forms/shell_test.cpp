@@ -445,27 +445,27 @@ TEST_F(ChtsTest, AChartThatRunsOutOfMemoryIsToldAndTheWindowGoesOn) {
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(dialogs.said[0].text, "Out of memory");
   EXPECT_EQ(dialogs.said[0].title, "Charts");
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_EQ(shown(), "BBB.WDT");
 }
 
-TEST_F(ChtsTest, PageDownAndPageUpStepThroughTheNameFile) {
+TEST_F(ChtsTest, ThePageKeysWithControlStepThroughTheNameFile) {
   Chts& charts = OpenCharts();
   EXPECT_TRUE(charts.isAncestorOf(QApplication::focusWidget()));
   const QImage first = Picture()->surface().image().copy();
   for (const char* expected : {"BBB.WDT", "CCC.WDT", "AAA.WDT"}) {
-    QTest::keyClick(Picture(), Qt::Key_PageDown);
+    QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
     EXPECT_EQ(shown(), expected);
   }
   EXPECT_EQ(Picture()->surface().image(), first);
-  QTest::keyClick(Picture(), Qt::Key_PageUp);
+  QTest::keyClick(Picture(), Qt::Key_PageUp, Qt::ControlModifier);
   EXPECT_EQ(shown(), "CCC.WDT");
   EXPECT_NE(Picture()->surface().image(), first);
 }
 
 TEST_F(ChtsTest, ANewSizeRecomposesTheSameChart) {
   Chts& charts = OpenCharts();
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   const auto before = charts.window().Chart.ChartRight;
   form->resize(form->width() - 150, form->height() - 90);
   ASSERT_TRUE(WaitFor([&] { return charts.window().Chart.ChartRight < before && Ink() > 1000; }));
@@ -479,6 +479,39 @@ TEST_F(ChtsTest, TheEntryBringsTheStandingWindowBack) {
   Entry("mnuChartDisplay")->trigger();
   EXPECT_EQ(form->charts(), charts);
   EXPECT_EQ(Find<QMdiArea>(form.get(), "MDI")->subWindowList().size(), 1);
+}
+
+TEST_F(ChtsTest, TheEntryRestoresAWindowThatIsMinimised) {
+  Chts& charts = OpenCharts();
+  charts.parentWidget()->showMinimized();
+  Entry("mnuChartDisplay")->trigger();
+  EXPECT_FALSE(charts.parentWidget()->isMinimized());
+  EXPECT_TRUE(charts.isAncestorOf(QApplication::focusWidget()));
+  EXPECT_GT(Ink(), 1000);
+}
+
+TEST_F(ChtsTest, EscapeInChartSelectionGoesBackToTheChart) {
+  Chts& charts = OpenCharts();
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
+  const QImage before = Picture()->surface().image().copy();
+  Entry("new")->trigger();
+  auto* selection = Find<QDialog>(form.get(), "ChtSel");
+  QTest::keyClick(selection, Qt::Key_PageDown);
+  EXPECT_EQ(shown(), "CCC.WDT");
+  QTest::keyClick(selection, Qt::Key_Escape);
+  EXPECT_FALSE(selection->isVisible());
+  EXPECT_EQ(form->charts(), &charts);
+  EXPECT_EQ(shown(), "BBB.WDT");
+  EXPECT_EQ(Picture()->surface().image(), before);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
+  EXPECT_EQ(shown(), "CCC.WDT") << "from the chart on show";
+}
+
+TEST_F(ChtsTest, EscapeInChartSelectionWithoutAChartLeavesTheCharts) {
+  Open();
+  Entry("mnuChartDisplay")->trigger();
+  QTest::keyClick(Find<QDialog>(form.get(), "ChtSel"), Qt::Key_Escape);
+  EXPECT_TRUE(WaitFor([&] { return form->charts() == nullptr; }));
 }
 
 TEST_F(ChtsTest, TheButtonsOfSeveralOscillatorsOpenTheViewAndReturnBringsTheChart) {
@@ -534,7 +567,7 @@ TEST_F(ChtsTest, ASecondChartThatIsNotChosenLeavesTheNextOneAlone) {
   EXPECT_EQ(charts.window().arrangement(), Arrangement::kUpper);
   Click(second, "Command2");
   EXPECT_EQ(charts.window().arrangement(), Arrangement::kOne);
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_EQ(shown(), "BBB.WDT");
   EXPECT_EQ(charts.window().arrangement(), Arrangement::kOne);
   EXPECT_TRUE(charts.window().Chart.ChartDrawn);
@@ -542,7 +575,7 @@ TEST_F(ChtsTest, ASecondChartThatIsNotChosenLeavesTheNextOneAlone) {
 
 TEST_F(ChtsTest, ClosingAndOpeningStartsAnew) {
   OpenCharts();
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   form->charts()->parentWidget()->close();
   ASSERT_TRUE(WaitFor([&] { return form->charts() == nullptr; }));
   Choose();
@@ -572,7 +605,7 @@ TEST_F(ChtsTest, WithoutSecuritiesOneMessageSaysSoAndWhatToDoNext) {
 TEST_F(ChtsTest, ANameFileThatGoesIsToldAndTheWindowStands) {
   Chts& charts = OpenCharts();
   session->files.Remove("c:\\korawin\\data\\Names.dat");
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_EQ(dialogs.said.size(), 1u);
   EXPECT_TRUE(charts.isVisible());
 }
@@ -624,7 +657,7 @@ TEST_F(ChtsTest, AChartOrASavedChartIsPrintedIntoAPdfOfItsNameOnThePageAsItWasKe
 TEST_F(ChtsTest, AChartThatFailedToDrawIsNotPrinted) {
   Chts& charts = OpenCharts();
   session->files.Remove("c:\\korawin\\data\\BBB.WDT");
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   ASSERT_EQ(dialogs.said.size(), 1u);
   Find<QAction>(&charts, "cmPrintChart")->trigger();
   EXPECT_EQ(dialogs.said.back().text, "There is no chart to print");
@@ -634,7 +667,7 @@ TEST_F(ChtsTest, AChartThatFailedToDrawIsNotPrinted) {
 TEST_F(ChtsTest, PricesThatCameInShowOnTheChart) {
   home.Put("drive_c/korawin/download/02NOV26.d", kDay);
   Chts& charts = OpenCharts();
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   ASSERT_EQ(shown(), "BBB.WDT");
   const auto bars = charts.window().Chart.Bars.BarCount;
   Entry("mnuModem")->trigger();
@@ -677,7 +710,7 @@ TEST_F(ChtsTest, AChartThatFailsIsNotToldAgainAtEverySize) {
     QCoreApplication::processEvents();
   }
   EXPECT_EQ(dialogs.said.size(), 1u);
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   EXPECT_EQ(shown(), "BBB.WDT");
   EXPECT_GT(Ink(), 1000);
 }
