@@ -1,14 +1,13 @@
 #include "maintenance/data_entry.h"
 
 #include <algorithm>
-#include <charconv>
-#include <cmath>
 
 #include "base/dates.h"
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "maintenance/failures.h"
+#include "maintenance/typed_number.h"
 #include "platform/dialogs.h"
 #include "store/name_file.h"
 
@@ -25,20 +24,10 @@ struct Refused {
   const char* title = kTitle;
 };
 
-std::optional<double> NumberOf(std::string_view text) {
-  text = Trim(text);
-  if (text.starts_with('+')) text.remove_prefix(1);
-  double value = 0;
-  const auto end = std::from_chars(text.data(), text.data() + text.size(), value);
-  if (end.ec != std::errc() || end.ptr != text.data() + text.size() || !std::isfinite(value))
-    return std::nullopt;
-  return value;
-}
-
 double ReadNumber(EntryBox box, std::string_view text) {
   if (Trim(text).empty()) return 0;
-  const auto value = NumberOf(text);
-  if (!value) throw Refused{box, "Data must be numeric"};
+  const auto value = TypedNumber(text);
+  if (!value) throw Refused{box, std::string(kMustBeNumeric)};
   return *value;
 }
 
@@ -47,7 +36,7 @@ float ReadPrice(EntryBox box, std::string_view text) {
   try {
     return CSng(value);
   } catch (const RunTimeError&) {
-    throw Refused{box, "The number is too large"};
+    throw Refused{box, std::string(kTooLarge)};
   }
 }
 
@@ -56,7 +45,7 @@ std::int32_t ReadVolume(std::string_view text) {
   try {
     return CLng(value);
   } catch (const RunTimeError&) {
-    throw Refused{EntryBox::kVolume, "The number is too large"};
+    throw Refused{EntryBox::kVolume, std::string(kTooLarge)};
   }
 }
 

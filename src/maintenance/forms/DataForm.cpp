@@ -1,0 +1,167 @@
+#include "maintenance/forms/DataForm.h"
+
+#include <QHeaderView>
+#include <QLabel>
+#include <QMenuBar>
+#include <QScreen>
+#include <QVBoxLayout>
+
+#include "maintenance/forms/VolMod.h"
+#include "platform/dialogs.h"
+#include "platform/progress.h"
+#include "platform/qt/form_parts.h"
+
+namespace kora {
+namespace {
+
+std::vector<GridColumn> Columns(std::int16_t RecType) {
+  std::vector<GridColumn> columns(kDataColumns);
+  for (int i = 0; i < kDataColumns; ++i) {
+    columns[size_t(i)].heading = DataHeading(DataColumn(i), RecType);
+    columns[size_t(i)].chars = 12;
+    columns[size_t(i)].right = i != kDataDate && i != kDataAdjDesc;
+  }
+  columns[kDataRec].chars = 9;
+  columns[kDataVolume].chars = 14;
+  columns[kDataAdjDesc].chars = 17;
+  return columns;
+}
+
+}  // namespace
+
+DataForm::DataForm(DataFormServices services, DataFormFile file, QWidget* parent)
+    : QDialog(parent),
+      services_(std::move(services)),
+      file_(std::move(file)),
+      rows_(services_.files, file_.path) {
+  setObjectName("DataForm");
+  setWindowFlag(Qt::WindowMaximizeButtonHint);
+  ss1_ = new Grid(rows_,
+                  {.dialogs = services_.dialogs,
+                   .files = services_.files,
+                   .widths = &services_.user,
+                   .section = std::string(kUserSection),
+                   .key = "Data_Form"},
+                  Columns(file_.RecType), "SS1", this);
+  ss1_->setAccessibleName("Price data");
+  ss1_->verticalHeader()->hide();  // "Rec" counts the rows
+  ss1_->SetZoom(services_.settings.Zoom);
+  ss1_->SetDeletable(true);
+  ss1_->changed = [this] { ShowCount(); };
+  status_ = new QLabel(this);
+  status_->setObjectName("StatusBar1");
+  status_->setContentsMargins(6, 0, 6, 4);
+  auto* rows = new QVBoxLayout(this);
+  rows->setContentsMargins(0, 0, 0, 0);
+  rows->addWidget(ss1_);
+  rows->addWidget(status_);
+  AddMenu();
+  ShowCount();
+  const QFontMetrics metrics = fontMetrics();
+  resize(QSize(metrics.averageCharWidth() * 135, metrics.height() * 36)
+             .boundedTo(screen()->availableSize() * 0.9));
+}
+
+// A cell that is open asks the rows once more as it goes.
+DataForm::~DataForm() { delete ss1_; }
+
+void DataForm::AddMenu() {
+  auto* bar = new QMenuBar(this);
+  layout()->setMenuBar(bar);
+  const auto entry = [this](auto* over, const char* name, const char* caption, auto work) {
+    QAction* action = over->addAction(caption, this, work);
+    action->setObjectName(name);
+    return action;
+  };
+  QMenu* file = bar->addMenu("&File");
+  entry(file, "nmSave", "&Save ", [this] { Save(); })->setShortcut(QKeySequence::Save);
+  entry(file, "nmPage", "Pa&ge Setup", [this] {
+    services_.pageSetup(this);
+  })->setEnabled(bool(services_.pageSetup));
+  entry(file, "nmPrint", "&Print", [this] { Print(); })->setEnabled(bool(services_.print));
+  file->addSeparator();
+  entry(file, "nmClose", "&Close", [this] { reject(); });
+
+  QMenu* edit = bar->addMenu("&Edit");
+  entry(edit, "nmDelete", "&Delete Rows", [this] { ss1_->DeleteSelected(); });
+  entry(edit, "nmSort", "S&ort List", [this] { Sort(); });
+  entry(edit, "nmAdjVol", "&Adjust Data", [this] { AdjustData(); });
+
+  entry(bar, "dmDisp", "&Display", [this] {
+    ss1_->SetZoom(services_.changeSize(this));
+  })->setEnabled(bool(services_.changeSize));
+}
+
+bool DataForm::Fill() {
+  services_.dialogs.SetBusy(true);
+  bool shown = false;
+  {
+    const auto progress = services_.dialogs.StartProgress(kDataFileTitle);
+    shown = rows_.ShowData(file_.code, *progress, services_.dialogs);
+  }
+  services_.dialogs.SetBusy(false);
+  ss1_->Refresh();
+  if (shown) ss1_->GoTo(rows_.RowCount() - 1, kDataDate);
+  ShowCount();
+  return shown;
+}
+
+void DataForm::ShowCount() {
+  setWindowTitle(QString("%1   -   %2%3")
+                     .arg(ToQt(file_.code), ToQt(file_.name), rows_.changed() ? " *" : ""));
+  status_->setText(QString("%1   -   %2 records").arg(ToQt(file_.path)).arg(rows_.RowCount()));
+}
+
+bool DataForm::Save() {
+  if (!ss1_->EndEdit()) return false;
+  services_.dialogs.SetBusy(true);
+  bool saved = false;
+  {
+    const auto progress = services_.dialogs.StartProgress("SAVE DATA FILE ");
+    progress->Show(ProgressLine::kItem, "SAVING - WAIT");
+    saved = rows_.SaveData(*progress, services_.dialogs);
+  }
+  services_.dialogs.SetBusy(false);
+  ShowCount();
+  if (saved && services_.saved) services_.saved();
+  return saved;
+}
+
+void DataForm::Sort() {
+  if (!ss1_->EndEdit()) return;
+  status_->setText("NOW SORTING DATA FILE  -  WAIT");
+  status_->repaint();
+  services_.dialogs.SetBusy(true);
+  rows_.SortByDate();
+  services_.dialogs.SetBusy(false);
+  ss1_->Refresh();
+  ShowCount();
+}
+
+void DataForm::AdjustData() {
+  if (!ss1_->EndEdit()) return;
+  auto* form = new VolMod(rows_, ss1_->SelectedRows(), services_.dialogs, this);
+  connect(form, &QDialog::accepted, this, [this] {
+    ss1_->Refresh();
+    ShowCount();
+  });
+  RunForm(form);
+}
+
+void DataForm::Print() {
+  if (!ss1_->EndEdit()) return;
+  services_.print(ss1_->ToPrint(file_.code + "   " + file_.name), this);
+}
+
+void DataForm::reject() {
+  if (!ss1_->EndEdit()) return;
+  if (rows_.changed()) {
+    const Answer answer =
+        services_.dialogs.Ask("Data File has changed\nSAVE " + file_.path + "?", kDataFileTitle,
+                              Buttons::kYesNoCancel);
+    if (answer == Answer::kCancel || (answer == Answer::kYes && !Save())) return;
+  }
+  QDialog::reject();
+}
+
+}  // namespace kora
