@@ -51,7 +51,7 @@ bool IssueAdjustment::CheckDate(const std::string& code, const IssueFigures& fig
   }
   const auto wanted = AdjWantedDateOf(typed);
   if (!wanted) {
-    Refuse(kDateFormat, kDateTitle);
+    Refuse(kDateFormat, kDateFormatTitle);
     return false;
   }
   return Told(services_.dialogs, kAdjustTitle, [&] {

@@ -15,7 +15,7 @@
 namespace kora {
 
 inline constexpr std::string_view kAdjustTitle = "Adjust Data";
-inline constexpr std::string_view kDateTitle = "Incorrect Date Format ";
+inline constexpr std::string_view kDateFormatTitle = "Incorrect Date Format ";
 inline constexpr std::string_view kAdjustedTitle = "Data Adjustments";
 inline constexpr std::string_view kRemoveTitle = "Remove Adjustments";
 

@@ -50,7 +50,7 @@ void SaveSnapshot(const Files& files, const std::string& systemPath, int list,
                   const std::vector<SnapshotRow>& rows);
 
 // The message for a typed number that is none, and for a row beyond the 15th.
-inline constexpr std::string_view kMustBeNumeric = "Must be numeric";
+inline constexpr std::string_view kSnapMustBeNumeric = "Must be numeric";
 inline constexpr std::string_view kTooManyRows = "Maximum number of stocks for snapshot is 15";
 
 struct SnapshotServices {

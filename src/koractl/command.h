@@ -60,6 +60,8 @@ void AddBackup(CLI::App& app, CommandLine& line);
 void AddRestore(CLI::App& app, CommandLine& line);
 void AddExport(CLI::App& app, CommandLine& line);
 void AddRemoveDate(CLI::App& app, CommandLine& line);
+void AddEdit(CLI::App& app, CommandLine& line);
+void AddList(CLI::App& app, CommandLine& line);
 void AddEnter(CLI::App& app, CommandLine& line);
 void AddCompany(CLI::App& app, CommandLine& line);
 void AddSnapshot(CLI::App& app, CommandLine& line);

@@ -69,6 +69,8 @@ int RunKoractl(int argc, const char* const* argv, Io& io) {
            AddScan2,
            AddScan3,
            AddStats,
+           AddList,
+           AddEdit,
            AddEnter,
            AddCheck,
            AddChangeCode,

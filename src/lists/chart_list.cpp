@@ -4,6 +4,7 @@
 #include <limits>
 #include <unordered_map>
 
+#include "base/file_set.h"
 #include "base/numbers.h"
 #include "base/record_file.h"
 #include "base/runtime_error.h"
@@ -201,6 +202,22 @@ std::string_view CopyItems(const ListSide& from, ListSide& to, std::span<const s
   for (const size_t place : InOrder(places, from.Codes.size()))
     if (AddCode(to.Codes, from.Codes[place])) to.Changed = true;
   return {};
+}
+
+ListCodes SaveSides(const Files& files, const std::string& dataPath,
+                    std::span<const ListSide> sides) {
+  const auto held = files.lock().Hold();
+  const NameIndex index(files, dataPath);
+  ListCodes dropped;
+  FileSet set(files);
+  for (const ListSide& side : sides) {
+    if (!side.Changed) continue;
+    const std::vector<ListRec> records = index.Refreshed(side.Codes, dropped);
+    CInt(double(records.size()));
+    set.Add(ListFilePath(dataPath, side.ChartListNo), std::string(BytesOf(records)));
+  }
+  set.Commit();
+  return dropped;
 }
 
 std::string_view MoveItems(ListSide& from, ListSide& to, std::span<const size_t> places) {

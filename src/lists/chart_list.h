@@ -127,5 +127,9 @@ std::string_view CheckSides(const ListSide& a, const ListSide& b);
 std::string_view CopyItems(const ListSide& from, ListSide& to, std::span<const size_t> places);
 // The same, and takes the items out of `from`, those too that the other had already.
 std::string_view MoveItems(ListSide& from, ListSide& to, std::span<const size_t> places);
+// Saves the sides that have changed as SaveSubList does: all of them or, on an error, none, so that
+// what was moved is in one of the two at any time. Returns the codes that were dropped.
+ListCodes SaveSides(const Files& files, const std::string& dataPath,
+                    std::span<const ListSide> sides);
 
 }  // namespace kora

@@ -40,7 +40,7 @@ class CodeSelection {
   const std::string& CurrentCode() const { return code_; }  // trimmed, ANSI
   // The price file of what is chosen, empty for nothing or a code that can name no file.
   const std::string& CurrentDataFile() const { return file_; }
-  const std::string& Name() const { return name_; }     // of the security
+  const std::string& Name() const { return name_; }    // of the security
   const std::string& Label() const { return label_; }  // its code + ".WDT"
   std::int16_t RecType() const { return recType_; }
 

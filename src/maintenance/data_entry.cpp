@@ -27,7 +27,7 @@ struct Refused {
 double ReadNumber(EntryBox box, std::string_view text) {
   if (Trim(text).empty()) return 0;
   const auto value = TypedNumber(text);
-  if (!value) throw Refused{box, std::string(kMustBeNumeric)};
+  if (!value) throw Refused{box, std::string(kDataMustBeNumeric)};
   return *value;
 }
 
@@ -36,7 +36,7 @@ float ReadPrice(EntryBox box, std::string_view text) {
   try {
     return CSng(value);
   } catch (const RunTimeError&) {
-    throw Refused{box, std::string(kTooLarge)};
+    throw Refused{box, std::string(kNumberTooLarge)};
   }
 }
 
@@ -45,7 +45,7 @@ std::int32_t ReadVolume(std::string_view text) {
   try {
     return CLng(value);
   } catch (const RunTimeError&) {
-    throw Refused{EntryBox::kVolume, std::string(kTooLarge)};
+    throw Refused{EntryBox::kVolume, std::string(kNumberTooLarge)};
   }
 }
 

@@ -58,8 +58,7 @@ void ScaleRecord(PriceRec& rec, const ScaleItems& items, ScaleBy by) {
     const std::string text = Format(Scaled(Val(Str(price)), by), "####.0###");
     PutPrice(rec, column, CSng(Val(text)));
   }
-  if (items[kVolumeItem] && rec.Volume != 0)
-    rec.Volume = CLng(Fix(Scaled(double(rec.Volume), by)));
+  if (items[kVolumeItem] && rec.Volume != 0) rec.Volume = CLng(Fix(Scaled(double(rec.Volume), by)));
 }
 
 // False when the file can't be kept and the save is off; a set whose staging failed is empty again.
@@ -195,9 +194,10 @@ std::optional<Refusal> DataRows::Scale(RowBlock rows, const ScaleItems& items, S
     try {
       ScaleRecord(block[i], items, by);
     } catch (const RunTimeError& e) {
-      return Refusal{"Record " + Str(std::int32_t(rows.first) + std::int32_t(i) + 1) + ": " +
-                         std::string(e.number() == kOverflow ? kTooLarge : kMustBeNumeric),
-                     std::string(kScaleTitle)};
+      return Refusal{
+          "Record " + Str(std::int32_t(rows.first) + std::int32_t(i) + 1) + ": " +
+              std::string(e.number() == kOverflow ? kNumberTooLarge : kDataMustBeNumeric),
+          std::string(kScaleTitle)};
     }
   }
   std::copy(block.begin(), block.end(), records_.begin() + rows.first);
@@ -239,14 +239,14 @@ std::optional<Refusal> DataRows::SetText(int row, int column, const std::string&
     }
     default: {
       const auto number = TypedNumber(text);
-      if (!number) return Refused(kMustBeNumeric);
+      if (!number) return Refused(kDataMustBeNumeric);
       try {
         if (column == kDataVolume)
           rec.Volume = CLng(*number);
         else
           PutPrice(rec, column, CSng(*number));
       } catch (const RunTimeError&) {
-        return Refused(kTooLarge);
+        return Refused(kNumberTooLarge);
       }
     }
   }

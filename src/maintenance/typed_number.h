@@ -10,8 +10,8 @@
 
 namespace kora {
 
-inline constexpr std::string_view kMustBeNumeric = "Data must be numeric";
-inline constexpr std::string_view kTooLarge = "The number is too large";
+inline constexpr std::string_view kDataMustBeNumeric = "Data must be numeric";
+inline constexpr std::string_view kNumberTooLarge = "The number is too large";
 
 // A typed text as a number; nothing where it is empty or anything else. One beyond the range of
 // numbers is infinite, which no field takes.

@@ -57,6 +57,44 @@ std::vector<size_t> At(std::initializer_list<size_t> places) { return places; }
 
 }  // namespace
 
+TEST(ChartListTest, WhatIsMovedIsSavedInBothListsOrInNone) {
+  FailingIo io;
+  ListFixture f(io);
+  f.Names({"AAA", "BHP", "WOW"});
+  const std::string a = Record(1, "AAA") + Record(2, "BHP"), b = Record(3, "WOW");
+  for (int at = 1;; ++at) {
+    SCOPED_TRACE(at);
+    f.Put("SubListA.Dat", a);
+    f.Put("SubListB.Dat", b);
+    std::vector<ListSide> sides{{2, {"AAA", "BHP"}}, {3, {"WOW"}}};
+    ASSERT_EQ(MoveItems(sides[0], sides[1], At({1})), "");
+    io.Reset(at);
+    const int error = ErrorOf([&] { SaveSides(f.home.files(), f.dataPath, sides); });
+    const bool met = io.calls >= at;
+    io.Reset();
+    if (!met) {
+      EXPECT_EQ(f.Get("SubListA.Dat"), Record(1, "AAA"));
+      EXPECT_EQ(f.Get("SubListB.Dat"), b + Record(2, "BHP"));
+      EXPECT_GT(at, 4);
+      break;
+    }
+    EXPECT_EQ(error, kDiskFull);
+    EXPECT_EQ(f.Get("SubListA.Dat"), a);
+    EXPECT_EQ(f.Get("SubListB.Dat"), b);
+  }
+}
+
+TEST(ChartListTest, ASideThatHasNotChangedIsNotSaved) {
+  ListFixture f;
+  f.Names({"AAA"});
+  f.Put("SubListA.Dat", Record(9, "AAA"));
+  EXPECT_TRUE(SaveSides(f.home.files(), f.dataPath,
+                        std::vector<ListSide>{{2, {"AAA"}, false}, {3, {}, false}})
+                  .empty());
+  EXPECT_EQ(f.Get("SubListA.Dat"), Record(9, "AAA"));
+  EXPECT_FALSE(f.home.Exists(std::string(kData) + "SubListB.Dat"));
+}
+
 TEST(ChartListTest, ElevenFilesByNumber) {
   const char* names[] = {"SubListA.Dat", "SubListB.Dat", "SubListC.Dat", "SubListD.Dat",
                          "SubListE.Dat", "SubListF.Dat", "SubListG.Dat", "SubListH.Dat",

@@ -169,7 +169,7 @@ TEST_F(DataRowsTest, ANoteIsCutToFourteenBytes) {
   Prices("ORE", ThreeDays());
   Show();
   EXPECT_EQ(Put(0, kDataAdjDesc, "Bonus 1:10 at 2.50"), "");
-  EXPECT_EQ(rows->Text(0, kDataAdjDesc), "Bonus 1:10 at ");
+  EXPECT_EQ(rows->records()[0].AdjDesc.raw(), "Bonus 1:10 at ");
   EXPECT_EQ(Put(0, kDataAdjDesc, "caf\u00e9"), "");
   EXPECT_EQ(rows->records()[0].AdjDesc.trimmed(), "caf\xE9");
 }
@@ -249,10 +249,10 @@ TEST_F(DataRowsTest, WhatNobodyEditedIsSavedByteForByte) {
   Put(1, kDataClose, "2");
   EXPECT_TRUE(rows->SaveData(progress, dialogs));
   EXPECT_EQ(home.Get(kHostData + "ORE.WDT"), Bytes(std::vector{odd, [] {
-                                                                PriceRec rec = Flat("19980914", 1);
-                                                                rec.Close = 2;
-                                                                return rec;
-                                                              }()}));
+                                                                 PriceRec rec = Flat("19980914", 1);
+                                                                 rec.Close = 2;
+                                                                 return rec;
+                                                               }()}));
 }
 
 TEST_F(DataRowsTest, ATornRecordAtTheEndIsGoneAfterTheSave) {

@@ -122,6 +122,22 @@ TEST(StructureTest, QtStaysInItsRoomsAndNothingLooksUp) {
   for (const Include& include : includes) EXPECT_EQ(Fault(include), "");
 }
 
+// One program holds them all: of two with one name either may be taken for the other.
+TEST(StructureTest, NoTwoHeadersGiveOneNameToTheirConstants) {
+  const std::regex constant(R"(inline constexpr [^;=]*?\b(k[A-Z]\w*)\s*[\[{=;])");
+  std::map<std::string, std::string> seen;
+  for (const auto& entry : fs::recursive_directory_iterator(kRoot / "src")) {
+    if (entry.path().extension() != ".h") continue;
+    const std::string text = ReadText(entry.path());
+    for (std::sregex_iterator it(text.begin(), text.end(), constant), end; it != end; ++it) {
+      const auto [first, fresh] = seen.emplace((*it)[1], entry.path().filename().string());
+      EXPECT_TRUE(fresh) << (*it)[1] << " of " << first->second << " and "
+                         << entry.path().filename().string();
+    }
+  }
+  EXPECT_GT(seen.size(), 50u);
+}
+
 TEST(StructureTest, RulesCatchWhatTheyForbid) {
   EXPECT_NE(Fault({"base/x.cpp", "QString"}), "");
   EXPECT_NE(Fault({"chart/x.cpp", "QtWidgets/QWidget"}), "");

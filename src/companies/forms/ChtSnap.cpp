@@ -22,7 +22,7 @@ constexpr std::string_view kMoney = "0.00";
 std::optional<Refusal> TakeNumber(std::string& field, const std::string& text) {
   const std::string_view number = Trim(text);
   if (!number.empty() && (!ParseFloat(number) || *ParseFloat(number) < 0))
-    return Refusal{std::string(kMustBeNumeric), std::string(kSnapshotTitle)};
+    return Refusal{std::string(kSnapMustBeNumeric), std::string(kSnapshotTitle)};
   field = number;
   return std::nullopt;
 }

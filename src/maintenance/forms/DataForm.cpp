@@ -156,9 +156,8 @@ void DataForm::Print() {
 void DataForm::reject() {
   if (!ss1_->EndEdit()) return;
   if (rows_.changed()) {
-    const Answer answer =
-        services_.dialogs.Ask("Data File has changed\nSAVE " + file_.path + "?", kDataFileTitle,
-                              Buttons::kYesNoCancel);
+    const Answer answer = services_.dialogs.Ask("Data File has changed\nSAVE " + file_.path + "?",
+                                                kDataFileTitle, Buttons::kYesNoCancel);
     if (answer == Answer::kCancel || (answer == Answer::kYes && !Save())) return;
   }
   QDialog::reject();

@@ -7,6 +7,7 @@
 #include "lists/text_print_out.h"
 #include "maintenance/data_rows.h"
 #include "settings/settings.h"
+#include "store/name_rec.h"
 
 class QLabel;
 

@@ -19,8 +19,9 @@ EnterCode::EnterCode(EnterCodeServices services, QWidget* parent)
   setObjectName("EnterCode");
   setWindowTitle("Code Selection");
   list1_ = new CodeList("List1", this);
+  list1_->setAccessibleName("Codes");
   list1_->setSelectionMode(QAbstractItemView::SingleSelection);
-  list1_->setMinimumWidth(fontMetrics().averageCharWidth() * 44);
+  list1_->setMinimumWidth(fontMetrics().averageCharWidth() * 54);
   list1_->setMinimumHeight(fontMetrics().height() * 20);
   getCode_ = NewField(this, "GetCode", 10, 6);
   getCode_->installEventFilter(this);

@@ -59,6 +59,12 @@ Main::Main(Session& session, std::string commandLine)
                .pageSetup = [this](QWidget*) { desk_.OpenTextPage(); },
                .changeSize = [this](QWidget* over) { return AskTableSize(over); },
                .adjusted = [this] { desk_.PricesChanged(); }}),
+      data_(session, this,
+            {.printTable = [this](const TextTable& table,
+                                  QWidget* over) { desk_.PrintList(table, over); },
+             .pageSetup = [this](QWidget*) { desk_.OpenTextPage(); },
+             .changeSize = [this](QWidget* over) { return AskTableSize(over); },
+             .pricesChanged = [this] { desk_.PricesChanged(); }}),
       names_(session, this,
              {.printTable = [this](const TextTable& table,
                                    QWidget* over) { desk_.PrintList(table, over); },
@@ -126,6 +132,7 @@ void Main::SetOpeners() {
   SetOpener("mnuLists", [this] { desk_.OpenLists(); });
   SetOpener("mnuListsUte", [this] { desk_.OpenListUtilities(); });
   SetOpener("mnuRenameCL", [this] { desk_.OpenListNames(); });
+  SetOpener("mnuViewData", [this] { data_.OpenData(); });
   SetOpener("mnuViewNames", [this] { names_.OpenNames(); });
   SetOpener("nmIndCl", [this] { names_.OpenClasses(); });
   SetOpener("mnuPaths", [this] { OpenPaths(); });

@@ -10,6 +10,7 @@
 #include "shell/forms/adjust_desk.h"
 #include "shell/forms/chart_desk.h"
 #include "shell/forms/company_desk.h"
+#include "shell/forms/data_desk.h"
 #include "shell/forms/name_desk.h"
 #include "shell/forms/scan_desk.h"
 #include "shell/forms/update_desk.h"
@@ -75,6 +76,7 @@ class Main : public QMainWindow {
   UpdateDesk updates_;
   ChartDesk desk_;
   AdjustDesk adjust_;
+  DataDesk data_;
   NameDesk names_;
   CompanyDesk companies_;
   ScanDesk scans_;

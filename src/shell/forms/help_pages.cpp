@@ -43,6 +43,9 @@ QString HelpPageOf(const QString& form) {
       {"INUpList", "update.html"},
       {"ModDetails", "update.html"},
       {"WMPath", "update.html"},
+      {"EnterCode", "data.html"},
+      {"DataForm", "data.html"},
+      {"VolMod", "data.html"},
   };
   return pages.value(form, "index.html");
 }

@@ -97,9 +97,9 @@ class EveryForm : public test::FormTest {
   std::unique_ptr<Main> main;
 };
 
-constexpr const char* kOfTheMenu[] = {"mnuChartDefaults", "mnFnts",      "mnTPSU",      "mnPrSU",
-                                      "mnuLists",         "mnuListsUte", "mnuRenameCL", "mnuPaths",
-                                      "mnuDDetails",      "mnuAboutKora"};
+constexpr const char* kOfTheMenu[] = {
+    "mnuViewData", "mnuChartDefaults", "mnFnts",   "mnTPSU",      "mnPrSU",      "mnuLists",
+    "mnuListsUte", "mnuRenameCL",      "mnuPaths", "mnuDDetails", "mnuAboutKora"};
 constexpr const char* kOfTheChart[] = {"cmChtDef",   "cmColours",   "cmfonts",     "cmBSpaces",
                                        "cmGLSpaces", "cmLineWidth", "cmVHeight",   "cmMMASet",
                                        "cmSLInd",    "cmChtSpaces", "cmPageSetup", "cmPrintChart"};

@@ -1,0 +1,56 @@
+#include "shell/forms/data_desk.h"
+
+#include "base/text.h"
+#include "maintenance/forms/DataForm.h"
+#include "maintenance/forms/EnterCode.h"
+
+namespace kora {
+
+void DataDesk::OpenData() {
+  if (codes_) {
+    codes_->activateWindow();
+    return;
+  }
+  auto* form = new EnterCode(
+      {.files = session_.files,
+       .dataPath = session_.settings.paths.CurrentDataPath,
+       .dialogs = session_.dialogs,
+       .lastIndex = lastIndex_,
+       .view = [this](const CodeSelection& selection, QWidget* over) { View(selection, over); }},
+      over_);
+  form->setAttribute(Qt::WA_DeleteOnClose);
+  codes_ = form;
+  try {
+    form->Fill();
+  } catch (...) {
+    delete form;
+    throw;
+  }
+  form->open();
+  form->move(over_->mapToGlobal(QPoint(0, 0)));
+}
+
+void DataDesk::View(const CodeSelection& selection, QWidget* over) {
+  over_->raise();
+  auto* form = new DataForm({.files = session_.files,
+                             .settings = session_.settings,
+                             .user = session_.user,
+                             .dialogs = session_.dialogs,
+                             .print = hooks_.printTable,
+                             .pageSetup = hooks_.pageSetup,
+                             .changeSize = hooks_.changeSize,
+                             .saved = hooks_.pricesChanged},
+                            {.code = FromAnsi(selection.CurrentCode()),
+                             .name = selection.Name(),
+                             .path = selection.CurrentDataFile(),
+                             .RecType = selection.RecType()},
+                            over);
+  if (!form->Fill()) {
+    delete form;
+    return;
+  }
+  form->setAttribute(Qt::WA_DeleteOnClose);
+  form->open();
+}
+
+}  // namespace kora
