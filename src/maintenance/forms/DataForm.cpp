@@ -1,14 +1,12 @@
 #include "maintenance/forms/DataForm.h"
 
 #include <QHeaderView>
-#include <QLabel>
 #include <QMenuBar>
 #include <QScreen>
 #include <QVBoxLayout>
 
 #include "maintenance/forms/VolMod.h"
 #include "platform/dialogs.h"
-#include "platform/progress.h"
 #include "platform/qt/form_parts.h"
 
 namespace kora {
@@ -48,14 +46,14 @@ DataForm::DataForm(DataFormServices services, DataFormFile file, QWidget* parent
   ss1_->SetZoom(services_.settings.Zoom);
   ss1_->SetDeletable(true);
   ss1_->changed = [this] { ShowCount(); };
-  status_ = new QLabel(this);
-  status_->setObjectName("StatusBar1");
-  status_->setContentsMargins(6, 0, 6, 4);
+  panel_ = new WorkPanel(this);
+  panel_->layout()->setContentsMargins(6, 0, 6, 4);
   auto* rows = new QVBoxLayout(this);
   rows->setContentsMargins(0, 0, 0, 0);
   rows->addWidget(ss1_);
-  rows->addWidget(status_);
+  rows->addWidget(panel_);
   AddMenu();
+  panel_->Hold({ss1_, bar_});
   ShowCount();
   const QFontMetrics metrics = fontMetrics();
   resize(QSize(metrics.averageCharWidth() * 135, metrics.height() * 36)
@@ -66,14 +64,14 @@ DataForm::DataForm(DataFormServices services, DataFormFile file, QWidget* parent
 DataForm::~DataForm() { delete ss1_; }
 
 void DataForm::AddMenu() {
-  auto* bar = new QMenuBar(this);
-  layout()->setMenuBar(bar);
+  bar_ = new QMenuBar(this);
+  layout()->setMenuBar(bar_);
   const auto entry = [this](auto* over, const char* name, const char* caption, auto work) {
     QAction* action = over->addAction(caption, this, work);
     action->setObjectName(name);
     return action;
   };
-  QMenu* file = bar->addMenu("&File");
+  QMenu* file = bar_->addMenu("&File");
   entry(file, "nmSave", "&Save ", [this] { Save(); })->setShortcut(QKeySequence::Save);
   entry(file, "nmPage", "Pa&ge Setup", [this] {
     services_.pageSetup(this);
@@ -82,24 +80,28 @@ void DataForm::AddMenu() {
   file->addSeparator();
   entry(file, "nmClose", "&Close", [this] { reject(); });
 
-  QMenu* edit = bar->addMenu("&Edit");
+  QMenu* edit = bar_->addMenu("&Edit");
   entry(edit, "nmDelete", "&Delete Rows", [this] { ss1_->DeleteSelected(); });
   entry(edit, "nmSort", "S&ort List", [this] { Sort(); });
   entry(edit, "nmAdjVol", "&Adjust Data", [this] { AdjustData(); });
 
-  entry(bar, "dmDisp", "&Display", [this] {
+  entry(bar_, "dmDisp", "&Display", [this] {
     ss1_->SetZoom(services_.changeSize(this));
   })->setEnabled(bool(services_.changeSize));
 }
 
-bool DataForm::Fill() {
+bool DataForm::Work(const QString& text, const std::function<bool(Progress&)>& work) {
+  bool done = false;
   services_.dialogs.SetBusy(true);
-  bool shown = false;
-  {
-    const auto progress = services_.dialogs.StartProgress(kDataFileTitle);
-    shown = rows_.ShowData(file_.code, *progress, services_.dialogs);
-  }
+  panel_->Run(text, [&](Progress& progress) { done = work(progress); });
   services_.dialogs.SetBusy(false);
+  return done;
+}
+
+bool DataForm::Fill() {
+  const bool shown = Work({}, [this](Progress& progress) {
+    return rows_.ShowData(file_.code, progress, services_.dialogs);
+  });
   ss1_->Refresh();
   if (shown) ss1_->GoTo(rows_.RowCount() - 1, kDataDate);
   ShowCount();
@@ -109,19 +111,14 @@ bool DataForm::Fill() {
 void DataForm::ShowCount() {
   setWindowTitle(QString("%1   -   %2%3")
                      .arg(ToQt(file_.code), ToQt(file_.name), rows_.changed() ? " *" : ""));
-  status_->setText(QString("%1   -   %2 records").arg(ToQt(file_.path)).arg(rows_.RowCount()));
+  panel_->Show(QString("%1   -   %2 records").arg(ToQt(file_.path)).arg(rows_.RowCount()));
 }
 
 bool DataForm::Save() {
   if (!ss1_->EndEdit()) return false;
-  services_.dialogs.SetBusy(true);
-  bool saved = false;
-  {
-    const auto progress = services_.dialogs.StartProgress("SAVE DATA FILE ");
-    progress->Show(ProgressLine::kItem, "SAVING - WAIT");
-    saved = rows_.SaveData(*progress, services_.dialogs);
-  }
-  services_.dialogs.SetBusy(false);
+  const bool saved = Work("SAVE DATA FILE   SAVING - WAIT", [this](Progress& progress) {
+    return rows_.SaveData(progress, services_.dialogs);
+  });
   ShowCount();
   if (saved && services_.saved) services_.saved();
   return saved;
@@ -129,11 +126,11 @@ bool DataForm::Save() {
 
 void DataForm::Sort() {
   if (!ss1_->EndEdit()) return;
-  status_->setText("NOW SORTING DATA FILE  -  WAIT");
-  status_->repaint();
-  services_.dialogs.SetBusy(true);
-  rows_.SortByDate();
-  services_.dialogs.SetBusy(false);
+  Work("NOW SORTING DATA FILE  -  WAIT", [this](Progress& progress) {
+    progress.Step(0, 1);  // shows the text
+    rows_.SortByDate();
+    return true;
+  });
   ss1_->Refresh();
   ShowCount();
 }
@@ -154,7 +151,7 @@ void DataForm::Print() {
 }
 
 void DataForm::reject() {
-  if (!ss1_->EndEdit()) return;
+  if (panel_->StopFirst() || !ss1_->EndEdit()) return;
   if (rows_.changed()) {
     const Answer answer = services_.dialogs.Ask("Data File has changed\nSAVE " + file_.path + "?",
                                                 kDataFileTitle, Buttons::kYesNoCancel);

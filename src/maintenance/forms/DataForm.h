@@ -4,12 +4,13 @@
 #include <functional>
 
 #include "lists/forms/grid.h"
+#include "lists/forms/work_panel.h"
 #include "lists/text_print_out.h"
 #include "maintenance/data_rows.h"
 #include "settings/settings.h"
 #include "store/name_rec.h"
 
-class QLabel;
+class QMenuBar;
 
 namespace kora {
 
@@ -40,7 +41,7 @@ class DataForm : public QDialog {
 
   // Reads the file; the last record is in hand. False, and told, when there is nothing to show.
   bool Fill();
-  // Changes are saved or given up first, as the user answers.
+  // Changes are saved or given up first, as the user answers. What goes on is stopped instead.
   void reject() override;
 
  private:
@@ -50,12 +51,15 @@ class DataForm : public QDialog {
   void AdjustData();
   void Print();
   void ShowCount();
+  // Does the work with the bar on show. What it returns; false while other work goes on.
+  bool Work(const QString& text, const std::function<bool(Progress&)>& work);
 
   DataFormServices services_;
   DataFormFile file_;
   DataRows rows_;
   Grid* ss1_;
-  QLabel* status_;
+  WorkPanel* panel_;
+  QMenuBar* bar_;
 };
 
 }  // namespace kora

@@ -31,6 +31,7 @@ void DataDesk::OpenData() {
 }
 
 void DataDesk::View(const CodeSelection& selection, QWidget* over) {
+  if (data_) return;  // another is being read
   over_->raise();
   auto* form = new DataForm({.files = session_.files,
                              .settings = session_.settings,
@@ -45,7 +46,10 @@ void DataDesk::View(const CodeSelection& selection, QWidget* over) {
                              .path = selection.CurrentDataFile(),
                              .RecType = selection.RecType()},
                             over);
-  if (!form->Fill()) {
+  data_ = form;
+  const bool shown = form->Fill();
+  if (!data_) return;
+  if (!shown) {
     delete form;
     return;
   }

@@ -38,7 +38,7 @@ class DataDesk {
   QWidget* over_;
   DataDeskHooks hooks_;
   int lastIndex_ = 0;  // of the list of codes
-  QPointer<QDialog> codes_;
+  QPointer<QDialog> codes_, data_;
 };
 
 }  // namespace kora

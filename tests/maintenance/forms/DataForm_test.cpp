@@ -102,7 +102,7 @@ TEST_F(DataFormTest, ShowsTheFileWithItsLastRecordInHand) {
   EXPECT_EQ(Column(kDataRec) + Column(kDataDate) + Column(kDataClose),
             "1 2 3 19980911 19980914 19980915 1.5 2.5 3.5 ");
   EXPECT_EQ(grid->currentIndex().row(), 2);
-  EXPECT_EQ(On<QLabel>("StatusBar1")->text(), QString(kPath) + "   -   3 records");
+  EXPECT_EQ(On<QLabel>("WorkText")->text(), QString(kPath) + "   -   3 records");
 }
 
 TEST_F(DataFormTest, AnAdvanceDeclineSeriesShowsRisesFallsAndTotal) {

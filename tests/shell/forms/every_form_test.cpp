@@ -113,6 +113,27 @@ TEST_F(EveryForm, EachControlThatTakesTheKeyboardHasAName) {
     Visit(entry, [&](QWidget* form) { EXPECT_EQ(Nameless(form), none) << entry; });
 }
 
+TEST_F(EveryForm, ThePriceFileAndItsModificationHaveNamesAndAPage) {
+  Find<QAction>(main.get(), "mnuViewData")->trigger();
+  Click(Find<QDialog>(main.get(), "EnterCode"), "Command1");
+  auto* data = Find<QDialog>(main.get(), "DataForm");
+  ASSERT_NE(data, nullptr);
+  EXPECT_EQ(Nameless(data), std::set<std::string>());
+  EXPECT_EQ(HelpPageOf(data->objectName()), "data.html");
+  bool seen = false;
+  QTimer::singleShot(0, qApp, [&] {
+    QWidget* volMod = QApplication::activeModalWidget();
+    ASSERT_EQ(volMod->objectName(), "VolMod");
+    EXPECT_EQ(Nameless(volMod), std::set<std::string>());
+    EXPECT_EQ(HelpPageOf(volMod->objectName()), "data.html");
+    seen = true;
+    volMod->close();
+  });
+  Find<QAction>(data, "nmAdjVol")->trigger();
+  EXPECT_TRUE(seen);
+  data->close();
+}
+
 TEST_F(EveryForm, AComboBoxIsCalledByItsLabelAndItsChoiceIsItsValue) {
   Find<QAction>(main.get(), "mnuChartDisplay")->trigger();
   auto* selection = Find<QDialog>(main.get(), "ChtSel");
