@@ -32,7 +32,7 @@ QPushButton* Button(const char* name, const char* caption, QWidget* parent) {
 }  // namespace
 
 SubList::SubList(ListFormServices services, QWidget* parent)
-    : QDialog(parent), services_(services) {
+    : QDialog(parent), services_(std::move(services)) {
   setObjectName("SubList");
   setWindowTitle(kTitle);
 
@@ -48,6 +48,8 @@ SubList::SubList(ListFormServices services, QWidget* parent)
   text2_->installEventFilter(this);
   add_ = Button("Command4", "< &Add", this);
   del_ = Button("Command1", "&Del", this);
+  select_ = Button("Command5", "Code S&election", this);
+  select_->setVisible(bool(services_.openCodes));
   list2_ = new CodeList("List2", this);
   list2_->setAccessibleName("Current name file codes");
   list2_->installEventFilter(this);
@@ -72,7 +74,8 @@ SubList::SubList(ListFormServices services, QWidget* parent)
   grid->addLayout(middle, 3, 1);
 
   grid->addWidget(Caption("&Type a code and press ENTER", text2_, this), 0, 2, 1, 3);
-  grid->addWidget(text2_, 1, 2, 1, 3);
+  grid->addWidget(text2_, 1, 2);
+  grid->addWidget(select_, 1, 3, 1, 2);
   grid->addWidget(Caption("Current &name file codes", list2_, this), 2, 2);
   grid->addWidget(Caption("C&olumns", columns, this), 2, 3, Qt::AlignRight);
   grid->addWidget(columns, 2, 4);
@@ -88,7 +91,8 @@ SubList::SubList(ListFormServices services, QWidget* parent)
   grid->addLayout(buttons, 4, 0, 1, 5);
 
   setTabOrder(combo1_, text2_);
-  setTabOrder(text2_, list2_);
+  setTabOrder(text2_, select_);
+  setTabOrder(select_, list2_);
   setTabOrder(list2_, columns);
   setTabOrder(columns, add_);
   setTabOrder(add_, list1_);
@@ -103,6 +107,7 @@ SubList::SubList(ListFormServices services, QWidget* parent)
   connect(combo1_, &QComboBox::activated, this, [this](int index) { ListChosen(index); });
   connect(add_, &QPushButton::clicked, this, [this] { Add(); });
   connect(del_, &QPushButton::clicked, this, [this] { DeleteSelected(); });
+  connect(select_, &QPushButton::clicked, this, [this] { OpenCodes(); });
   connect(list2_, &QListWidget::itemDoubleClicked, this, [this] { Add(); });
   connect(list1_, &QListWidget::itemSelectionChanged, this, [this] { Edited(); });
   connect(list2_, &QListWidget::itemSelectionChanged, this, [this] { Edited(); });
@@ -171,6 +176,7 @@ void SubList::LookAgain() {
 void SubList::Edited() {
   const bool open = list_ >= 0;
   text2_->setEnabled(open);
+  select_->setEnabled(open);
   add_->setEnabled(open && !list2_->selectedItems().isEmpty());
   del_->setEnabled(open && !list1_->selectedItems().isEmpty());
   save_->setEnabled(changed_);
@@ -210,6 +216,19 @@ void SubList::AddTyped() {
   AddAt(*place);
   text2_->clear();
   Edited();
+}
+
+void SubList::OpenCodes() {
+  const auto select = [this](const std::string& code) {
+    const auto place = FindTypedCode(nameCodes_, code);
+    if (!place) {
+      services_.dialogs.Message(kCodeNotFound, kTitle);
+      return;
+    }
+    AddAt(*place);
+    Edited();
+  };
+  TellErrors(services_.dialogs, kTitle, [&] { services_.openCodes(this, select); });
 }
 
 void SubList::DeleteSelected() {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QDialog>
+#include <functional>
 
 #include "lists/chart_list.h"
 #include "lists/forms/list_box.h"
@@ -20,6 +21,9 @@ struct ListFormServices {
   Dialogs& dialogs;
   const Settings& settings;
   SettingsFile& user;  // the per-user store: names of the lists
+  // Shows the codes of the name file over a form; each that is selected there is handed back.
+  std::function<void(QWidget* over, std::function<void(const std::string& code)> select)>
+      openCodes = {};
 };
 
 // "Chart Lists": edits one list.
@@ -43,6 +47,7 @@ class SubList : public QDialog {
   void FindWhileTyping(const QString& typed);
   void Add();
   void AddTyped();
+  void OpenCodes();
   void AddAt(size_t place);
   void DeleteSelected();
   void DeleteAll();
@@ -56,7 +61,7 @@ class SubList : public QDialog {
   QComboBox* combo1_;
   CodeList *list1_, *list2_;
   QLineEdit* text2_;
-  QPushButton *add_, *del_, *save_;
+  QPushButton *add_, *del_, *save_, *select_;
   int list_ = -1;  // of the combo, from 0
   ListCodes codes_, nameCodes_;
   FileStamp listStamp_, namesStamp_;  // of the files that they were read from

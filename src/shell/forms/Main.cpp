@@ -50,6 +50,10 @@ Main::Main(Session& session, std::string commandLine)
              .VolumeUnitText =
                  [this](const NameRec& name) {
                    return VolumeUnitText(session_.files, session_.settings, name.Code.trimmed());
+                 },
+             .openCodes =
+                 [this](QWidget* over, std::function<void(const std::string&)> select) {
+                   data_.OpenCodes(over, std::move(select));
                  }}),
       adjust_(session, this,
               {.disableMenus = [this] { DisableMenus(); },

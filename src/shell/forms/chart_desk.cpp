@@ -533,7 +533,12 @@ void ChartDesk::OpenFonts() {
 }
 
 void ChartDesk::OpenLists() {
-  Show(new SubList({session_.files, session_.dialogs, session_.settings, session_.user}, over_));
+  Show(new SubList({.files = session_.files,
+                    .dialogs = session_.dialogs,
+                    .settings = session_.settings,
+                    .user = session_.user,
+                    .openCodes = hooks_.openCodes},
+                   over_));
 }
 
 void ChartDesk::OpenListUtilities() {

@@ -26,6 +26,8 @@ struct ChartDeskHooks {
   // The data destination paths over a form; true when another data folder was chosen.
   std::function<bool(QWidget* over)> openWMPath;
   std::function<std::string(const NameRec&)> VolumeUnitText;
+  // The codes of the name file over the editor of chart lists.
+  std::function<void(QWidget* over, std::function<void(const std::string& code)> select)> openCodes;
 };
 
 // The forms of charting and what ties them together: the chart window, chart selection, and the

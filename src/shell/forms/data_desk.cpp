@@ -30,6 +30,23 @@ void DataDesk::OpenData() {
   form->move(over_->mapToGlobal(QPoint(0, 0)));
 }
 
+void DataDesk::OpenCodes(QWidget* over, std::function<void(const std::string& code)> select) {
+  auto* form = new EnterCode({.files = session_.files,
+                              .dataPath = session_.settings.paths.CurrentDataPath,
+                              .dialogs = session_.dialogs,
+                              .lastIndex = lastIndex_,
+                              .select = std::move(select)},
+                             over);
+  form->setAttribute(Qt::WA_DeleteOnClose);
+  try {
+    form->Fill();
+  } catch (...) {
+    delete form;
+    throw;
+  }
+  form->open();
+}
+
 void DataDesk::View(const CodeSelection& selection, QWidget* over) {
   if (data_) return;  // another is being read
   over_->raise();

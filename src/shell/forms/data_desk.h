@@ -2,6 +2,7 @@
 
 #include <QPointer>
 #include <functional>
+#include <string>
 
 #include "lists/text_print_out.h"
 #include "shell/session.h"
@@ -30,6 +31,8 @@ class DataDesk {
       : session_(session), over_(over), hooks_(std::move(hooks)) {}
 
   void OpenData();  // EnterCode, which opens DataForm
+  // EnterCode over the editor of chart lists, which takes each code that is selected.
+  void OpenCodes(QWidget* over, std::function<void(const std::string& code)> select);
 
  private:
   void View(const CodeSelection& selection, QWidget* over);

@@ -52,6 +52,31 @@ TEST_F(SubListTest, ShowsTheNameFileAndNoListAtFirst) {
   EXPECT_TRUE(Items("List1").empty());
 }
 
+TEST_F(SubListTest, CodesSelectedInTheCodeSelectionAreAddedOnce) {
+  PutList('A', {Entry(3, "BHP")});
+  std::function<void(const std::string&)> select;
+  ListFormServices services = Services();
+  services.openCodes = [&](QWidget*, std::function<void(const std::string&)> taken) {
+    select = std::move(taken);
+  };
+  Stand(std::make_unique<SubList>(services, nullptr));
+  EXPECT_FALSE(On<QPushButton>("Command5")->isEnabled());
+  Choose("Combo1", 0);
+  Press("Command5");
+  ASSERT_TRUE(select);
+  for (const char* code : {"ZZZ", "BHP", "ADV"}) select(code);
+  EXPECT_EQ(Items("List1"), (Codes{"BHP", "ZZZ", "ADV"}));
+  EXPECT_TRUE(On<QPushButton>("Command2")->isEnabled());
+  EXPECT_TRUE(dialogs.said.empty());
+  select("GONE");
+  ExpectSaid("Code not found", "Chart Lists");
+}
+
+TEST_F(SubListTest, TheCodeSelectionIsThereWhereTheProgramHasIt) {
+  Open();
+  EXPECT_FALSE(On<QPushButton>("Command5")->isVisible());
+}
+
 TEST_F(SubListTest, NamesStandBesideTheCodesAndAreFoundWhileOneTypes) {
   OpenListA();
   auto* codes = List("List2");
