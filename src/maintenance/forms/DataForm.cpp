@@ -3,6 +3,7 @@
 #include <QHeaderView>
 #include <QMenuBar>
 #include <QScreen>
+#include <QScrollBar>
 #include <QVBoxLayout>
 
 #include "maintenance/forms/VolMod.h"
@@ -104,6 +105,7 @@ bool DataForm::Fill() {
   });
   ss1_->Refresh();
   if (shown) ss1_->GoTo(rows_.RowCount() - 1, kDataDate);
+  ss1_->horizontalScrollBar()->setValue(0);  // the numbers in sight, however narrow the grid was
   ShowCount();
   return shown;
 }
