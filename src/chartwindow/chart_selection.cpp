@@ -50,6 +50,14 @@ Period PeriodOfIndex(int index) {
                                   : Period::kDaily;
 }
 
+// The place of an oscillator's code in Combo2; 0 for one that it does not offer.
+int IndexOfOsc(std::string_view code) {
+  const std::span<const OscChoice> choices = OscChoices();
+  const auto found = std::find_if(choices.begin(), choices.end(),
+                                  [&](const OscChoice& o) { return o.code == code; });
+  return found == choices.end() ? 0 : int(found - choices.begin());
+}
+
 std::string BoolText(bool value) { return value ? "True" : "False"; }
 
 bool HasNoBars(const NameRec& rec) {
@@ -235,10 +243,9 @@ void ChartSelection::Load() {
   } else {
     view_.Text3 = Str(std::int32_t(state.BarSpacing));
     if (state.OscShown) {
-      const std::span<const OscChoice> choices = OscChoices();
-      const auto chosen = std::find_if(choices.begin(), choices.end(),
-                                       [&](const auto& o) { return o.code == state.OscSelected; });
-      if (chosen != choices.end()) view_.Combo2 = int(chosen - choices.begin());
+      view_.Combo2 = IndexOfOsc(state.OscSelected);
+      // Chosen, and not shown yet.
+      if (view_.Combo2 == 0) view_.Combo2 = IndexOfOsc(state.OscCode);
     }
   }
   SetStyle(IndexOf(state.ChartStyle));
@@ -354,7 +361,10 @@ bool ChartSelection::OK() {
     state.BandKind = 0;
   } else {
     state.BandKind = std::int16_t(view_.Combo3);
-    if (state.OscShown) state.OscSelected = state.OscCode;
+    // The box says what is drawn, whatever the menu of the chart has drawn since.
+    state.OscShown = view_.Combo2 != 0;
+    if (state.OscShown)
+      state.OscSelected = state.OscCode = std::string(OscChoices()[size_t(view_.Combo2)].code);
   }
   ChartSettings& charts = services_.settings.charts;
   const SettingsFile::Batch batch(services_.ini);

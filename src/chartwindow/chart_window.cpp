@@ -615,6 +615,7 @@ void ChartWindow::ShowPanel(std::string_view code) {
                  .Top = host.PanelTop,
                  .Bottom = host.PanelBottom};
   panelCode_ = host.OscCode;
+  panelValues_ = host.LastValues;
 }
 
 void ChartWindow::PickOscillator(std::string_view code, bool slow) {
@@ -679,7 +680,17 @@ std::string ChartWindow::ChartName() const {
 std::string ChartWindow::PanelName() const {
   const Oscillator* oscillator = FindOscillator(panelCode_);
   if (!oscillator) return "Oscillator";
-  return "Oscillator " + std::string(oscillator->choice ? oscillator->choice : panelCode_);
+  std::string name =
+      "Oscillator " + std::string(oscillator->choice ? oscillator->choice : panelCode_);
+  for (size_t i = 0; i < panelValues_.size(); ++i) {
+    // Of a penny share values are small.
+    const double value = panelValues_[i], places = std::abs(value) < 1 ? 10000 : 100;
+    name += (i > 0                     ? " and "
+             : panelValues_.size() > 1 ? ", last values "
+                                       : ", last value ") +
+            Str(RoundHalfEven(value * places) / places);
+  }
+  return name;
 }
 
 // What was picked is asked for as chart selection does, which then shows it.

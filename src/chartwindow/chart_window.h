@@ -343,13 +343,14 @@ class ChartWindow {
   ToldOnce dialogs_;  // through which the window says everything
   ChartWindowView view_;
   std::optional<ChartScript> script_;
-  ChartRequest first_;             // of the first chart of a pair
-  std::string panelCode_;          // the oscillator that was drawn last, empty none
-  bool pictureGone_ = false;       // the picture was cleared for a chart to come
-  bool boxKept_ = false;           // the chart to come is the one on show: its box value stands
-  std::int16_t SavedSpacing_ = 2;  // of the bars, while a swing is on
-  bool panelPicked_ = false;       // from the menu: it is not part of the next chart, unless
-  bool panelKept_ = false;         // it is kept
+  ChartRequest first_;               // of the first chart of a pair
+  std::string panelCode_;            // the oscillator that was drawn last, empty none
+  std::vector<double> panelValues_;  // what it ends at
+  bool pictureGone_ = false;         // the picture was cleared for a chart to come
+  bool boxKept_ = false;             // the chart to come is the one on show: its box value stands
+  std::int16_t SavedSpacing_ = 2;    // of the bars, while a swing is on
+  bool panelPicked_ = false;         // from the menu: it is not part of the next chart, unless
+  bool panelKept_ = false;           // it is kept
   PanelFrame panelFrame_;
   Arrangement arrangement_ = Arrangement::kOne;
   std::string scriptPath_;  // of the composition on show

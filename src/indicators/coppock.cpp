@@ -44,6 +44,7 @@ void ShowCoppock(OscHost& host) {
     panel.Title("Coppock    " + Str(P) + " Period");
     frame.DrawLines(panel, Str(series.highest), Str(series.lowest));
 
+    host.LastValues = {double(At(series.smoothed, bars.BarCount))};
     OscTrace line(panel.pen, 'H');
     for (int i = 1; i <= bars.BarCount; ++i) {
       const std::int16_t value = At(series.smoothed, i);

@@ -97,6 +97,7 @@ void ShowDirectionalMovement(OscHost& host) {
 
     panel.Title("Directional Movement ( " + Str(N) + " period )    ADX " + Str(M) + " period");
 
+    if (bars.BarCount >= 0) host.LastValues = {double(At(series.rows, bars.BarCount).ADX)};
     OscTrace plus(panel.pen, 'H'), minus(panel.pen, 'L'), adx(panel.pen, 'H');
     for (int i = 0; i <= bars.BarCount; ++i) {
       const DmSeries::Row& row = At(series.rows, i);

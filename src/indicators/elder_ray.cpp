@@ -56,6 +56,8 @@ void ShowElderRay(OscHost& host) {
       panel.Text(panel.PanelLeft + 1, bearY - 6, "Bear");
     }
 
+    if (bars.BarCount >= P)
+      host.LastValues = {At(series.bull, bars.BarCount), At(series.bear, bars.BarCount)};
     for (int i = P; i <= bars.BarCount; ++i) {
       const double x = panel.BarX(i);
       panel.Line('L', x, bullY, x, bullY - At(series.bull, i) / bullScale, kOscUp);

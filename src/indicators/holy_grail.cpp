@@ -65,6 +65,7 @@ void ShowHolyGrail(OscHost& host) {
     panel.Title("Jones Holy Grail    " + Str(P) + " Period");
     frame.DrawLines(panel, Format(series.highest, "0.000"), Format(series.lowest, "0.000"));
 
+    host.LastValues = {At(series.first, bars.BarCount)};
     OscTrace first(panel.pen, 'H'), second(panel.pen, 'L');
     std::int16_t firstY = 0, secondY = 0;
     double previousX = panel.PlotX;

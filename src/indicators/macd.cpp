@@ -86,6 +86,9 @@ void ShowMACD(OscHost& host) {
          {double(series.highest), series.highest * 0.5, double(series.lowest), series.lowest * 0.5})
       panel.Guide(yOf(v), Format(v, "####.00"));
 
+    if (bars.BarCount > series.firstSignal)
+      host.LastValues = {double(At(series.difference, bars.BarCount)) -
+                         At(series.signal, bars.BarCount)};
     PriceAverages averages(host, series);
     const bool onPrice = host.OscCaller != "ANAL";
     for (int i = 0; i <= bars.BarCount; ++i) {

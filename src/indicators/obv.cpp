@@ -69,6 +69,7 @@ void ShowOBV(OscHost& host) {
     const double scale = ScaleOf(double(series.highest) - series.lowest, CInt(base - top));
     if (scale == 0) return;
 
+    host.LastValues = {double(series.total)};
     OscTrace line(panel.pen, 'H');
     int points = 0;
     for (bar = 1; bar <= bars.BarCount; ++bar) {

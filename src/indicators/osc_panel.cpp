@@ -82,6 +82,7 @@ OscPanel::OscPanel(OscHost& hostIn, double units, bool textsBelow)
   Surface& panel = host.panel;
   ResumeScript(host);
   if (!host.SecondPass) {
+    host.LastValues.clear();
     if (units > 0 && host.InChartWindow())
       panel.SetScale(0, 0, host.price.ScaleWidth(),
                      textsBelow ? UnitsWithTexts(units, panel.Height()) : units);

@@ -4,6 +4,7 @@
 #include <functional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "base/numbers.h"
 #include "chart/chart_pen.h"
@@ -44,6 +45,8 @@ struct OscHost {
   bool SecondPass = false;  // over the panel that another oscillator drew
 
   std::int16_t PanelTop = 0, PanelBottom = 0;  // of the panel drawn last, for the pointer
+  // What its first line ends at; of two oscillators on one panel that of each.
+  std::vector<double> LastValues = {};
 
   bool InChartWindow() const { return OscCaller == "CHTS"; }
   // In the chart window the frame takes the panel, and title and values of RMX stand below it. In

@@ -69,6 +69,7 @@ void Draw(OscHost& host, std::int16_t P, std::int16_t A, const std::string& Comp
         panel.Line('L', panel.PlotX - spacing, previousAverageY, panel.PlotX, averageY, kOscLine2);
       previousAverageY = averageY;
     }
+    host.LastValues = {bar.Value};
     if (drawn >= 3) panel.Line('H', panel.PlotX - spacing, previousY, panel.PlotX, y, kOscLine1);
     previousY = y;
   }

@@ -56,6 +56,7 @@ void Lines(OscHost& host, OscPanel& panel, const Form& form, const RmxSeries& se
     if (point.Value == 0) continue;
     const double from = panel.PlotX - spacing;
     const bool line = values++ > 0 && b >= form.P;
+    host.LastValues = {point.Value};
 
     const std::int16_t y = CInt(plot.Y(point.Value, series.Lowest, scale));
     if (line) panel.Line('L', from, lastY, panel.PlotX, y, kOscLine1);

@@ -60,6 +60,7 @@ void Draw(OscHost& host, const Form& form) {
   guide(CLng(series.Highest * 0.8), "+80%");
   guide(CLng(series.Lowest * 0.8), "-80%");
 
+  if (!series.V.empty()) host.LastValues.push_back(series.V.back());
   std::vector<std::int16_t> slots(size_t(form.A));
   RollingWindow<std::int16_t, std::int32_t> window(slots.data(), form.A);
   const double spacing = host.chart.BarSpacing;

@@ -46,6 +46,7 @@ void ShowRSI(OscHost& host) {
     const ChartBars& bars = host.chart.Bars;
     OscTrace line(panel.pen, 'H');
     int values = 0;
+    if (bars.BarCount >= P) host.LastValues = {RsiAt(bars, bars.BarCount, P)};
     for (int i = P - 1; i <= bars.BarCount; ++i) {
       const float y = CSng((panel.PanelBottom - 10) - RsiAt(bars, i, P) * unit);
       // The line ends for the first time at the fourth value: the first has no window yet.

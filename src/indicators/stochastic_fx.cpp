@@ -1,6 +1,7 @@
 #include "indicators/stochastic_fx.h"
 
 #include <algorithm>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -101,6 +102,7 @@ void Draw(OscHost& host, int& bar) {
   const auto plotY = [&](double v) { return CLng(yOf(form.reversed ? 100 - v : v)); };
   double previousX = 0;
   std::int32_t previousKY = 0, previousDY = 0, previousThirdY = 0;
+  std::optional<std::int32_t> lastValue;
   int zone = 0, previousZone = 0;  // 1 above the 90% line, 2 between, 3 below the 20% line
   for (bar = std::max(0, form.K + 1); bar <= last; ++bar) {
     const double x = CInt(panel.PanelLeft + double(bar) * host.chart.BarSpacing);
@@ -109,12 +111,14 @@ void Draw(OscHost& host, int& bar) {
     const float height = window.Highest - window.Lowest;
     const std::int32_t percentK = CLng((height != 0 ? double(above) / height : above) * 100.0);
 
+    lastValue = percentK;
     std::int32_t kY = plotY(percentK), dY = 0, thirdY = 0;
     if (form.D > 0) {
       aboveLow.Shift(above);
       range.Shift(height);
       const double a = aboveLow.Sum(), b = range.Sum();
       const std::int32_t percentD = CLng((b != 0 ? a / b : a) * 100.0);
+      if (form.slow) lastValue = percentD;
       dY = plotY(percentD);
       if (form.slow) {
         slow.Shift(percentD);
@@ -145,6 +149,7 @@ void Draw(OscHost& host, int& bar) {
     previousDY = dY;
     previousThirdY = thirdY;
   }
+  if (lastValue) host.LastValues.push_back(*lastValue);
 }
 
 }  // namespace

@@ -60,6 +60,7 @@ void ShowVolatility(OscHost& host) {
     if (scale == 0) return;
     const auto yOf = [&](float v) { return base - (double(v) - series.lowest) / scale; };
 
+    if (bars.BarCount >= 0) host.LastValues = {At(series.rows, bars.BarCount).value};
     OscTrace average(panel.pen, 'L');
     for (int i = 0; i <= bars.BarCount; ++i) {
       const VolatilitySeries::Row& row = At(series.rows, i);

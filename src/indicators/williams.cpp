@@ -29,6 +29,7 @@ void Draw(OscHost& host, int P) {
 
   const std::vector<WilliamsPoint> series =
       WilliamsSeries(host.chart.Bars, host.request.Name.RecType, P);
+  if (!series.empty()) host.LastValues = {series.back().W};
   float slots[3];
   RollingWindow<float, float> window(slots, 3);
   std::int16_t x = panel.PanelLeft, y = 0, meanY = 0;

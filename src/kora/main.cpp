@@ -8,6 +8,7 @@
 #include "base/runtime_error.h"
 #include "base/version.h"
 #include "platform/qt/accessible_names.h"
+#include "platform/qt/focus_mark.h"
 #include "platform/qt/keyboard_back.h"
 #include "platform/qt/qt_dialogs.h"
 #include "platform/qt/single_instance.h"
@@ -65,6 +66,7 @@ int main(int argc, char** argv) {
   QDir().mkpath(QString::fromStdString(home));
 
   const KeyboardBack keyboardBack;
+  const FocusMark focusMark;
   QtDialogs dialogs;
   app.dialogs = &dialogs;
   InstallAccessibleNames();

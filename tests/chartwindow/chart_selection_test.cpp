@@ -199,6 +199,35 @@ TEST_F(ChartSelectionTest, ALaterLoadShowsTheStateAndNotTheSettings) {
   EXPECT_EQ(Loaded().Combo2, 0);
 }
 
+TEST_F(ChartSelectionTest, TheBoxOfOscillatorsSaysWhatWillBeDrawn) {
+  Loaded();
+  Selection().ChooseOscillator(14);
+  ASSERT_TRUE(Selection().OK());
+  state.OscCode = "MACD";  // from the menu of the chart
+  EXPECT_EQ(Loaded().Combo2, 14);
+  ASSERT_TRUE(Selection().OK());
+  EXPECT_EQ(state.OscCode, "RSI");
+  EXPECT_EQ(state.OscSelected, "RSI");
+}
+
+TEST_F(ChartSelectionTest, AnOscillatorThatWasChosenAndNotShownYetStaysInTheBox) {
+  Loaded();
+  Selection().ChooseOscillator(14);
+  Selection().FolderChanged();
+  EXPECT_EQ(Loaded().Combo2, 14);
+  ASSERT_TRUE(Selection().OK());
+  EXPECT_EQ(state.OscSelected, "RSI");
+}
+
+TEST_F(ChartSelectionTest, NoneInTheBoxDrawsNone) {
+  Loaded();
+  state.OscShown = true;
+  state.OscSelected = state.OscCode = "PARAV";
+  EXPECT_EQ(Loaded().Combo2, 0);
+  ASSERT_TRUE(Selection().OK());
+  EXPECT_FALSE(state.OscShown);
+}
+
 TEST_F(ChartSelectionTest, EachOscillatorHasItsPlaceAndCode) {
   const char* codes[] = {"",     "DM",  "COP", "ERY", "FX",  "JHG", "MACD", "MOM", "OBV",
                          "PARA", "ROC", "R/F", "RMO", "RMX", "RSI", "STO",  "VTY", "WMS"};

@@ -5,6 +5,7 @@
 #include <algorithm>
 
 #include "base/dates.h"
+#include "indicators/roc_momentum.h"
 #include "lists/chart_list.h"
 #include "tests/chartwindow/window_fixture.h"
 #include "tests/support/all_oscillators.h"
@@ -796,7 +797,14 @@ TEST_F(OscillatorTest, ThePicturesHaveNamesForThoseWhoCanNotSeeThem) {
   window().SetStyle(Style::kLine);
   window().PickOscillator("WMS");
   EXPECT_EQ(window().ChartName(), "Chart AAA, line, daily, 28/02/2026, close 13");
-  EXPECT_EQ(window().PanelName(), "Oscillator Williams %R");
+  EXPECT_EQ(window().PanelName(), "Oscillator Williams %R, last value 33.33") << "13 of 9 to 15";
+  window().PickOscillator("OBV");
+  EXPECT_EQ(window().PanelName(), "Oscillator On-Balance Volume, last value 355000")
+      << "100,000 and 330,000 up, 75,000 down";
+  settings.osc[kRocP] = {3, 3};
+  window().PickOscillator("R/F");
+  EXPECT_EQ(window().PanelName(), "Oscillator ROC & FX, last values 23 and 67")
+      << "13 from 10; 4 of 6";
 }
 
 TEST_F(OscillatorTest, ASecondOneReplacesTheFirstOnPaneAndScript) {

@@ -214,6 +214,8 @@ void ChtSel::Escape() {
 bool ChtSel::event(QEvent* event) {
   const bool taken = SelectionForm::event(event);
   if (event->type() == QEvent::WindowActivate) Activated();
+  // The averages stand on the colours of the desktop.
+  if (event->type() == QEvent::ApplicationPaletteChange) Refresh();
   return taken;
 }
 

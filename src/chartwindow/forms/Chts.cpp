@@ -273,6 +273,12 @@ void Chts::BuildMenus() {
   for (const Menu& each : Menus()) {
     QMenu* menu = menuBar()->addMenu(each.caption);
     menu->setObjectName(each.name);
+    // Escape in a menu leaves the keys with the bar, which does nothing with them.
+    connect(menu, &QMenu::aboutToHide, this, [this] {
+      QTimer::singleShot(0, this, [this] {
+        if (menuBar()->hasFocus() && !QApplication::activePopupWidget()) setFocus();
+      });
+    });
     for (const Entry& entry : each.entries) {
       if (!*entry.name) {
         menu->addSeparator();

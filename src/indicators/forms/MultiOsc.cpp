@@ -22,6 +22,7 @@ MultiOsc::MultiOsc(MultiOscServices services, QWidget* parent)
   setWindowTitle(kTitle);
   list1_ = new QListWidget(this);
   list1_->setObjectName("List1");
+  list1_->setAccessibleName("Oscillators");
   for (const MultiOscName& name : MultiOscNames()) list1_->addItem(ToQt(name.name));
   list1_->setCurrentRow(0);
   list1_->setMinimumWidth(list1_->sizeHintForColumn(0) + 3 * fontMetrics().height());

@@ -25,13 +25,14 @@ QWidget* Below() {
 constexpr Qt::WindowFlags kBoxFlags = Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint |
                                       Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint;
 
-// Widens a box that its title would not fit; the frame sets titles in bold, between its buttons.
+// Widens a box that its title would not fit; the frame sets titles in bold, between an icon and up to
+// three buttons.
 void FitTitle(QMessageBox& box) {
   auto* grid = qobject_cast<QGridLayout*>(box.layout());
   if (!grid) return;
   QFont bold = box.font();
   bold.setBold(true);
-  const int buttons = 3 * box.style()->pixelMetric(QStyle::PM_TitleBarHeight);
+  const int buttons = 5 * box.style()->pixelMetric(QStyle::PM_TitleBarHeight);
   const int width = QFontMetrics(bold).horizontalAdvance(box.windowTitle()) + buttons;
   grid->addItem(new QSpacerItem(width, 0), grid->rowCount(), 0, 1, grid->columnCount());
 }

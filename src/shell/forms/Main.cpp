@@ -269,7 +269,9 @@ bool Main::TakeKey(const QKeyEvent& key) {
   if (key.key() == Qt::Key_F1) {
     const QWidget* form = QApplication::activeModalWidget();
     if (!form) form = QApplication::activeWindow();
-    if (form == this && desk_.window()) form = desk_.window();
+    if (form == this && mdi_->activeSubWindow()) form = mdi_->activeSubWindow()->widget();
+    // A message has no page of its own: that of the form below it.
+    while (form && !HasHelpPage(form->objectName())) form = form->parentWidget();
     OpenHelpAt(HelpPageOf(form ? form->objectName() : QString()));
     return true;
   }

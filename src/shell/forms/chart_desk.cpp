@@ -3,6 +3,7 @@
 #include <QApplication>
 #include <QMdiArea>
 #include <QMdiSubWindow>
+#include <memory>
 
 #include "base/dates.h"
 #include "base/runtime_error.h"
@@ -432,23 +433,37 @@ void ChartDesk::OpenSelection() {
   }
   // One form at a time works on the selection.
   if (secondForm_) delete secondForm_;
+  struct Standing {
+    ChartState state;
+    CurrentName current;
+    ChartSettings charts;
+    std::string folder;
+  };
+  const auto take = [this] {
+    return Standing{session_.charts, session_.current, session_.settings.charts,
+                    session_.settings.paths.CurrentDataPath};
+  };
+  const auto standing = std::make_shared<Standing>(take());
   ChtSelServices services = SelectionServices();
-  services.backToChart = [this, state = session_.charts, current = session_.current,
-                          charts = session_.settings.charts,
-                          folder = session_.settings.paths.CurrentDataPath] {
-    if (!chts_ || state.ChartIndex == 0) return false;
-    if (session_.settings.paths.CurrentDataPath == folder) {
+  services.backToChart = [this, standing] {
+    if (!chts_ || !(chts_->window().Chart.ChartDrawn || chts_->window().ChartFromFile))
+      return false;
+    if (session_.settings.paths.CurrentDataPath == standing->folder) {
       const ChartSettings& now = session_.settings.charts;
-      session_.charts = state;
-      session_.current = current;
+      session_.charts = standing->state;
+      session_.current = standing->current;
       // Set in the defaults meanwhile.
-      if (now.AvOne != charts.AvOne) session_.charts.Ma1On = now.AvOne;
-      if (now.AvTwo != charts.AvTwo) session_.charts.Ma2On = now.AvTwo;
+      if (now.AvOne != standing->charts.AvOne) session_.charts.Ma1On = now.AvOne;
+      if (now.AvTwo != standing->charts.AvTwo) session_.charts.Ma2On = now.AvTwo;
     }
+    session_.charts.ChartStartup = false;
     chts_->BackToChart();
     return true;
   };
+  const bool first = standing->state.ChartIndex == 0;
   selectionForm_ = Show(new ChtSel(std::move(services), over_));
+  // The window draws the first chart by itself as it opens.
+  if (first) *standing = take();
 }
 
 void ChartDesk::OpenSecondChart() {

@@ -3,6 +3,11 @@
 #include <QHash>
 
 namespace kora {
+namespace {
+
+constexpr const char* kFirstPage = "index.html";
+
+}  // namespace
 
 QString HelpPageOf(const QString& form) {
   static const QHash<QString, QString> pages{
@@ -16,11 +21,16 @@ QString HelpPageOf(const QString& form) {
       {"ChtOptions", "selecting.html"},
       {"Search", "selecting.html"},
       {"FinDate", "selecting.html"},
+      {"KoraScroll", "zoom.html"},
+      {"ZoomKora", "zoom.html"},
+      {"Anal", "oscillators.html"},
       {"ChtBands", "oscillators.html"},
       {"ChtDef", "oscillators.html"},
       {"MMASet", "oscillators.html"},
+      {"MultiOsc", "oscillators.html"},
       {"OscFrm", "oscillators.html"},
       {"StpLs", "oscillators.html"},
+      {"SwingSet", "turns.html"},
       {"BlankSpc", "looks.html"},
       {"ChtFonts", "looks.html"},
       {"ChtSp", "looks.html"},
@@ -30,6 +40,25 @@ QString HelpPageOf(const QString& form) {
       {"Scales", "looks.html"},
       {"VHeight", "looks.html"},
       {"F1Size", "tables.html"},
+      {"Adjust", "adjust.html"},
+      {"AdjustB", "adjust.html"},
+      {"AdjustC", "adjust.html"},
+      {"AdjustCC", "adjust.html"},
+      {"AdjustD", "adjust.html"},
+      {"AdjustR", "adjust.html"},
+      {"AdjustSS", "adjust.html"},
+      {"AdjDate", "adjustments.html"},
+      {"AdjList", "adjustments.html"},
+      {"AdjOpts", "adjustments.html"},
+      {"ExMaster", "names.html"},
+      {"NameForm", "names.html"},
+      {"ChtSnap", "companies.html"},
+      {"Fundmnt", "companies.html"},
+      {"StockInf", "companies.html"},
+      {"chtScan1", "scans.html"},
+      {"ChtScan2", "scans.html"},
+      {"ChtScan3", "scans.html"},
+      {"Statistics", "scans.html"},
       {"CLNames", "lists.html"},
       {"SubList", "lists.html"},
       {"SubList2", "lists.html"},
@@ -47,7 +76,9 @@ QString HelpPageOf(const QString& form) {
       {"DataForm", "data.html"},
       {"VolMod", "data.html"},
   };
-  return pages.value(form, "index.html");
+  return pages.value(form, kFirstPage);
 }
+
+bool HasHelpPage(const QString& form) { return HelpPageOf(form) != kFirstPage; }
 
 }  // namespace kora

@@ -199,7 +199,8 @@ void DLList::SetRunning(bool running) {
        std::initializer_list<QWidget*>{command1_, command2_, command3_, command4_, list1_})
     widget->setEnabled(!running);
   QPalette colours;
-  if (running) colours.setColor(QPalette::WindowText, Qt::red);
+  const bool dark = colours.color(QPalette::Window).lightness() < 128;
+  if (running) colours.setColor(QPalette::WindowText, dark ? QColor(255, 120, 110) : Qt::red);
   label2_->setPalette(colours);
   bar_->setValue(0);
   bar_->setVisible(running);

@@ -160,14 +160,12 @@ UpdateChoice INUpList::Choice() const {
                                     : UpdateChoice::kAll;
 }
 
-// The grid lives, on white, while the list is in use; else it is locked and grey.
+// The grid lives, on the ground of fields, while the list is in use; else it is locked and as the form
+// around it.
 void INUpList::ShowChoice() {
   const bool live = Choice() == UpdateChoice::kListed;
   ss1_->SetLocked(!live);
-  QPalette colours = ss1_->palette();
-  colours.setColor(QPalette::Base, live ? Qt::white : Qt::lightGray);
-  colours.setColor(QPalette::Text, Qt::black);
-  ss1_->setPalette(colours);
+  ss1_->viewport()->setBackgroundRole(live ? QPalette::Base : QPalette::Window);
   command1_->setEnabled(live && !master_.Records.empty());
   ulAdd_->setEnabled(live);
   ulDel_->setEnabled(live);

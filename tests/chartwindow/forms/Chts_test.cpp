@@ -484,6 +484,17 @@ TEST_F(ChtsFormTest, TheMenusOpenByTheirKeys) {
   }
 }
 
+TEST_F(ChtsFormTest, EscapeInAMenuGivesTheKeysBackToTheChart) {
+  Open();
+  Key(Qt::Key_M, Qt::AltModifier);
+  auto* menu = Find<QMenu>(form, "cmMove");
+  ASSERT_TRUE(WaitFor([&] { return menu->isVisible(); }));
+  QTest::keyClick(menu, Qt::Key_Escape);
+  EXPECT_TRUE(WaitFor([&] { return QApplication::focusWidget() == Picture(); }));
+  QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
+  EXPECT_NE(dynamic_cast<QToolButton*>(QApplication::focusWidget()), nullptr);
+}
+
 TEST_F(ChtsFormTest, EnterTakesTheFirstEntryOfAMenuOpenedByItsKey) {
   Open();
   Key(Qt::Key_O, Qt::AltModifier);

@@ -507,7 +507,24 @@ TEST_F(ChtsTest, EscapeInChartSelectionGoesBackToTheChart) {
   EXPECT_EQ(shown(), "CCC.WDT") << "from the chart on show";
 }
 
+TEST_F(ChtsTest, EscapeInTheFirstChartSelectionGoesBackToTheChartBehindIt) {
+  Open();
+  Entry("mnuChartDisplay")->trigger();
+  ASSERT_TRUE(WaitFor([&] { return form->charts()->window().Chart.ChartDrawn; }));
+  auto* selection = Find<QDialog>(form.get(), "ChtSel");
+  QTest::keyClick(selection, Qt::Key_PageDown);
+  QTest::keyClick(selection, Qt::Key_Escape);
+  EXPECT_FALSE(selection->isVisible());
+  ASSERT_NE(form->charts(), nullptr);
+  EXPECT_EQ(shown(), "AAA.WDT");
+  Entry("cmRelStrength")->trigger();
+  EXPECT_TRUE(Find<QWidget>(form.get(), "Picture2(0)")->isVisible());
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
+  EXPECT_EQ(shown(), "BBB.WDT");
+}
+
 TEST_F(ChtsTest, EscapeInChartSelectionWithoutAChartLeavesTheCharts) {
+  home.Put("drive_c/korawin/data/AAA.WDT", "");
   Open();
   Entry("mnuChartDisplay")->trigger();
   QTest::keyClick(Find<QDialog>(form.get(), "ChtSel"), Qt::Key_Escape);

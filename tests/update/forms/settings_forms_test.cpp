@@ -413,10 +413,14 @@ TEST_F(UpdateListForm, TheGridIsLockedAndGreyUnlessTheListIsInUse) {
     return Find<QAction>(form.get(), "ulAdd")->isEnabled();
   };
   EXPECT_FALSE(live());
-  EXPECT_NE(Grid()->palette().color(QPalette::Base), QColor(Qt::white));
+  const auto ground = [this] {
+    const QWidget* cells = Grid()->viewport();
+    return cells->palette().color(cells->backgroundRole());
+  };
+  EXPECT_EQ(ground(), form->palette().color(QPalette::Window));
   Click(form.get(), "Option1(1)");
   EXPECT_TRUE(live());
-  EXPECT_EQ(Grid()->palette().color(QPalette::Base), QColor(Qt::white));
+  EXPECT_EQ(ground(), form->palette().color(QPalette::Base));
   Click(form.get(), "Option1(2)");
   EXPECT_FALSE(live());
   Trigger("ulSave");
