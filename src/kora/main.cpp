@@ -9,6 +9,7 @@
 #include "base/version.h"
 #include "platform/qt/accessible_names.h"
 #include "platform/qt/focus_mark.h"
+#include "platform/qt/form_style.h"
 #include "platform/qt/keyboard_back.h"
 #include "platform/qt/qt_dialogs.h"
 #include "platform/qt/single_instance.h"
@@ -70,6 +71,7 @@ int main(int argc, char** argv) {
   QtDialogs dialogs;
   app.dialogs = &dialogs;
   InstallAccessibleNames();
+  InstallFormStyle();
   const SingleInstance instance(home, "KORA32");
   Session session(home, dialogs);
   session.files.lock().program = "kora";

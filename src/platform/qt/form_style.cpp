@@ -1,0 +1,42 @@
+#include "platform/qt/form_style.h"
+
+#include <QApplication>
+#include <QPainter>
+#include <QStyleOption>
+
+namespace kora {
+namespace {
+
+constexpr const char* kOwnStyle = "fusion";
+
+bool IsDark(const QPalette& colours) { return colours.color(QPalette::Window).lightness() < 128; }
+
+}  // namespace
+
+FormStyle::FormStyle() : QProxyStyle(kOwnStyle) {}
+
+void FormStyle::drawPrimitive(PrimitiveElement element, const QStyleOption* option,
+                              QPainter* painter, const QWidget* widget) const {
+  QProxyStyle::drawPrimitive(element, option, painter, widget);
+  const bool round = element == PE_IndicatorRadioButton;
+  const bool box = element == PE_IndicatorCheckBox || element == PE_IndicatorItemViewItemCheck;
+  if ((!round && !box) || !IsDark(option->palette)) return;
+  painter->save();
+  painter->setRenderHint(QPainter::Antialiasing);
+  QColor rim = option->palette.color(QPalette::WindowText);
+  rim.setAlphaF(option->state & State_Enabled ? 0.6f : 0.3f);
+  painter->setPen(rim);
+  painter->setBrush(Qt::NoBrush);
+  const QRectF place = QRectF(option->rect).adjusted(0.5, 0.5, -0.5, -0.5);
+  if (round)
+    painter->drawEllipse(place);
+  else
+    painter->drawRoundedRect(place, 1, 1);
+  painter->restore();
+}
+
+void InstallFormStyle() {
+  if (QApplication::style()->name() == kOwnStyle) QApplication::setStyle(new FormStyle);
+}
+
+}  // namespace kora

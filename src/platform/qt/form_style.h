@@ -1,0 +1,19 @@
+#pragma once
+
+#include <QProxyStyle>
+
+namespace kora {
+
+// The style of the forms where the desktop brings none of its own: its boxes to tick and buttons to
+// choose have a rim that is seen on a dark ground.
+class FormStyle : public QProxyStyle {
+ public:
+  FormStyle();
+  void drawPrimitive(PrimitiveElement element, const QStyleOption* option, QPainter* painter,
+                     const QWidget* widget) const override;
+};
+
+// Takes it where the desktop brings none. Needs an application.
+void InstallFormStyle();
+
+}  // namespace kora
