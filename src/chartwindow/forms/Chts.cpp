@@ -276,7 +276,9 @@ void Chts::BuildMenus() {
     // Escape in a menu leaves the keys with the bar, which does nothing with them.
     connect(menu, &QMenu::aboutToHide, this, [this] {
       QTimer::singleShot(0, this, [this] {
-        if (menuBar()->hasFocus() && !QApplication::activePopupWidget()) setFocus();
+        if (QWidget::window()->focusWidget() == menuBar() &&
+            !QApplication::activePopupWidget())
+          setFocus();
       });
     });
     for (const Entry& entry : each.entries) {
