@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <limits>
-#include <unordered_map>
 
 #include "base/file_set.h"
 #include "base/numbers.h"
@@ -29,40 +28,9 @@ std::string OwnName(std::int16_t ChartListNo) {
 
 std::string Padded(std::string_view code) { return PadRight(UCase(Trim(code)), 6); }
 
-// The codes of the name file with the first record that has each.
-class NameIndex {
- public:
-  NameIndex(const Files& files, const std::string& dataPath) {
-    const NameFile names(files, NameFilePath(dataPath));
-    CInt(names.count());  // a record number has 16 bits
-    std::int16_t number = 0;
-    const std::vector<NameRec> records = names.ReadAll();
-    numbers_.reserve(records.size());
-    for (const NameRec& rec : records) numbers_.try_emplace(std::string(rec.Code.raw()), ++number);
-  }
-
-  // The records of the codes that are there; the others, unless blank, go to `dropped`.
-  std::vector<ListRec> Refreshed(std::span<const std::string> codes, ListCodes& dropped) const {
-    std::vector<ListRec> out;
-    out.reserve(codes.size());
-    for (const std::string& code : codes) {
-      if (Trim(code).empty()) continue;
-      const auto found = Trim(code).size() <= 6 ? numbers_.find(Padded(code)) : numbers_.end();
-      if (found == numbers_.end()) {
-        dropped.push_back(code);
-        continue;
-      }
-      ListRec rec;
-      rec.ListRecNo = found->second;
-      rec.ListCode.set(found->first);
-      out.push_back(rec);
-    }
-    return out;
-  }
-
- private:
-  std::unordered_map<std::string, std::int16_t> numbers_;
-};
+CodeNumbers NumbersOf(const Files& files, const std::string& dataPath) {
+  return CodeNumbers(NameFile(files, NameFilePath(dataPath)).ReadAll());
+}
 
 std::string_view BytesOf(std::span<const ListRec> records) {
   return {reinterpret_cast<const char*>(records.data()), records.size_bytes()};
@@ -140,13 +108,59 @@ ListCodes SaveSubList(const Files& files, const std::string& dataPath, std::int1
                       std::span<const std::string> codes) {
   const auto held = files.lock().Hold();
   ListCodes dropped;
-  WriteList(files, dataPath, ChartListNo, NameIndex(files, dataPath).Refreshed(codes, dropped));
+  WriteList(files, dataPath, ChartListNo, NumbersOf(files, dataPath).Refreshed(codes, dropped));
   return dropped;
+}
+
+CodeNumbers::CodeNumbers(std::span<const NameRec> names) {
+  CInt(double(names.size()));
+  numbers_.reserve(names.size());
+  std::int16_t number = 0;
+  for (const NameRec& rec : names) numbers_.try_emplace(std::string(rec.Code.raw()), ++number);
+}
+
+std::vector<ListRec> CodeNumbers::Refreshed(std::span<const std::string> codes,
+                                            ListCodes& dropped) const {
+  std::vector<ListRec> out;
+  out.reserve(codes.size());
+  for (const std::string& code : codes) {
+    if (Trim(code).empty()) continue;
+    const auto found = Trim(code).size() <= 6 ? numbers_.find(Padded(code)) : numbers_.end();
+    if (found == numbers_.end()) {
+      dropped.push_back(code);
+      continue;
+    }
+    ListRec rec;
+    rec.ListRecNo = found->second;
+    rec.ListCode.set(found->first);
+    out.push_back(rec);
+  }
+  return out;
+}
+
+void StageList(FileSet& set, const Files& files, const std::string& dataPath,
+               std::int16_t ChartListNo, const CodeNumbers& numbers) {
+  const auto old = ReadList(files, dataPath, ChartListNo);
+  ListCodes dropped;
+  const auto fresh = numbers.Refreshed(CodesOf(old), dropped);
+  if (BytesOf(fresh) != BytesOf(old))
+    set.Add(ListFilePath(dataPath, ChartListNo), std::string(BytesOf(fresh)));
+}
+
+void StageLists(FileSet& set, const Files& files, const std::string& dataPath,
+                const CodeNumbers& numbers) {
+  for (std::int16_t number = kFirstChartList; number <= kResultList; ++number) {
+    try {
+      StageList(set, files, dataPath, number, numbers);
+    } catch (const RunTimeError&) {
+      // It can't be shown either.
+    }
+  }
 }
 
 ListCheck CheckAllLists(const Files& files, const std::string& dataPath, std::int16_t last) {
   const auto held = files.lock().Hold();
-  const NameIndex index(files, dataPath);
+  const CodeNumbers index = NumbersOf(files, dataPath);
   ListCheck check;
   for (std::int16_t number = kFirstChartList; number <= last; ++number) {
     if (!files.CheckFile(ListFilePath(dataPath, number))) continue;
@@ -207,7 +221,7 @@ std::string_view CopyItems(const ListSide& from, ListSide& to, std::span<const s
 ListCodes SaveSides(const Files& files, const std::string& dataPath,
                     std::span<const ListSide> sides) {
   const auto held = files.lock().Hold();
-  const NameIndex index(files, dataPath);
+  const CodeNumbers index = NumbersOf(files, dataPath);
   ListCodes dropped;
   FileSet set(files);
   for (const ListSide& side : sides) {

@@ -7,10 +7,13 @@
 #include <span>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
+#include "base/file_set.h"
 #include "base/files.h"
 #include "base/text.h"
+#include "store/name_rec.h"
 
 // Chart lists: subsets of the name file, paged through in the chart window in list order. Ten
 // are the user's; one holds the results of the scans.
@@ -76,6 +79,27 @@ ListCodes CodesOf(std::span<const ListRec> records);
 // returned. The file is replaced as a whole; on an error (53 without a name file) it stays.
 ListCodes SaveSubList(const Files& files, const std::string& dataPath, std::int16_t ChartListNo,
                       std::span<const std::string> codes);
+
+// The codes of a name file with the first record that has each.
+class CodeNumbers {
+ public:
+  // Error 6 for more records than 16 bits number.
+  explicit CodeNumbers(std::span<const NameRec> names);
+
+  // The records of the codes that are there; the others, unless blank, go to `dropped`.
+  std::vector<ListRec> Refreshed(std::span<const std::string> codes, ListCodes& dropped) const;
+
+ private:
+  std::unordered_map<std::string, std::int16_t> numbers_;
+};
+
+// Adds a list to the set, with the record numbers that its codes have now and without those that
+// left the name file. Nothing where it is right as it stands.
+void StageList(FileSet& set, const Files& files, const std::string& dataPath,
+               std::int16_t ChartListNo, const CodeNumbers& numbers);
+// All lists that can be read.
+void StageLists(FileSet& set, const Files& files, const std::string& dataPath,
+                const CodeNumbers& numbers);
 
 struct ListCheck {
   int lists = 0;    // files gone through

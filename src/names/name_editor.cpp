@@ -7,6 +7,7 @@
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "lists/chart_list.h"
 #include "update/download_settings.h"
 
 namespace kora {
@@ -86,7 +87,11 @@ NameEditor::SaveEnd NameEditor::SaveNames() {
     if (Bytes() != loaded_ && services_.dialogs.Ask(kNamesChangedOutside, kNameFileTitle,
                                                     Buttons::kYesNo) != Answer::kYes)
       return {};
-    if (!kora::SaveNames(services_.files, services_.dataPath, rows_, services_.dialogs)) return {};
+    const auto lists = [&](FileSet& set, std::span<const NameRec> names) {
+      StageLists(set, services_.files, services_.dataPath, CodeNumbers(names));
+    };
+    if (!kora::SaveNames(services_.files, services_.dataPath, rows_, services_.dialogs, lists))
+      return {};
     Load();
     return {true, {}};
   } catch (const RunTimeError& e) {

@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "base/file_set.h"
 #include "base/files.h"
 #include "base/record_file.h"
 #include "store/name_rec.h"
@@ -106,8 +107,10 @@ std::optional<RowFault> CheckRows(std::span<NameRec> rows);
 
 // Saves the editor's rows: names.bak is taken from names.DAT, the file made anew with
 // NameStatus 0 and MinMove 0.05, rows with a blank code left out, sorted by category. Messages
-// as they come; a failing write leaves the old names.DAT. True when saved.
+// as they come; a failing write leaves the old names.DAT. True when saved. `beside` adds what goes
+// by the records' numbers, which changes with the file or not at all.
+using StageBesideNames = std::function<void(FileSet&, std::span<const NameRec>)>;
 bool SaveNames(const Files& files, const std::string& dataPath, std::span<const NameRec> rows,
-               Dialogs& dialogs);
+               Dialogs& dialogs, const StageBesideNames& beside = {});
 
 }  // namespace kora

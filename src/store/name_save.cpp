@@ -3,6 +3,7 @@
 #include "base/text.h"
 #include "platform/dialogs.h"
 #include "store/name_file.h"
+#include "store/price_edit.h"
 
 namespace kora {
 namespace {
@@ -64,7 +65,7 @@ std::optional<RowFault> CheckRows(std::span<NameRec> rows) {
 }
 
 bool SaveNames(const Files& files, const std::string& dataPath, std::span<const NameRec> rows,
-               Dialogs& dialogs) {
+               Dialogs& dialogs, const StageBesideNames& beside) {
   try {
     const auto held = files.lock().Hold();
     if (!TakeBackup(files, dataPath, dialogs)) return false;
@@ -79,7 +80,11 @@ bool SaveNames(const Files& files, const std::string& dataPath, std::span<const 
     CInt(double(records.size()));  // record numbers are 16 bits
     // The rows are put in order before they are written, once, beside the old file: until the
     // new one is whole the old one is in its place, and a failure has nothing to bring back.
-    WriteNames(files, NameFilePath(dataPath), SortedNames(records, NameSort::kCategory));
+    const std::vector<NameRec> sorted = SortedNames(records, NameSort::kCategory);
+    FileSet set(files);
+    StageNames(set, NameFilePath(dataPath), sorted);
+    if (beside) beside(set, sorted);
+    set.Commit();
     return true;
   } catch (const HomeIsHeld& e) {
     dialogs.Message(e.what(), kSaveTitle);

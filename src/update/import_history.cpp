@@ -386,27 +386,6 @@ std::vector<T> ReadRecords(const Files& files, const std::string& path) {
   });
 }
 
-// Record numbers go stale by the sort, and a list shows what stands at its numbers.
-void StageLists(const Files& files, const std::string& dataPath, const std::vector<NameRec>& names,
-                FileSet& set) {
-  std::map<std::string_view, std::int16_t> numbers;
-  for (size_t i = 0; i < names.size(); ++i)
-    numbers.try_emplace(names[i].Code.raw(), std::int16_t(i + 1));
-  for (std::int16_t list = kFirstChartList; list <= kResultList; ++list) {
-    const std::string path = ListFilePath(dataPath, list);
-    const auto old = ReadRecords<ListRec>(files, path);
-    std::vector<ListRec> fresh;
-    for (ListRec rec : old) {
-      const auto it = numbers.find(rec.ListCode.raw());
-      if (it == numbers.end()) continue;
-      rec.ListRecNo = it->second;
-      fresh.push_back(rec);
-    }
-    if (BytesOf(fresh) != BytesOf(old))
-      Told(path, [&] { set.Add(path, std::string(BytesOf(fresh))); });
-  }
-}
-
 // What a command's text files come to.
 class Importer {
  public:
@@ -548,7 +527,11 @@ void Importer::Finish(Progress& progress, int done, ImportCounts& counts) {
       names_ = SortedNames(names_, NameSort::kCategory);
       Told(path, [&] { set_.Add(path, std::string(BytesOf(names_))); });
     }
-    StageLists(files_, dataPath_, names_, set_);
+    // Record numbers go stale by the sort, and a list shows what stands at its numbers.
+    const CodeNumbers numbers(names_);
+    for (std::int16_t list = kFirstChartList; list <= kResultList; ++list)
+      Told(ListFilePath(dataPath_, list),
+           [&] { StageList(set_, files_, dataPath_, list, numbers); });
     set_.Commit();
     progress.Step(total, total);
   } catch (...) {

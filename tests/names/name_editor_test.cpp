@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include "lists/chart_list.h"
 #include "tests/support/failing_io.h"
 #include "tests/support/records.h"
 #include "tests/support/scripted_dialogs.h"
@@ -33,6 +34,21 @@ class NameEditorTest : public testing::Test {
     for (const NameRec& rec : editor.rows()) out += NameCell(rec, C::kCode) + ".";
     return out;
   }
+  static std::vector<ListRec> List(
+      const std::vector<std::pair<std::int16_t, const char*>>& records) {
+    std::vector<ListRec> out(records.size());
+    for (size_t i = 0; i < out.size(); ++i) {
+      out[i].ListRecNo = records[i].first;
+      out[i].ListCode.set(records[i].second);
+    }
+    return out;
+  }
+  std::string Numbers(std::int16_t list) {
+    std::string out;
+    for (const ListRec& rec : ReadList(home.files(), data, list))
+      out += std::to_string(rec.ListRecNo) + std::string(rec.ListCode.trimmed()) + " ";
+    return out;
+  }
   std::string Said() {
     std::string out;
     for (const auto& said : dialogs.said) out += "[" + said.title + "] " + said.text + "|";
@@ -60,6 +76,45 @@ TEST_F(NameEditorTest, SavesInOrderOfCategoryAndShowsThatOrder) {
   EXPECT_EQ(Shown(), "BBB.AAA.CCC.");
   EXPECT_FALSE(editor.changed());
   EXPECT_EQ(home.Get("drive_c/korawin/data/names.bak"), old);
+}
+
+// Lists go by record numbers, which a save deals anew.
+TEST_F(NameEditorTest, ASaveGivesTheChartListsTheNewNumbers) {
+  WriteList(home.files(), data, kFirstChartList, List({{1, "CCC"}, {3, "BBB"}, {9, "GONE"}}));
+  WriteList(home.files(), data, kResultList, List({{2, "AAA"}}));
+  home.Put("drive_c/korawin/data/SubListB.Dat/folder", "");  // no list
+  editor.Put(2, C::kCategory, "3");
+  ASSERT_TRUE(editor.SaveNames().saved);
+  EXPECT_EQ(Codes(), "AAA.CCC.BBB.");
+  EXPECT_EQ(Numbers(kFirstChartList), "2CCC 3BBB ");
+  EXPECT_EQ(Numbers(kResultList), "1AAA ");
+  EXPECT_EQ(Said(), "");
+}
+
+TEST_F(NameEditorTest, NamesAndChartListsChangeTogetherOrNotAtAll) {
+  const auto lay = [&] {
+    io.Reset();
+    Put({Security("CCC", 2), Security("AAA", 2), Security("BBB", 1)});
+    WriteList(home.files(), data, kFirstChartList, List({{1, "CCC"}, {3, "BBB"}}));
+    WriteList(home.files(), data, kResultList, List({{2, "AAA"}}));
+    editor.Load();
+    editor.Put(0, C::kCategory, "0");  // in front of both
+    editor.Delete(1, 1);
+  };
+  int failures = 0;
+  for (int at = 1; at < 200; ++at) {
+    lay();
+    io.Reset(at);
+    const bool saved = editor.SaveNames().saved;
+    const int calls = io.calls;
+    io.Reset();
+    EXPECT_EQ(Codes() + Numbers(kFirstChartList) + Numbers(kResultList),
+              saved ? "CCC.BBB.1CCC 2BBB " : "CCC.AAA.BBB.1CCC 3BBB 2AAA ")
+        << at;
+    if (!saved) ++failures;
+    if (calls < at) break;
+  }
+  EXPECT_GT(failures, 5);
 }
 
 TEST_F(NameEditorTest, ARowWithoutACodeThatHasOtherContentIsRefusedWithItsPlace) {

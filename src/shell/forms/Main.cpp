@@ -54,7 +54,10 @@ Main::Main(Session& session, std::string commandLine)
              .openCodes =
                  [this](QWidget* over, std::function<void(const std::string&)> select) {
                    data_.OpenCodes(over, std::move(select));
-                 }}),
+                 },
+             .showStock = [this](const std::string& code,
+                                 QWidget* over) { companies_.ShowStock(code, over); },
+             .canShowStock = [this] { return companies_.CanShowStock(); }}),
       adjust_(session, this,
               {.disableMenus = [this] { DisableMenus(); },
                .enableMenus = [this] { EnableMenus(); },

@@ -213,6 +213,23 @@ void ChartDesk::WireWindow() {
   w.SetForm("cmMMASet", look([this](LookServices s) { return new MMASet(s, chts_); }));
   // The window draws again itself when this one is closed.
   w.SetForm("cmSLInd", [this] { RunForm(new StpLs(Look({}), chts_)); });
+  OfferStock();
+}
+
+void ChartDesk::OfferStock() {
+  if (!chts_) return;
+  std::function<void()> open;
+  if (hooks_.canShowStock && hooks_.canShowStock())
+    open = [this] {
+      if (chts_->window().HasChart())
+        hooks_.showStock(std::string(session_.current.Rec.Code.trimmed()), chts_);
+    };
+  chts_->SetForm("cmStkDetails", std::move(open));
+}
+
+void ChartDesk::PricesChanged() {
+  OfferStock();
+  Refresh();
 }
 
 // ---- The multi-oscillator view

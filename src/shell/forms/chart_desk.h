@@ -28,6 +28,9 @@ struct ChartDeskHooks {
   std::function<std::string(const NameRec&)> VolumeUnitText;
   // The codes of the name file over the editor of chart lists.
   std::function<void(QWidget* over, std::function<void(const std::string& code)> select)> openCodes;
+  // The company details of a code over a form, and whether there are any.
+  std::function<void(const std::string& code, QWidget* over)> showStock = {};
+  std::function<bool()> canShowStock = {};
 };
 
 // The forms of charting and what ties them together: the chart window, chart selection, and the
@@ -54,8 +57,8 @@ class ChartDesk {
   Chts* window() const { return chts_; }
   // After other folders were chosen.
   void PathsChanged();
-  // After prices were taken in.
-  void PricesChanged() { Refresh(); }
+  // After prices were taken in, with which company details may have come.
+  void PricesChanged();
 
  private:
   QWidget* Over() const;
@@ -68,6 +71,7 @@ class ChartDesk {
   void PrintView();
   bool AnySecurity();
   void WireWindow();
+  void OfferStock();
   ChtSelServices SelectionServices();
   LookServices Look(std::function<void()> saved);
   void Refresh();

@@ -53,7 +53,9 @@ void CompanyDesk::OpenSnapshot() {
 }
 
 bool CompanyDesk::CanShowStock() const {
-  return KoraDetailsReady(session_.files, session_.settings.download);
+  const std::int16_t service = session_.settings.download.DataService;
+  return (service == 1 || service == 3) &&
+         KoraDetailsReady(session_.files, session_.settings.download);
 }
 
 void CompanyDesk::ShowStock(const std::string& code, QWidget* over) {

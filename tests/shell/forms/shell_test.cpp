@@ -696,6 +696,38 @@ TEST_F(ChtsTest, PricesThatCameInShowOnTheChart) {
   EXPECT_EQ(session->current.Rec.Code.trimmed(), "BBB") << "as the update left another";
 }
 
+TEST_F(ChtsTest, StockDetailsShowTheSecurityOfTheChart) {
+  session->ini.PutSetting("Download", "DataService", "1");
+  session->ini.PutSetting("Download", "System", "c:\\dl\\");
+  const auto entry = [this] { return Find<QAction>(form->charts(), "cmStkDetails"); };
+  const auto reopen = [this] {
+    form->charts()->parentWidget()->close();
+    ASSERT_TRUE(WaitFor([&] { return form->charts() == nullptr; }));
+    Choose();
+  };
+  OpenCharts();
+  EXPECT_FALSE(entry()->isVisible()) << "there are no details";
+  home.Put("drive_c/dl/STKHeader.txt", "2\r\nASXCODE\r\nDescription\r\n");
+  home.Put("drive_c/dl/SecurityDetails.Stx", PadRight("BBB", 6) + PadRight("Small miner|", 306));
+  home.Put("drive_c/dl/Sdix1.inx", "BBB,1\r\n");
+  reopen();
+  ASSERT_TRUE(entry()->isVisible());
+  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  entry()->trigger();
+  auto* stock = form->findChild<QDialog*>("StockInf");
+  ASSERT_NE(stock, nullptr);
+  EXPECT_EQ(stock->windowTitle(), "BBB");
+  EXPECT_FALSE(stock->isModal());
+  // Another chart, and the form that stands follows.
+  QTest::keyClick(Picture(), Qt::Key_PageUp);
+  entry()->trigger();
+  EXPECT_EQ(stock->windowTitle(), "AAA");
+  EXPECT_EQ(form->findChildren<QDialog*>("StockInf").size(), 1);
+  session->settings.download.DataService = 2;  // a service without such details
+  reopen();
+  EXPECT_FALSE(entry()->isVisible());
+}
+
 TEST_F(ChtsTest, AnAverageSwitchedOnInTheDefaultsStandsOnTheChart) {
   Chts& charts = OpenCharts();
   ASSERT_FALSE(charts.window().Request.Ma2On);
