@@ -1,10 +1,8 @@
 #include <memory>
 #include <optional>
 
-#include "base/text.h"
 #include "koractl/options.h"
 #include "koractl/scan_output.h"
-#include "koractl/table.h"
 #include "scans/chart_scan1.h"
 #include "scans/result_list.h"
 
@@ -49,41 +47,26 @@ int RunScan1Command(const CommandLine& line, Scan1Line o) {
   if (o.sort) result.hits = SortedHits(result.hits);
   const bool any = !result.hits.empty();
   if (any)
-    Stored(run, [&] {
-      std::vector<ResultEntry> entries;
-      for (const Scan1Hit& hit : result.hits) entries.push_back({hit.code, hit.record});
-      SaveScan(run.session.files, run.dataPath(), entries);
-    });
+    Stored(run, [&] { SaveScan(run.session.files, run.dataPath(), EntriesOf(result.hits)); });
 
   held.reset();
-  ScanReport report{.title = "Chart Scan 1",
+  std::vector<std::string> columns = Scan1Columns(), oscillators;
+  columns.pop_back();  // the record numbers
+  for (const Scan1Hit& hit : result.hits) oscillators.push_back(OscillatorOf(hit));
+  return LeaveHits(run,
+                   {.report = o.report,
+                    .title = kScan1Title,
+                    .table = "Code Last Percent Stochastic Williams ROC Momentum RSI Rec",
+                    .shown = columns.size()},
+                   {.title = "Chart Scan 1",
                     .date = LatestText(result.latest),
                     .criteria = CriteriaOf(o.choices),
-                    .columns = Scan1Columns(),
+                    .columns = columns,
                     .rows = {},
                     .right = {false, true, true},
                     .notes = {},
-                    .pictures = {}};
-  report.columns.pop_back();
-  std::vector<ReportedChart> charts;
-  Table table("Code Last Percent Stochastic Williams ROC Momentum RSI Rec");
-  for (const Scan1Hit& hit : result.hits) {
-    std::vector<std::string> cells = CellsOf(hit);
-    for (const std::string& cell : cells) table.Text(cell);
-    table.EndRow();
-    charts.push_back({cells[0], OscillatorOf(hit)});
-    cells[0] = FromAnsi(cells[0]);
-    cells.pop_back();
-    report.rows.push_back(std::move(cells));
-  }
-  const std::string unread = UnreadText(result.unread);
-  if (!any) report.notes.push_back(Scan1Ending(criteria, false));
-  if (!unread.empty()) report.notes.push_back(unread);
-  const bool drawn = WriteReport(run, o.report, std::move(report), charts);
-  table.Print();
-  run.dialogs.Message(Scan1Ending(criteria, any) + (unread.empty() ? "" : "\n" + unread),
-                      kScan1Title);
-  return drawn ? kDone : kAbandoned;
+                    .pictures = {}},
+                   RowsOf(result.hits), oscillators, Scan1Ending(criteria, any), result.unread);
 }
 
 }  // namespace
@@ -94,13 +77,7 @@ void AddScan1(CLI::App& app, CommandLine& line) {
   CLI::App* command =
       app.add_subcommand("scan1", "Scan the market for rises, falls and signals of oscillators");
   const auto text = [command](const char* name, bool& tick, std::string& value, const char* about) {
-    command->add_option_function<std::string>(
-        name,
-        [&tick, &value](const std::string& given) {
-          tick = true;
-          value = given;
-        },
-        about);
+    return AddTicked(*command, name, tick, value, about);
   };
   const auto flag = [command](const char* name, bool& tick, const char* about) {
     command->add_flag(name, tick, about);

@@ -1,10 +1,8 @@
 #include <memory>
 #include <optional>
 
-#include "base/text.h"
 #include "koractl/options.h"
 #include "koractl/scan_output.h"
-#include "koractl/table.h"
 #include "scans/chart_scan2.h"
 
 namespace kora {
@@ -26,32 +24,22 @@ int RunScan2Command(const CommandLine& line, const Scan2Line& o) {
   Stored(run, [&] { SaveScan2(run.session.files, run.dataPath(), result.hits); });
 
   held.reset();
-  ScanReport report{.title = "Chart Scan 2",
+  const std::vector<std::string> columns = Scan2Columns();
+  return LeaveHits(run,
+                   {.report = o.report,
+                    .title = kScan2Title,
+                    .table = "Code Last Volume Percent",
+                    .shown = columns.size()},
+                   {.title = "Chart Scan 2",
                     .date = {},
                     .criteria = CriteriaOf(o.choices),
-                    .columns = Scan2Columns(),
+                    .columns = columns,
                     .rows = {},
                     .right = {false, true, true, true},
                     .notes = {},
-                    .pictures = {}};
-  std::vector<ReportedChart> charts;
-  Table table("Code Last Volume Percent");
-  for (const Scan2Hit& hit : result.hits) {
-    std::vector<std::string> cells = CellsOf(hit);
-    for (const std::string& cell : cells) table.Text(cell);
-    table.EndRow();
-    charts.push_back({cells[0], ""});
-    cells[0] = FromAnsi(cells[0]);
-    report.rows.push_back(std::move(cells));
-  }
-  const std::string unread = UnreadText(result.unread);
-  if (result.hits.empty()) report.notes.push_back(Scan2Ending(false));
-  if (!unread.empty()) report.notes.push_back(unread);
-  const bool drawn = WriteReport(run, o.report, std::move(report), charts);
-  table.Print();
-  run.dialogs.Message(Scan2Ending(!result.hits.empty()) + (unread.empty() ? "" : "\n" + unread),
-                      kScan2Title);
-  return drawn ? kDone : kAbandoned;
+                    .pictures = {}},
+                   RowsOf(result.hits), std::vector<std::string>(result.hits.size()),
+                   Scan2Ending(!result.hits.empty()), result.unread);
 }
 
 }  // namespace
@@ -62,13 +50,7 @@ void AddScan2(CLI::App& app, CommandLine& line) {
   CLI::App* command =
       app.add_subcommand("scan2", "Scan the market for increases in volume and moves of price");
   const auto text = [command](const char* name, bool& tick, std::string& value, const char* about) {
-    return command->add_option_function<std::string>(
-        name,
-        [&tick, &value](const std::string& given) {
-          tick = true;
-          value = given;
-        },
-        about);
+    return AddTicked(*command, name, tick, value, about);
   };
   text("--min", c.Check1, c.Text1, "Lowest closing price (0.005)");
   text("--max", c.Check1, c.Text2, "Highest closing price (1.00)");

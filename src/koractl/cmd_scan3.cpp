@@ -1,10 +1,8 @@
 #include <memory>
 #include <optional>
 
-#include "base/text.h"
 #include "koractl/options.h"
 #include "koractl/scan_output.h"
-#include "koractl/table.h"
 #include "scans/chart_scan3.h"
 #include "scans/result_list.h"
 
@@ -24,39 +22,25 @@ int RunScan3Command(const CommandLine& line, const Scan3Line& o) {
   std::optional<HomeLock::Held> held = HoldHome(run);
   const Scan3Result result =
       Scanned(run, [&](const ScanRun& scan) { return RunScan3(scan, criteria); });
-  Stored(run, [&] {
-    std::vector<ResultEntry> entries;
-    for (const Scan3Hit& hit : result.hits) entries.push_back({hit.code, hit.record});
-    SaveScan(run.session.files, run.dataPath(), entries);
-  });
+  Stored(run, [&] { SaveScan(run.session.files, run.dataPath(), EntriesOf(result.hits)); });
 
   held.reset();
-  ScanReport report{.title = "Chart Scan 3",
+  const std::vector<std::string> columns = Scan3Columns();
+  return LeaveHits(run,
+                   {.report = o.report,
+                    .title = kScan3Title,
+                    .table = "Code Last Break",
+                    .shown = columns.size()},
+                   {.title = "Chart Scan 3",
                     .date = {},
                     .criteria = CriteriaOf(o.choices),
-                    .columns = Scan3Columns(),
+                    .columns = columns,
                     .rows = {},
                     .right = {false, true},
                     .notes = {},
-                    .pictures = {}};
-  std::vector<ReportedChart> charts;
-  Table table("Code Last Break");
-  for (const Scan3Hit& hit : result.hits) {
-    std::vector<std::string> cells = CellsOf(hit);
-    for (const std::string& cell : cells) table.Text(cell);
-    table.EndRow();
-    charts.push_back({cells[0], "PARA"});
-    cells[0] = FromAnsi(cells[0]);
-    report.rows.push_back(std::move(cells));
-  }
-  const std::string unread = UnreadText(result.unread);
-  if (result.hits.empty()) report.notes.push_back(Scan3Ending(false));
-  if (!unread.empty()) report.notes.push_back(unread);
-  const bool drawn = WriteReport(run, o.report, std::move(report), charts);
-  table.Print();
-  run.dialogs.Message(Scan3Ending(!result.hits.empty()) + (unread.empty() ? "" : "\n" + unread),
-                      kScan3Title);
-  return drawn ? kDone : kAbandoned;
+                    .pictures = {}},
+                   RowsOf(result.hits), std::vector<std::string>(result.hits.size(), "PARA"),
+                   Scan3Ending(!result.hits.empty()), result.unread);
 }
 
 }  // namespace
@@ -67,13 +51,7 @@ void AddScan3(CLI::App& app, CommandLine& line) {
   CLI::App* command =
       app.add_subcommand("scan3", "Scan the market for breaks of the parabolic stop");
   const auto text = [command](const char* name, bool& tick, std::string& value, const char* about) {
-    command->add_option_function<std::string>(
-        name,
-        [&tick, &value](const std::string& given) {
-          tick = true;
-          value = given;
-        },
-        about);
+    return AddTicked(*command, name, tick, value, about);
   };
   text("--min", c.Check1, c.Text1, "Lowest closing price (0.005)");
   text("--max", c.Check1, c.Text2, "Highest closing price (1.00)");

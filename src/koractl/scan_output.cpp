@@ -7,7 +7,9 @@
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "koractl/chart_options.h"
+#include "koractl/options.h"
 #include "koractl/pictures/pictures.h"
+#include "koractl/table.h"
 #include "store/name_file.h"
 
 namespace kora {
@@ -48,6 +50,17 @@ void AddReport(CLI::App& command, std::string& folder) {
       ->type_name("FOLDER");
 }
 
+CLI::Option* AddTicked(CLI::App& command, const char* name, bool& tick, std::string& value,
+                       const char* about) {
+  return command.add_option_function<std::string>(
+      name,
+      [&tick, &value](const std::string& given) {
+        tick = true;
+        value = given;
+      },
+      about);
+}
+
 void AbandonFault(Run& run, const ScanFault& fault) { run.Abandon(fault.text, fault.title); }
 
 bool WriteReport(Run& run, const std::string& folder, ScanReport report,
@@ -75,6 +88,29 @@ bool WriteReport(Run& run, const std::string& folder, ScanReport report,
     run.AbandonFile(e, {.file = folder + "/index.html"});
   }
   return all;
+}
+
+int LeaveHits(Run& run, const HitsOutput& output, ScanReport report,
+              const std::vector<std::vector<std::string>>& rows,
+              const std::vector<std::string>& oscillators, const std::string& ending,
+              const UnreadFiles& unread) {
+  Table table(output.table);
+  std::vector<ReportedChart> charts;
+  for (size_t i = 0; i < rows.size(); ++i) {
+    for (const std::string& cell : rows[i]) table.Text(cell);
+    table.EndRow();
+    charts.push_back({rows[i][0], oscillators[i]});
+    auto& cells =
+        report.rows.emplace_back(rows[i].begin(), rows[i].begin() + std::ptrdiff_t(output.shown));
+    cells[0] = FromAnsi(cells[0]);
+  }
+  const std::string left = UnreadText(unread);
+  if (rows.empty()) report.notes.push_back(ending);
+  if (!left.empty()) report.notes.push_back(left);
+  const bool drawn = WriteReport(run, output.report, std::move(report), charts);
+  table.Print();
+  run.dialogs.Message(ending + (left.empty() ? "" : "\n" + left), output.title);
+  return drawn ? kDone : kAbandoned;
 }
 
 }  // namespace kora

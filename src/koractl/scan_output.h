@@ -15,6 +15,10 @@ namespace kora {
 // The option --report.
 void AddReport(CLI::App& command, std::string& folder);
 
+// An option whose text is that of a field, and ticks the field's box.
+CLI::Option* AddTicked(CLI::App& command, const char* name, bool& tick, std::string& value,
+                       const char* about);
+
 // Ends the operation with what stands against the choices.
 [[noreturn]] void AbandonFault(Run& run, const ScanFault& fault);
 
@@ -53,5 +57,27 @@ struct ReportedChart {
 // be drawn is told in its place. False where one was not.
 bool WriteReport(Run& run, const std::string& folder, ScanReport report,
                  const std::vector<ReportedChart>& charts);
+
+// How a scan leaves its hits.
+struct HitsOutput {
+  const std::string& report;  // folder, or empty
+  std::string_view title;     // of the closing message
+  const char* table;          // headings on standard output
+  size_t shown;               // so many of a row's cells stand on the report
+};
+// Prints the hits, whose cells are ANSI with the code first, writes the report that `report`
+// begins, and tells `ending`, which stands on a report without rows too. The exit code.
+int LeaveHits(Run& run, const HitsOutput& output, ScanReport report,
+              const std::vector<std::vector<std::string>>& rows,
+              const std::vector<std::string>& oscillators, const std::string& ending,
+              const UnreadFiles& unread);
+
+// The cells of all hits.
+template <typename Hit>
+std::vector<std::vector<std::string>> RowsOf(const std::vector<Hit>& hits) {
+  std::vector<std::vector<std::string>> rows;
+  for (const Hit& hit : hits) rows.push_back(CellsOf(hit));
+  return rows;
+}
 
 }  // namespace kora

@@ -14,6 +14,14 @@ struct ResultEntry {
   std::int32_t record = 0;  // in the name file
 };
 
+// The entries of a scan's hits.
+template <typename Hit>
+std::vector<ResultEntry> EntriesOf(const std::vector<Hit>& hits) {
+  std::vector<ResultEntry> entries;
+  for (const Hit& hit : hits) entries.push_back({hit.code, hit.record});
+  return entries;
+}
+
 // SaveScan: the entries become the list of scan results, SubListZ.Dat, in their order. The file
 // is replaced as a whole: a failure leaves the old list. Error 6 for a record number, or for more
 // entries, than 16 bits number; HomeIsHeld.

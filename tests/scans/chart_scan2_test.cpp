@@ -11,18 +11,8 @@ namespace {
 
 using Texts = std::vector<std::string>;
 
-class Scan2Test : public ScanMarket {
+class Scan2Test : public ScanOf<Scan2Choices, Scan2Criteria, ReadScan2, RunScan2> {
  protected:
-  Texts FaultOf() {
-    Scan2Criteria criteria;
-    const auto fault = ReadScan2(choices, criteria);
-    return fault ? Texts{fault->text, fault->title, fault->field} : Texts{};
-  }
-  Scan2Result Scan() {
-    Scan2Criteria criteria;
-    EXPECT_FALSE(ReadScan2(choices, criteria));
-    return RunScan2(Run(), criteria);
-  }
   // "code price vol percent"; a blank volume is "-".
   Texts Rows() {
     Texts out;
@@ -44,8 +34,6 @@ class Scan2Test : public ScanMarket {
     choices.Text3 = percent;
     choices.Text5 = days;
   }
-
-  Scan2Choices choices;
 };
 
 std::vector<PriceRec> Traded(const std::vector<std::int32_t>& volumes) {

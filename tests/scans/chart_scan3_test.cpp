@@ -11,18 +11,8 @@ namespace {
 
 using Texts = std::vector<std::string>;
 
-class Scan3Test : public ScanMarket {
+class Scan3Test : public ScanOf<Scan3Choices, Scan3Criteria, ReadScan3, RunScan3> {
  protected:
-  Texts FaultOf() {
-    Scan3Criteria criteria;
-    const auto fault = ReadScan3(choices, criteria);
-    return fault ? Texts{fault->text, fault->title, fault->field} : Texts{};
-  }
-  Scan3Result Scan() {
-    Scan3Criteria criteria;
-    EXPECT_FALSE(ReadScan3(choices, criteria));
-    return RunScan3(Run(), criteria);
-  }
   Texts Rows() {
     Texts out;
     for (const Scan3Hit& hit : Scan().hits) {
@@ -42,8 +32,6 @@ class Scan3Test : public ScanMarket {
     }
     return days;
   }
-
-  Scan3Choices choices;
 };
 
 }  // namespace

@@ -55,4 +55,23 @@ struct ScanMarket : ::testing::Test {
   std::vector<NameRec> names;
 };
 
+// A scan of that market with its choices: `Read` makes criteria of them, `Walk` runs the scan.
+template <typename Choices, typename Criteria, auto Read, auto Walk>
+struct ScanOf : ScanMarket {
+  // Text, title and field of what stands against the choices.
+  std::vector<std::string> FaultOf() {
+    Criteria criteria;
+    const auto fault = Read(choices, criteria);
+    if (!fault) return {};
+    return {fault->text, fault->title, fault->field};
+  }
+  auto Scan() {
+    Criteria criteria;
+    EXPECT_FALSE(Read(choices, criteria));
+    return Walk(Run(), criteria, {});
+  }
+
+  Choices choices;
+};
+
 }  // namespace kora::test

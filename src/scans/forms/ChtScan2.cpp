@@ -5,11 +5,7 @@
 #include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
-#include <QPointer>
-#include <QPushButton>
 
-#include "base/numbers.h"
-#include "platform/dialogs.h"
 #include "platform/qt/to_qt.h"
 
 namespace kora {
@@ -20,17 +16,12 @@ constexpr const char* kSetting = "Scan2_Other";
 }  // namespace
 
 ChtScan2::ChtScan2(ScanFormServices services, QWidget* parent)
-    : ScanForm(std::move(services), parent) {
+    : HitsForm(std::move(services), parent) {
   setObjectName("ChtScan2");
   setWindowTitle("Chart Scan 2 (Increases in Volume)");
   Scan2Choices kept;
   TakeKeptScan2(services_.user.GetSetting(kUserSection, kSetting), kept);
-  std::vector<GridColumn> columns;
-  for (const std::string& heading : Scan2Columns())
-    columns.push_back({.heading = heading, .chars = 14, .right = true, .editable = false});
-  columns[0].right = false;
-  LayOut(Criteria(kept), "List1", std::move(columns), "", rows_);
-  command1_->setText("&Scan Charts");
+  LayOutHits(Criteria(kept), Scan2Columns());
 }
 
 QWidget* ChtScan2::Criteria(const Scan2Choices& kept) {
@@ -78,42 +69,13 @@ void ChtScan2::Proceed() {
     return;
   }
   if (criteria.filter.industry) text6_->setText(ToQt(*criteria.filter.industry));
-  const QPointer<ChtScan2> here = this;
-  Scan2Result result;
-  bool done = false;
-  RunScan(ToQt(kScan2Title), [&](Progress& progress) {
-    rows_.rows.clear();
-    hits_.clear();
-    stored_ = false;
-    grid_->Refresh();
-    result = RunScan2(Scan(progress), criteria, [&](const Scan2Hit& hit) {
-      if (!here) return;
-      hits_.push_back(hit);
-      rows_.rows.push_back({CellsOf(hit)});
-      RowAdded();
-    });
-    done = true;
-  });
-  if (!here || !done) return;
-  if (result.stopped && (hits_.empty() || !AskStopped(kScan2Title))) return;
-  if (!here) return;
-  stored_ = Store(kScan2Title, [this] { SaveScan2(services_.files, dataPath(), hits_); });
-  if (!stored_ || result.stopped) return;
-  TellEnd(kScan2Title, Scan2Ending(!hits_.empty()), result.unread);
-  if (here && !hits_.empty()) grid_->setFocus();
+  ScanForHits<Scan2Result>(
+      kScan2Title,
+      [&](const ScanRun& run, const Found& found) { return RunScan2(run, criteria, found); },
+      [this] { SaveScan2(services_.files, dataPath(), hits()); }, Scan2Ending);
 }
 
-void ChtScan2::OpenRow(int row) {
-  if (panel_->running()) return;
-  if (stored_ && services_.openResult) services_.openResult(CInt(row + 1.0));
-  if (!stored_ && services_.openRecord) services_.openRecord(hits_[size_t(row)].record);
-}
-
-void ChtScan2::PrintHits() {
-  panel_->Show("PRINTING  -  WAIT");
-  services_.print(Scan2Print(hits_), this);
-  panel_->Show({});
-}
+void ChtScan2::PrintHits() { PrintTable(Scan2Print(hits())); }
 
 bool ChtScan2::Leave() {
   services_.user.PutSetting(kUserSection, kSetting, KeptScan2(Choices()));

@@ -4,11 +4,7 @@
 #include <QGridLayout>
 #include <QGroupBox>
 #include <QLineEdit>
-#include <QPointer>
-#include <QPushButton>
 
-#include "base/numbers.h"
-#include "platform/dialogs.h"
 #include "platform/qt/to_qt.h"
 
 namespace kora {
@@ -19,17 +15,12 @@ constexpr const char* kSetting = "Scan3_Other";
 }  // namespace
 
 ChtScan3::ChtScan3(ScanFormServices services, QWidget* parent)
-    : ScanForm(std::move(services), parent) {
+    : HitsForm(std::move(services), parent) {
   setObjectName("ChtScan3");
   setWindowTitle("Chart Scan 3 (Stocks breaking Parabolic Indicator)");
   Scan3Choices kept;
   TakeKeptScan3(services_.user.GetSetting(kUserSection, kSetting), kept);
-  std::vector<GridColumn> columns;
-  for (const std::string& heading : Scan3Columns())
-    columns.push_back({.heading = heading, .chars = 14, .right = true, .editable = false});
-  columns[0].right = false;
-  LayOut(Criteria(kept), "List1", std::move(columns), "", rows_);
-  command1_->setText("&Scan Charts");
+  LayOutHits(Criteria(kept), Scan3Columns());
 }
 
 QWidget* ChtScan3::Criteria(const Scan3Choices& kept) {
@@ -72,46 +63,13 @@ void ChtScan3::Proceed() {
     return;
   }
   if (criteria.filter.industry) text6_->setText(ToQt(*criteria.filter.industry));
-  const QPointer<ChtScan3> here = this;
-  Scan3Result result;
-  bool done = false;
-  RunScan(ToQt(kScan3Title), [&](Progress& progress) {
-    rows_.rows.clear();
-    hits_.clear();
-    stored_ = false;
-    grid_->Refresh();
-    result = RunScan3(Scan(progress), criteria, [&](const Scan3Hit& hit) {
-      if (!here) return;
-      hits_.push_back(hit);
-      rows_.rows.push_back({CellsOf(hit)});
-      RowAdded();
-    });
-    done = true;
-  });
-  if (!here || !done) return;
-  if (result.stopped && (hits_.empty() || !AskStopped(kScan3Title))) return;
-  if (!here) return;
-  stored_ = Store(kScan3Title, [this] {
-    std::vector<ResultEntry> entries;
-    for (const Scan3Hit& hit : hits_) entries.push_back({hit.code, hit.record});
-    SaveScan(services_.files, dataPath(), entries);
-  });
-  if (!stored_ || result.stopped) return;
-  TellEnd(kScan3Title, Scan3Ending(!hits_.empty()), result.unread);
-  if (here && !hits_.empty()) grid_->setFocus();
+  ScanForHits<Scan3Result>(
+      kScan3Title,
+      [&](const ScanRun& run, const Found& found) { return RunScan3(run, criteria, found); },
+      [this] { SaveScan(services_.files, dataPath(), EntriesOf(hits())); }, Scan3Ending);
 }
 
-void ChtScan3::OpenRow(int row) {
-  if (panel_->running()) return;
-  if (stored_ && services_.openResult) services_.openResult(CInt(row + 1.0));
-  if (!stored_ && services_.openRecord) services_.openRecord(hits_[size_t(row)].record);
-}
-
-void ChtScan3::PrintHits() {
-  panel_->Show("PRINTING  -  WAIT");
-  services_.print(Scan3Print(hits_), this);
-  panel_->Show({});
-}
+void ChtScan3::PrintHits() { PrintTable(Scan3Print(hits())); }
 
 bool ChtScan3::Leave() {
   services_.user.PutSetting(kUserSection, kSetting, KeptScan3(Choices()));

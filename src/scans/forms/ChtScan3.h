@@ -1,13 +1,12 @@
 #pragma once
 
-#include "lists/grid_source.h"
 #include "scans/chart_scan3.h"
-#include "scans/forms/scan_form.h"
+#include "scans/forms/hits_form.h"
 
 namespace kora {
 
-// "Chart Scan 2 (Increases in Volume)".
-class ChtScan3 : public ScanForm {
+// "Chart Scan 3 (Stocks breaking Parabolic Indicator)".
+class ChtScan3 : public HitsForm<Scan3Hit> {
  public:
   ChtScan3(ScanFormServices services, QWidget* parent);
 
@@ -15,15 +14,11 @@ class ChtScan3 : public ScanForm {
   void Proceed() override;
   void PrintHits() override;
   bool Leave() override;
-  void OpenRow(int row) override;
   QWidget* Criteria(const Scan3Choices& kept);
   Scan3Choices Choices() const;
 
-  TextGrid rows_;
-  std::vector<Scan3Hit> hits_;  // a row each
   QCheckBox *check1_, *check2_, *check3_, *check4_, *check5_, *check6_;
   QLineEdit *text1_, *text2_, *text3_, *text6_;
-  bool stored_ = false;  // the hits are the list of results
 };
 
 }  // namespace kora

@@ -10,6 +10,7 @@
 
 #include "chartwindow/tools/cross_hair.h"
 #include "store/name_rec.h"
+#include "tests/chartwindow/tools/small_chart.h"
 #include "tests/support/recording_surface.h"
 
 using namespace kora;
@@ -30,20 +31,9 @@ ChartBar Bar(std::string_view date, float open, float high, float low, float clo
   return bar;
 }
 
-// Left 42, spacing 4, three bars; 430 is the price 10, each unit 0.05.
+// With three bars, the second without a date.
 Composition Chart() {
-  Composition chart;
-  chart.ChartLeft = 42;
-  chart.ChartRight = 631;
-  chart.ChartTop = 45;
-  chart.ChartBottom = 430;
-  chart.VolTop = 430;
-  chart.VolBottom = 450;
-  chart.BarSpacing = 4;
-  chart.Scale.ScaleLow = 10;
-  chart.Price.ScaleLow = 10;
-  chart.Price.PricePerY = 0.05f;
-  chart.Price.ChartBottom = 430;
+  Composition chart = test::EmptyChart();
   chart.Bars.BarCount = 2;
   chart.Bars.bars = {Bar("20240103", 10.5f, 11.25f, 9.875f, 10, 1200), Bar("", 1, 1, 1, 1, 1),
                      Bar("20241231", 0.125f, 0.5f, 0.05f, 0.255f, 0)};

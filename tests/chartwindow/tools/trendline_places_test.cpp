@@ -8,26 +8,14 @@
 
 #include "base/dates.h"
 #include "base/numbers.h"
+#include "tests/chartwindow/tools/small_chart.h"
 
 namespace kora {
 namespace {
 
-// Left 42, spacing 4, a hundred bars of every second day from 1 January 2026; 430 is the price 10,
-// each unit up 0.05.
+// With a hundred bars of every second day from 1 January 2026.
 Composition Chart() {
-  Composition chart;
-  chart.ChartLeft = 42;
-  chart.ChartRight = 631;
-  chart.ChartTop = 45;
-  chart.ChartBottom = 430;
-  chart.VolTop = 430;
-  chart.VolBottom = 450;
-  chart.BarSpacing = 4;
-  chart.Scale.ScaleLow = 10;
-  chart.Scale.ScaleHigh = 0.05f;
-  chart.Price.ScaleLow = 10;
-  chart.Price.PricePerY = 0.05f;
-  chart.Price.ChartBottom = 430;
+  Composition chart = test::EmptyChart();
   const std::int32_t first = DayNumber({2026, 1, 1});
   for (int i = 0; i < 100; ++i) {
     ChartBar bar{};
