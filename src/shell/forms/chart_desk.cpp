@@ -3,6 +3,7 @@
 #include <QApplication>
 #include <QMdiArea>
 #include <QMdiSubWindow>
+#include <QTimer>
 #include <memory>
 
 #include "base/dates.h"
@@ -252,7 +253,10 @@ void ChartDesk::OpenView(int set) {
                          .state = session_.charts,
                          .VolumeUnitText = hooks_.VolumeUnitText},
                 .print = [this] { PrintView(); },
-                .openMultiOsc = [this] { OpenMultiOsc(); },
+                // The view has closed itself in the middle of an event of its menu bar, which a
+                // form that ran within that event would take away.
+                .openMultiOsc =
+                    [this] { QTimer::singleShot(0, over_, [this] { OpenMultiOsc(); }); },
                 .returned =
                     [this] {
                       if (!anal_) return;

@@ -567,6 +567,31 @@ TEST_F(ChtsTest, ASetThatIsNotMadeYetOpensItsForm) {
   EXPECT_TRUE(WaitFor([&] { return form->findChild<QMainWindow*>("Anal") == nullptr; }));
 }
 
+// The view closes itself within an event of its own menu bar, which has to be through with that
+// before it goes.
+TEST_F(ChtsTest, ChangingToASetThatIsNotMadeYetOpensItsFormBehindTheView) {
+  OpenCharts();
+  SaveMOSets(session->user, 1, {"RSI", "None", "None", "None"});
+  QTest::mouseClick(Find<QWidget>(form.get(), "mo1"), Qt::LeftButton);
+  QPointer<QMainWindow> view = form->findChild<QMainWindow*>("Anal");
+  ASSERT_NE(view, nullptr);
+  bool inKey = true, goneInKey = false, asked = false;
+  QObject::connect(view->menuBar(), &QObject::destroyed, [&] { goneInKey = inKey; });
+  QTimer closer;
+  closer.callOnTimeout([&] {
+    if (auto* sets = form->findChild<QDialog*>("MultiOsc")) {
+      asked = true;
+      sets->reject();
+    }
+  });
+  closer.start(10);
+  QTest::keyClick(view, Qt::Key_F6);
+  inKey = false;
+  EXPECT_TRUE(WaitFor([&] { return asked && !view; }));
+  EXPECT_FALSE(goneInKey);
+  EXPECT_EQ(dialogs.said.back().text, "No oscillators have been set");
+}
+
 TEST_F(ChtsTest, LeavingTheChartsLeavesTheViewToo) {
   OpenCharts();
   SaveMOSets(session->user, 1, {"RSI", "None", "None", "None"});
