@@ -150,6 +150,7 @@ class DemoWriter {
   std::vector<Random> randoms_;                 // of the shares
   std::vector<std::vector<RightPlan>> rights_;  // by share
   std::vector<Entry> entries_;
+  std::string bulletins_;             // of the days so far
   std::vector<std::string> leaders_;  // the words of their names
   std::vector<std::string> leaderCodes_;
   MarketSums sums_{days_.count()};
@@ -466,6 +467,9 @@ void DemoWriter::WriteBulletins(const std::string& base, int day) {
       break;
   }
   WriteFile(InPath() + base + ".Asx.Btn", text);
+  // The service of mainfiles has one bulletin, without a day in its name.
+  bulletins_ += text;
+  WriteFile(InPath() + ".Asx.Btn", bulletins_);
 }
 
 void DemoWriter::WriteLists() {

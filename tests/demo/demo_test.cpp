@@ -531,6 +531,16 @@ TEST(Demo, BulletinsOfThreeDaysHaveEveryKindOfEvent) {
   EXPECT_EQ(acts, (std::set<std::string>{"BI", "DC", "DI", "EN", "NC", "NI", "NL", "PC", "SP"}));
 }
 
+// With the service that the demo market starts with, the update itself fills the list.
+TEST(Demo, TheBulletinOfItsServiceHasThemAll) {
+  const Market market(kMarkets[0]);
+  const std::string in = "drive_c/korawin/download/in/";
+  std::string all;
+  for (const char* day : {"02NOV26", "03NOV26", "04NOV26"})
+    all += market.home.Get(in + day + ".Asx.Btn");
+  EXPECT_EQ(market.home.Get(in + ".Asx.Btn"), all);
+}
+
 TEST(Demo, ThreeDaysOfDownloadsCoverTheWholeMarket) {
   for (const DemoOptions& options : kMarkets) {
     const Market market(options);

@@ -3,6 +3,7 @@
 #include <QComboBox>
 #include <QFontDatabase>
 #include <QGridLayout>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QPushButton>
 
@@ -26,6 +27,14 @@ AdjDate::AdjDate(const AdjustmentDates& dates, std::function<void(int)> chosen, 
   grid->addWidget(combo1, 1, 0);
   grid->setRowStretch(2, 1);
   connect(combo1, &QComboBox::currentIndexChanged, this, std::move(chosen));
+}
+
+// Enter is done with the list: what was chosen stays.
+void AdjDate::keyPressEvent(QKeyEvent* event) {
+  if (event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter)
+    accept();
+  else
+    QDialog::keyPressEvent(event);
 }
 
 }  // namespace kora

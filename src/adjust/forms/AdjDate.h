@@ -12,6 +12,9 @@ namespace kora {
 class AdjDate : public QDialog {
  public:
   AdjDate(const AdjustmentDates& dates, std::function<void(int)> chosen, QWidget* parent);
+
+ protected:
+  void keyPressEvent(QKeyEvent* event) override;
 };
 
 }  // namespace kora

@@ -82,7 +82,10 @@ AdjList::AdjList(AdjListServices services, QWidget* parent)
   ss1_->setAccessibleName("Adjustments list");
   ss1_->SetZoom(services_.settings.Zoom);
   ss1_->SetDeletable(true);
-  ss1_->changed = [this] { changed_ = true; };
+  ss1_->changed = [this] {
+    changed_ = true;
+    ShowRows();
+  };
   auto* hint = new QLabel(kHint, this);
   hint->setObjectName("Label1");
   panel_ = new WorkPanel(this);
@@ -183,6 +186,13 @@ void AdjList::ShowColumns() {
   size_t most = kShownColumns;
   for (const AdjustRow& row : rows_) most = std::max(most, row.fields.size());
   for (size_t i = kShownColumns; i < kAdjustColumns; ++i) ss1_->SetColumnShown(int(i), i < most);
+  ShowRows();
+}
+
+// The one row of an empty list has the width of them all for what it says.
+void AdjList::ShowRows() {
+  ss1_->clearSpans();
+  if (rows_.empty()) ss1_->setSpan(0, 0, 1, int(kShownColumns));
   ss1_->Refresh();
 }
 
@@ -227,7 +237,7 @@ void AdjList::RemoveMarked() {
     rows_ = ReadAdjustList(services_.files, folder_);
     stamp_ = services_.files.Stamp(AdjustListPath(folder_));
     changed_ = false;
-    ss1_->Refresh();
+    ShowRows();
   });
 }
 
@@ -251,7 +261,7 @@ void AdjList::Make() {
     });
   });
   services_.dialogs.SetBusy(false);
-  ss1_->Refresh();
+  ShowRows();
   if (!result.begun) return;
   stamp_ = services_.files.Stamp(AdjustListPath(folder_));
   changed_ = false;

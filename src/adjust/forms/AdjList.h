@@ -52,6 +52,7 @@ class AdjList : public QDialog {
   void Make();
   void Print();
   void ShowColumns();
+  void ShowRows();
   // Runs `work`; what fails is told. False then.
   bool Tell(const std::function<void()>& work);
 

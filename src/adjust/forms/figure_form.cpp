@@ -115,6 +115,7 @@ void FigureForm::Forget() {
   AdjRecNo_ = 0;
   if (list_) list_->close();
   check_->setEnabled(true);
+  check_->setDefault(true);
   adjust_->setEnabled(false);
 }
 
@@ -137,6 +138,7 @@ void FigureForm::CheckDate() {
   list_->move(below.left(), below.bottom() + style()->pixelMetric(QStyle::PM_TitleBarHeight));
   LineChosen(int(work_.dates().Selected));
   adjust_->setEnabled(true);
+  adjust_->setDefault(true);
   check_->setEnabled(false);
 }
 

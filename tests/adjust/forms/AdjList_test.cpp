@@ -82,6 +82,7 @@ TEST_F(AdjListTest, AnEmptyListSaysSoAndTakesNothing) {
   ASSERT_TRUE(Open(""));
   EXPECT_EQ(Rows()->model()->rowCount(), 1);
   EXPECT_EQ(Cell(0, 0), "There is no bulletin data");
+  EXPECT_EQ(Rows()->columnSpan(0, 0), 10);  // with room to be read
   TypeInto(0, 0, "BI");
   QTest::keyClick(QApplication::focusWidget(), Qt::Key_Escape);
   EXPECT_EQ(Cell(0, 0), "There is no bulletin data");

@@ -1,6 +1,7 @@
 #include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
+#include <QPointer>
 #include <QPushButton>
 #include <QRadioButton>
 
@@ -144,6 +145,24 @@ TEST_F(AdjustForms, ABonusIssueIsCheckedChosenAndCarriedOut) {
   EXPECT_EQ(adjusted, 1);
   EXPECT_FALSE(bonus->isVisible());
   EXPECT_TRUE(form->isVisible());
+}
+
+TEST_F(AdjustForms, EnterChecksTheDateTakesItAndAdjusts) {
+  Open();
+  QDialog* bonus = OpenKind(1, "AdjustB");
+  Type(bonus, "Text1", "1");
+  Type(bonus, "Text2", "4");
+  Type(bonus, "Text3", "22-9-98");
+  QTest::keyClick(Find<QLineEdit>(bonus, "Text3"), Qt::Key_Return);
+  QPointer<QDialog> list = Find<QDialog>(bonus, "AdjDate");
+  ASSERT_NE(list, nullptr);
+  QTest::keyClick(Find<QComboBox>(list, "Combo1"), Qt::Key_Up);
+  QTest::keyClick(Find<QComboBox>(list, "Combo1"), Qt::Key_Return);
+  EXPECT_TRUE(WaitFor([&] { return !list; }));
+  EXPECT_TRUE(dialogs.said.empty());
+  QTest::keyClick(Find<QLineEdit>(bonus, "Text3"), Qt::Key_Return);
+  ExpectSaid("Adjustments made to\nORE", "Data Adjustments");
+  EXPECT_EQ(Record("ORE", 21).AdjFactor, 0.8f);
 }
 
 TEST_F(AdjustForms, ASplitsLookUpIsThatOfABonusIssueAndTellsNoDate) {
