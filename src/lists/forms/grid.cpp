@@ -215,10 +215,13 @@ Grid::Grid(GridSource& source, GridServices services, std::vector<GridColumn> co
   });
   connect(horizontalHeader(), &QHeaderView::sectionClicked, this, [this](int column) {
     if (!sortable_ || !EndEdit()) return;
+    // The press has selected the whole column, which what comes next would take for all rows:
+    // in the end one cell is.
     const bool descending = column == sorted_ && !descending_;
     try {
       if (!source_.Sort(column, descending)) {
         ShowSort();
+        GoTo(0, column);
         return;
       }
     } catch (const RunTimeError& e) {
@@ -230,6 +233,7 @@ Grid::Grid(GridSource& source, GridServices services, std::vector<GridColumn> co
     descending_ = descending;
     ShowSort();
     Refresh();
+    GoTo(0, column);
     Changed();
   });
   connect(this, &QTableView::doubleClicked, this, [this](const QModelIndex& index) {

@@ -413,10 +413,12 @@ TEST_F(GridTest, AHeadingAsksTheSourceToSort) {
   click(0);
   EXPECT_EQ(sorted.Text(0, 0), "A");
   EXPECT_EQ(changes, 1);
+  EXPECT_EQ(grid->SelectedRows(), (RowBlock{0, 0})) << "a deletion would take all rows";
   click(0);
   EXPECT_EQ(sorted.Text(0, 0), "B");
   click(1);
   EXPECT_EQ(changes, 2);
+  EXPECT_EQ(grid->SelectedRows(), (RowBlock{0, 0}));
   form.reset();
 }
 
