@@ -1,5 +1,6 @@
 #include "companies/forms/StockInf.h"
 
+#include <QEvent>
 #include <QHBoxLayout>
 #include <QHeaderView>
 #include <QLabel>
@@ -48,11 +49,10 @@ StockInf::StockInf(CompanyFormServices services, QWidget* parent)
 
 StockInf::~StockInf() {
   try {
-    const std::string text = WidthsText(listView1_->Widths());
-    if (store_ && services_.files.CheckFile(WidthsFile()) == false)
-      services_.files.WriteAll(WidthsFile(), text + "\r\n");
-    else if (store_ && services_.files.ReadAll(WidthsFile(), kLargestWidths) != text + "\r\n")
-      services_.files.WriteAll(WidthsFile(), text + "\r\n");
+    const std::string text = WidthsText(listView1_->Widths()) + "\r\n";
+    if (store_ && (!services_.files.CheckFile(WidthsFile()) ||
+                   services_.files.ReadAll(WidthsFile(), kLargestWidths) != text))
+      services_.files.WriteAll(WidthsFile(), text);
   } catch (const RunTimeError&) {
     // Widths that can't be kept are those of before, the next time.
   }
@@ -79,7 +79,15 @@ bool StockInf::Fill() {
   return true;
 }
 
+bool StockInf::event(QEvent* event) {
+  if (event->type() == QEvent::WindowActivate && store_ && services_.currentCode &&
+      services_.currentCode() != onChart_)
+    Show(services_.currentCode());
+  return QDialog::event(event);
+}
+
 void StockInf::Show(const std::string& code) {
+  if (services_.currentCode) onChart_ = services_.currentCode();
   code_ = UCase(Trim(code));
   setWindowTitle(ToQt(code_));
   text1_->setText(ToQt(code_));

@@ -19,9 +19,11 @@ struct CompanyFormServices {
   std::function<void(const TextTable&, QWidget* over)> print = {};
   std::function<void()> namesChanged = {};  // the name file took a detail
   std::function<int(QWidget* over)> changeSize = {};
+  std::function<std::string()> currentCode = {};  // of the security on the chart
 };
 
-// The details of one company. A click on a line offers it to the name file.
+// The details of one company. A click on a line offers it to the name file. It follows the chart when
+// it becomes the active window.
 class StockInf : public QDialog {
  public:
   StockInf(CompanyFormServices services, QWidget* parent);
@@ -32,6 +34,9 @@ class StockInf : public QDialog {
   // Shows the company of a code, trimmed; its title is the code.
   void Show(const std::string& code);
 
+ protected:
+  bool event(QEvent* event) override;
+
  private:
   void Offer(int row);
   std::string WidthsFile() const;
@@ -39,6 +44,7 @@ class StockInf : public QDialog {
   CompanyFormServices services_;
   std::optional<CompanyStore> store_;
   std::string code_;
+  std::string onChart_;  // when it last looked
   TextGrid rows_;
   QLineEdit* text1_;
   Grid* listView1_;

@@ -15,7 +15,8 @@ CompanyFormServices CompanyDesk::Services() const {
           .user = session_.user,
           .print = hooks_.printTable,
           .namesChanged = hooks_.namesChanged,
-          .changeSize = hooks_.changeSize};
+          .changeSize = hooks_.changeSize,
+          .currentCode = [this] { return std::string(session_.current.Rec.Code.trimmed()); }};
 }
 
 void CompanyDesk::OpenCompanies() {

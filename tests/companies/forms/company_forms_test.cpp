@@ -83,6 +83,27 @@ TEST_F(CompanyFormsTest, DetailsOfACodeAreShownAndOfferedToTheNameFile) {
   EXPECT_EQ(Cell(grid, 0, 0), "No details for XYZ");
 }
 
+TEST_F(CompanyFormsTest, DetailsFollowTheChartWhenTheirFormIsActivated) {
+  std::string onChart = "BHP";
+  CompanyFormServices services = Services();
+  services.currentCode = [&] { return onChart; };
+  StockInf& stock = Stand(std::make_unique<StockInf>(services, nullptr));
+  ASSERT_TRUE(stock.Fill());
+  stock.Show(onChart);
+  const auto activate = [&] {
+    QEvent event(QEvent::WindowActivate);
+    QApplication::sendEvent(&stock, &event);
+  };
+  Type("Text1", "XYZ");
+  QTest::keyClick(Text("Text1"), Qt::Key_Return);
+  activate();
+  EXPECT_EQ(stock.windowTitle(), "XYZ") << "the chart is the same";
+  onChart = "AAA";
+  activate();
+  EXPECT_EQ(stock.windowTitle(), "AAA");
+  EXPECT_EQ(Cell(On<QTableView>("ListView1"), 0, 1), "Small miner");
+}
+
 TEST_F(CompanyFormsTest, ADeniedTransferLeavesTheNameFile) {
   StockInf& stock = Stand(std::make_unique<StockInf>(Services(), nullptr));
   ASSERT_TRUE(stock.Fill());
