@@ -737,14 +737,14 @@ TEST_F(ChtsTest, StockDetailsShowTheSecurityOfTheChart) {
   home.Put("drive_c/dl/Sdix1.inx", "BBB,1\r\n");
   reopen();
   ASSERT_TRUE(entry()->isVisible());
-  QTest::keyClick(Picture(), Qt::Key_PageDown);
+  QTest::keyClick(Picture(), Qt::Key_PageDown, Qt::ControlModifier);
   entry()->trigger();
   auto* stock = form->findChild<QDialog*>("StockInf");
   ASSERT_NE(stock, nullptr);
   EXPECT_EQ(stock->windowTitle(), "BBB");
   EXPECT_FALSE(stock->isModal());
   // Another chart, and the form that stands follows.
-  QTest::keyClick(Picture(), Qt::Key_PageUp);
+  QTest::keyClick(Picture(), Qt::Key_PageUp, Qt::ControlModifier);
   entry()->trigger();
   EXPECT_EQ(stock->windowTitle(), "AAA");
   EXPECT_EQ(form->findChildren<QDialog*>("StockInf").size(), 1);
