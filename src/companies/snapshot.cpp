@@ -167,7 +167,7 @@ std::optional<Holding> HoldingOf(const SnapshotRow& row) {
   h.previous = Val(row.prices[3]);
   h.previousValue = h.units * h.previous;
   h.value = h.units * h.price;
-  h.gain = h.value - h.units * h.cost;
+  if (!row.prices[0].empty()) h.gain = h.value - h.units * h.cost;
   h.dividends = h.units * Val(row.dividend);
   return h;
 }

@@ -83,7 +83,7 @@ struct Holding {
   double units = 0, cost = 0;           // of a unit
   double price = 0, previous = 0;       // last price, close of the day before
   double previousValue = 0, value = 0;  // of all units
-  double gain = 0;                      // value less cost of all units
+  double gain = 0;                      // value less cost of all units; 0 before there is a price
   double dividends = 0;                 // of a year
 };
 // Nothing where no units are held.

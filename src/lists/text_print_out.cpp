@@ -87,7 +87,10 @@ std::string TextPrintOut::Cut(const std::string& text, double room) const {
 void TextPrintOut::PrintLine(const std::vector<std::string>& texts) {
   for (size_t i = 0; i < texts.size() && i < layout_.at.size(); ++i) {
     const double from = layout_.at[i] * width_;
-    const double to = i + 1 < layout_.at.size() ? layout_.at[i + 1] * width_ : width_;
+    // Up to the next column of this line that has a text.
+    size_t next = i + 1;
+    while (next < layout_.at.size() && (next >= texts.size() || texts[next].empty())) ++next;
+    const double to = next < layout_.at.size() ? layout_.at[next] * width_ : width_;
     const std::string text = Cut(texts[i], to - from);
     if (text.empty()) continue;
     printer_.SetCurrent(left_ + from, y_);

@@ -199,6 +199,8 @@ TEST_F(SnapshotTest, HoldingsAreWorthUnitsTimesPrice) {
   rows[2].prices[0] = "2";
   EXPECT_DOUBLE_EQ(Totals(rows).value, 970);
   EXPECT_DOUBLE_EQ(Totals(rows).gain, 160);
+  rows[2].prices[0] = "";  // before the first fetch nothing is lost
+  EXPECT_DOUBLE_EQ(Totals(rows).gain, 150);
 }
 
 }  // namespace

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include "tests/support/error_of.h"
 #include "tests/support/recording_printer.h"
 #include "tests/support/temp_home.h"
@@ -88,6 +90,19 @@ TEST(TextPrintOutTest, TextsTooWideForTheirColumnAreCutAtWholeCharacters) {
   const Ops& ops = f.printer.sent.at(0);
   EXPECT_EQ(ops[2], "text 10 506,700 ABC 0");
   EXPECT_EQ(ops[4], "text 10 10206,700 a\xC3\xA9 0");
+}
+
+TEST(TextPrintOutTest, ATextHasTheRoomOfTheEmptyColumnsBehindIt) {
+  PrintOutFixture f;
+  f.layout.at = {0, 0.03, 0.97};
+  TextPrintOut out(f.printer, f.fonts, f.page, f.layout);
+  out.Line({"ABCDEF"});
+  out.Line({"ABCDEF", "", "x"});
+  out.End();
+  const Ops& ops = f.printer.sent.at(0);
+  EXPECT_TRUE(ops[2].ends_with(" ABCDEF 0")) << ops[2];
+  EXPECT_TRUE(std::any_of(ops.begin() + 3, ops.end(),
+                          [](const std::string& op) { return op.ends_with(" ABCDEF 0"); }));
 }
 
 TEST(TextPrintOutTest, WhatIsNotEndedIsNotSent) {
