@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cstring>
+
 #include "lists/chart_list.h"
 #include "tests/support/failing_io.h"
 #include "tests/support/records.h"
@@ -76,6 +78,21 @@ TEST_F(NameEditorTest, SavesInOrderOfCategoryAndShowsThatOrder) {
   EXPECT_EQ(Shown(), "BBB.AAA.CCC.");
   EXPECT_FALSE(editor.changed());
   EXPECT_EQ(home.Get("drive_c/korawin/data/names.bak"), old);
+}
+
+// Another program fills its blanks in its own way, and has bytes where this one has none.
+TEST_F(NameEditorTest, AForeignFileKeepsWhatNoCellShows) {
+  std::vector<NameRec> rows{Security("AAA", 1), Security("BBB", 1), Security("CCC", 1)};
+  const auto bytes = [](NameRec& rec) { return reinterpret_cast<char*>(&rec); };
+  std::memcpy(bytes(rows[0]) + 10, "Caf\xE9\0\x01\0 x", 9);  // behind the name
+  std::memcpy(bytes(rows[1]) + 90, "\x01\x02\xFF\0Z ", 6);   // what is kept free
+  std::memset(bytes(rows[2]) + 45, 0, 15);                   // details of nothing
+  rows[2].BandUp = -7;
+  Put(rows);
+  ASSERT_FALSE(editor.Put(1, C::kDetails, "Float"));
+  ASSERT_TRUE(editor.SaveNames().saved);
+  rows[1].OtherDetails.set("Float");
+  EXPECT_EQ(home.Get(kHost), Bytes(rows));
 }
 
 // Lists go by record numbers, which a save deals anew.
