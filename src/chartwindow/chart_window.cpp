@@ -1091,9 +1091,13 @@ void ChartWindow::RemoveAllTrendlines() {
 void ChartWindow::HitTrendlines(const ToolPoint& at) {
   if (!toolView_.Readable() || at.pane != Pane::kPrice || !services_.popUpTrend) return;
   Surface& price = services_.price;
+  // The edges of a sloped line are blended with what is there, and of another colour below it a trace
+  // would stay: drawn this often it is covered.
+  constexpr int kCovering = 5;
   const auto draw = [&](const TrendlineRow& row, Colour colour) {
+    const int times = row.x1 != row.x2 && row.y1 != row.y2 ? kCovering : 1;
     if (tool_) tool_->Hide();
-    price.Line(row.x1, row.y1, row.x2, row.y2, colour);
+    for (int i = 0; i < times; ++i) price.Line(row.x1, row.y1, row.x2, row.y2, colour);
     if (tool_) tool_->Show();
     toolView_.Touched(price, row.x1, row.y1, row.x2, row.y2);
   };

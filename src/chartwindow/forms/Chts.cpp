@@ -453,6 +453,8 @@ void Chts::EnableEntries() {
 void Chts::Trigger(const std::string& entry) {
   const QPointer<Chts> alive(this);
   if (const auto deed = DeedOf(entry); deed && !busy_) deed();
+  // The keys of a tool are for the picture, also where a button of the tool bar has put it on.
+  if (alive && window_.ToolOn() && !picture1_->hasFocus()) picture1_->setFocus();
   // A click has flipped the tick of the entry already; what it says is the window's to tell.
   if (alive) ShowView();
 }

@@ -1051,6 +1051,27 @@ TEST_F(ChtsToolsTest, ALineIsDrawnByTwoClicksAndDeletedByTheRightButton) {
   EXPECT_TRUE(shown);
   ASSERT_EQ(home.Get(file).size(), 27u);
   EXPECT_EQ(home.Get(file)[0], 0) << "an empty slot";
+  // Nothing that an eye could see is left of it where there was nothing else.
+  const QImage after = Shown();
+  const QRgb ground = QtSurface::Rgb(session->colours[kBackground]);
+  int traces = 0;
+  for (int y = 0; y < after.height(); ++y)
+    for (int x = 0; x < after.width(); ++x) {
+      if ((before.pixel(x, y) | 0xFF000000) != ground) continue;
+      const QRgb now = after.pixel(x, y);
+      traces += std::abs(qRed(now) - qRed(ground)) > 12 ||
+                std::abs(qGreen(now) - qGreen(ground)) > 12 ||
+                std::abs(qBlue(now) - qBlue(ground)) > 12;
+    }
+  EXPECT_EQ(traces, 0);
+}
+
+TEST_F(ChtsToolsTest, AToolThatAButtonPutsOnByKeyHasTheKeys) {
+  Open();
+  Button("tline")->setFocus();
+  QTest::keyClick(Button("tline"), Qt::Key_Space);
+  EXPECT_TRUE(Button("tline")->isChecked());
+  EXPECT_TRUE(Picture()->hasFocus());
 }
 
 TEST_F(ChtsToolsTest, ABandThatIsGivenUpLeavesThePictureItFound) {
