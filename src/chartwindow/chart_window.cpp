@@ -1091,16 +1091,18 @@ void ChartWindow::RemoveAllTrendlines() {
 void ChartWindow::HitTrendlines(const ToolPoint& at) {
   if (!toolView_.Readable() || at.pane != Pane::kPrice || !services_.popUpTrend) return;
   Surface& price = services_.price;
-  // The edges of a sloped line are blended with what is there, and of another colour below it a trace
-  // would stay: drawn this often it is covered.
-  constexpr int kCovering = 5;
-  const auto draw = [&](const TrendlineRow& row, Colour colour) {
-    const int times = row.x1 != row.x2 && row.y1 != row.y2 ? kCovering : 1;
+  const auto draw = [&](const TrendlineRow& row, Colour colour, int times = 1, int width = 1) {
     if (tool_) tool_->Hide();
+    price.SetDrawWidth(width);
     for (int i = 0; i < times; ++i) price.Line(row.x1, row.y1, row.x2, row.y2, colour);
+    price.SetDrawWidth(1);
     if (tool_) tool_->Show();
     toolView_.Touched(price, row.x1, row.y1, row.x2, row.y2);
   };
+  // The edges of a sloped line are blended with what is there, and traces of another colour below it
+  // would stay: drawn this often it covers them, and in three units it takes them all away.
+  constexpr int kCovering = 5, kErasing = 3;
+  const auto sloped = [](const TrendlineRow& row) { return row.x1 != row.x2 && row.y1 != row.y2; };
   const ChartColours& colours = services_.colours;
   std::optional<TrendlineRow> moved;
   for (size_t i = 0; i < rows_.size(); ++i) {
@@ -1110,20 +1112,20 @@ void ChartWindow::HitTrendlines(const ToolPoint& at) {
     const TrendChoice choice = services_.popUpTrend();
     if (choice == TrendChoice::kDelete) {
       draw(row, colours[colours[kTrendlines] == colours[14] ? 15 : 14]);
-      draw(row, colours[kBackground]);
+      draw(row, colours[kBackground], 1, sloped(row) ? kErasing : 1);
       try {
         DeleteTrendline(
             services_.files,
             TrendlinePath(services_.settings.paths.ChartMiscPath, Request.Name.Code.trimmed()),
             std::int32_t(i) + 1);
       } catch (const RunTimeError& e) {
-        draw(row, colours[kTrendlines]);
+        draw(row, colours[kTrendlines], sloped(row) ? kCovering : 1);
         dialogs_.Message(e.what(), "Trendline");
         break;
       }
       continue;
     }
-    draw(row, colours[kTrendlines]);
+    draw(row, colours[kTrendlines], sloped(row) ? kCovering : 1);
     if (choice == TrendChoice::kMove) moved = row;
   }
   if (!moved) return;
