@@ -70,7 +70,8 @@ int Lines(const CommandLine& line, const LineOptions& o) {
   } catch (const RunTimeError& e) {
     run.Abandon(e.what(), kTitle);
   }
-  return kDone;
+  // What was told kept it from being saved.
+  return run.dialogs.said() ? kAbandoned : kDone;
 }
 
 }  // namespace

@@ -86,7 +86,8 @@ int Notes(const CommandLine& line, const NoteOptions& o) {
   } catch (const RunTimeError& e) {
     run.Abandon(e.what(), kTitle);
   }
-  return kDone;
+  // What was told kept it from being saved.
+  return run.dialogs.said() ? kAbandoned : kDone;
 }
 
 }  // namespace

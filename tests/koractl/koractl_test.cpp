@@ -480,6 +480,13 @@ TEST_F(MarksCommandTest, LinesAreDrawnShownDeletedAndCompacted) {
   EXPECT_EQ(Out(lines), header);
 }
 
+TEST_F(MarksCommandTest, AMarkThatCantBeSavedEndsWithOne) {
+  const std::string misc = "kora/drive_c/korawin/chtmisc/";
+  for (const char* file : {".TND", ".Txt"}) home.Put(misc + code + file + "/folder", "");
+  ExpectAbandoned({"lines", code, "add", "--at", "100,200,300,150"}, "[Trendline] ");
+  ExpectAbandoned({"notes", code, "add", "--at", "200,120", "Bought"}, "] ");
+}
+
 TEST_F(MarksCommandTest, TextsLevelsAndAZoomFromAShell) {
   EXPECT_EQ(Out({"notes", code}), "Date\tPrice\tText\tColour\n");
   Out({"notes", code, "add", "--at", "200,120", "Bought, here"});
