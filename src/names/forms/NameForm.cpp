@@ -3,6 +3,7 @@
 #include <QHeaderView>
 #include <QMenuBar>
 #include <QScreen>
+#include <QScrollBar>
 #include <QShortcut>
 #include <QVBoxLayout>
 
@@ -172,6 +173,7 @@ bool NameForm::Fill() {
   }
   ss1_->Refresh();
   ss1_->GoTo(0, kCodeColumn);
+  ss1_->horizontalScrollBar()->setValue(0);  // the numbers in sight, however narrow the grid was
   ShowCount();
   return true;
 }
