@@ -45,6 +45,7 @@ void DataDesk::OpenCodes(QWidget* over, std::function<void(const std::string& co
     throw;
   }
   form->open();
+  form->move(over_->mapToGlobal(QPoint(0, 0)));
 }
 
 void DataDesk::View(const CodeSelection& selection, QWidget* over) {
