@@ -177,6 +177,17 @@ void Files::Note(const std::string& host, bool added, std::int64_t before) const
   folder.own = true;
 }
 
+std::int64_t Files::NoteTemporary(const std::string& hostFolder, std::int64_t before) const {
+  const std::int64_t after = Modified(hostFolder);
+  const auto it = listings_.find(hostFolder);
+  if (it != listings_.end() && it->second->modified == before) {
+    it->second->modified = after;
+    it->second->sure = false;
+    it->second->own = true;
+  }
+  return after;
+}
+
 std::string Files::ResolveFolder(std::string_view dosFolder) const {
   const auto known = folders_.find(dosFolder);
   if (known != folders_.end()) return known->second.host;

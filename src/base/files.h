@@ -101,6 +101,9 @@ class Files {
                                bool making) const;
   std::string ResolveFolder(std::string_view dosFolder) const;
   void Note(const std::string& host, bool added, std::int64_t before) const;
+  // The folder changed by temporary files alone: a listing that was true before holds still.
+  // Returns the folder's time now.
+  std::int64_t NoteTemporary(const std::string& hostFolder, std::int64_t before) const;
   std::int64_t Modified(const std::string& host) const;
 
   std::string home_;

@@ -47,18 +47,11 @@ std::unique_ptr<HostFile> OpenTemporary(Io& io, const std::string& host, std::st
   }
 }
 
-void Copy(Io& io, const std::string& from, const std::string& to) {
-  constexpr size_t kBlock = 1 << 20;
+void CopyHostFile(Io& io, const std::string& from, const std::string& to) {
   const auto source = io.Open(from, OpenMode::kRead);
   const auto copy = io.Open(to, OpenMode::kNew);
   copy->TakeAccess(io.Status(from));
-  std::string block(kBlock, '\0');
-  for (std::uint64_t at = 0;;) {
-    const size_t got = source->ReadAt(at, block.data(), block.size());
-    if (got == 0) break;
-    copy->WriteAt(at, block.data(), got);
-    at += got;
-  }
+  copy->CopyFrom(*source);
   copy->Flush();
 }
 
@@ -159,11 +152,32 @@ void HostFileSet::Rename(std::string from, std::string to) {
                     .aside = std::move(aside)});
 }
 
-void HostFileSet::StageOne(Step& step, bool flush) {
+std::uint64_t HostFileSet::Copy(const std::string& from, std::string path) {
+  const auto source = io_.Open(from, OpenMode::kRead);
+  Write(std::move(path), {});
+  Step& step = steps_.back();
+  try {
+    OpenStaged(step);
+    const std::uint64_t bytes = step.making->CopyFrom(*source);
+    step.flushed = false;
+    step.making.reset();
+    return bytes;
+  } catch (...) {
+    if (step.staged) Quietly([&] { io_.Remove(step.temporary); });
+    steps_.pop_back();
+    throw;
+  }
+}
+
+void HostFileSet::OpenStaged(Step& step) {
   const HostStatus old = io_.Status(step.path);
   step.making = OpenTemporary(io_, step.path, step.temporary);
   step.staged = true;
   if (old.exists) step.making->TakeAccess(old);
+}
+
+void HostFileSet::StageOne(Step& step, bool flush) {
+  OpenStaged(step);
   step.making->WriteAt(0, step.bytes.data(), step.bytes.size());
   if (flush) step.making->Flush();
   step.bytes = {};
@@ -171,14 +185,20 @@ void HostFileSet::StageOne(Step& step, bool flush) {
 }
 
 void HostFileSet::Stage() {
-  const auto waits = [](const Step& step) { return step.kind == Kind::kWrite && !step.staged; };
+  const auto waits = [](const Step& step) {
+    return step.kind == Kind::kWrite && !(step.staged && step.flushed);
+  };
   try {
     // One wait for the disk costs less than one for each of many files.
     const bool many = std::count_if(steps_.begin(), steps_.end(), waits) >= kManyFiles;
     std::set<std::string> folders;
     for (Step& step : steps_) {
       if (!waits(step)) continue;
-      StageOne(step, !many);
+      if (!step.staged)
+        StageOne(step, !many);
+      else if (!many)
+        io_.Open(step.temporary, OpenMode::kReadWrite)->Flush();
+      step.flushed = true;
       if (many) folders.insert(HostFolderOf(step.path));
     }
     for (const std::string& folder : folders) io_.FlushDisk(folder);
@@ -196,7 +216,7 @@ void HostFileSet::KeepAside(Step& step, const std::string& path) {
   } catch (const RunTimeError& e) {
     if (e.number() == kDiskFull) throw;
     step.kept = true;  // a copy that fails half-way is to be cleared away
-    Copy(io_, path, step.aside);
+    CopyHostFile(io_, path, step.aside);
   }
   step.kept = true;
 }

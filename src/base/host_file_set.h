@@ -40,11 +40,15 @@ class HostFileSet {
 
   // Each only notes what is to be done; nothing is changed yet. Error 75 as above.
   void Write(std::string path, std::string bytes);
+  // The bytes of another file: they are copied to the temporary file at once, unflushed, so that
+  // thousands of large files take no memory. How many. A failure leaves what the set has so far.
+  // Called under the home's lock.
+  std::uint64_t Copy(const std::string& from, std::string path);
   void Remove(std::string path);                  // nothing where it is not there by then
   void Rename(std::string from, std::string to);  // replaces `to`
 
-  // Writes the bytes noted so far to their temporary files, and frees their memory. Commit does
-  // it for those that are left.
+  // Writes the bytes noted so far to their temporary files, frees their memory, and returns once
+  // they and the copies are on the disk. Commit does it for those that are left.
   void Stage();
   void Commit();
 
@@ -61,10 +65,12 @@ class HostFileSet {
     std::unique_ptr<HostFile> making = {};  // the temporary file of a set of one, locked
     std::string aside;                      // where the file that gives way is kept meanwhile
     bool staged = false;                    // the temporary file is there
+    bool flushed = true;                    // ... and on the disk
     bool kept = false;                      // the file that gave way is at `aside`
     bool done = false;
   };
 
+  void OpenStaged(Step& step);
   void StageOne(Step& step, bool flush);
   void Perform(Step& step);
   void KeepAside(Step& step, const std::string& path);

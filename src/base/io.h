@@ -36,10 +36,17 @@ class HostFile {
   virtual std::uint64_t Size() = 0;  // bytes
   // Cuts the file to `size` bytes, or fills it up with zeros.
   virtual void Truncate(std::uint64_t size) = 0;
+  // Writes all that `source` has into this file, from its start on, which is empty before. How many
+  // bytes that were. A host that can copies them without handing them to the program.
+  virtual std::uint64_t CopyFrom(HostFile& source);
   // Returns once the bytes are on the disk.
   virtual void Flush() = 0;
   // Gives it the permissions, owner and group of `like`, as far as the host lets this user.
   virtual void TakeAccess(const HostStatus& like) = 0;
+
+ protected:
+  // What `source` has behind the first `at` bytes, to the same place here; how many.
+  std::uint64_t CopyRest(HostFile& source, std::uint64_t at);
 };
 
 enum class OpenMode {

@@ -1,7 +1,7 @@
 #include "maintenance/backup.h"
 
 #include <algorithm>
-#include <span>
+#include <utility>
 
 #include "base/file_set.h"
 #include "base/home_lock.h"
@@ -18,10 +18,10 @@ namespace {
 
 constexpr const char* kTitle = "Copy Files";
 constexpr const char* kAllTitle = "Copy all Files";
-// Files are put in place some at a time: what is held in memory stays small.
-constexpr size_t kFilesTogether = 256;
-constexpr size_t kBytesTogether = 64u << 20;
-constexpr std::uint64_t kLargestFile = 1u << 30;
+// Files are put in place some at a time: a new one takes its room on the disk once, one that
+// replaces another twice until then.
+constexpr size_t kFilesTogether = 4096;
+constexpr std::uint64_t kReplacedTogether = 64u << 20;
 
 std::string WithoutBackslash(std::string folder) {
   while (folder.size() > 3 && folder.back() == '\\') folder.pop_back();
@@ -38,43 +38,60 @@ bool IsStore(const std::vector<std::string>& names) {
   });
 }
 
-// Puts a group of files in place. False when the user gave up, or another failure was told.
+// Copies files beside their destinations and puts them in place in groups.
 class Copier {
  public:
-  Copier(const Files& files, std::string source, std::string destination, Dialogs& dialogs)
+  Copier(const Files& files, std::string source, std::string destination, CopyCount& count,
+         Dialogs& dialogs)
       : files_(files),
         source_(WithBackslash(source)),
         destination_(WithBackslash(destination)),
-        dialogs_(dialogs) {}
+        count_(count),
+        dialogs_(dialogs),
+        set_(files) {}
 
-  bool Copy(std::span<const std::string> names, CopyCount& count) {
+  // Both: false when the user gave up, or another failure was told.
+  bool Copy(const std::string& name) {
     for (;;) {
       try {
-        FileSet set(files_);
-        std::uint64_t bytes = 0;
-        for (const std::string& name : names) {
-          inHand_ = name;
-          std::string text = files_.ReadAll(source_ + name, kLargestFile);
-          bytes += text.size();
-          set.Add(destination_ + name, std::move(text));
-        }
-        set.Commit();
-        count.files += std::int32_t(names.size());
-        count.bytes += bytes;
-        if (!names.empty()) count.last = names.back();
-        return true;
+        inHand_ = name;
+        const HostStatus old = files_.io().Status(files_.HostPath(destination_ + name));
+        bytes_ += set_.AddCopy(source_ + name, destination_ + name);
+        if (old.exists) replaced_ += old.size;
+        names_.push_back(name);
+        return names_.size() < kFilesTogether && replaced_ < kReplacedTogether ? true
+                                                                               : PutInPlace();
       } catch (const RunTimeError& e) {
-        // A group that does not fit may fit in part.
-        if (names.size() > 1 && e.number() == kDiskFull) return CopyOneByOne(names, count);
-        if (!Again(e)) return false;
+        // What was copied before is to be there in any case, and takes less room once it is.
+        const bool pending = !names_.empty();
+        if (pending && !PutInPlace()) return false;
+        if (!(pending && e.number() == kDiskFull) && !Again(e)) return false;
       }
     }
   }
 
+  bool PutInPlace() {
+    const auto names = std::exchange(names_, {});
+    replaced_ = 0;
+    const std::uint64_t bytes = std::exchange(bytes_, 0);
+    if (names.empty()) return true;
+    try {
+      set_.Commit();
+    } catch (const RunTimeError& e) {
+      // The disk may say only now that it is full; part of a group may fit.
+      if (e.number() == kDiskFull && names.size() > 1) return OneByOne(names);
+      return Again(e) && OneByOne(names);
+    }
+    count_.files += std::int32_t(names.size());
+    count_.bytes += bytes;
+    count_.last = names.back();
+    return true;
+  }
+
  private:
-  bool CopyOneByOne(std::span<const std::string> names, CopyCount& count) {
-    for (size_t i = 0; i < names.size(); ++i)
-      if (!Copy(names.subspan(i, 1), count)) return false;
+  bool OneByOne(const std::vector<std::string>& names) {
+    for (const std::string& name : names)
+      if (!Copy(name) || !PutInPlace()) return false;
     return true;
   }
 
@@ -93,7 +110,11 @@ class Copier {
 
   const Files& files_;
   const std::string source_, destination_;
+  CopyCount& count_;
   Dialogs& dialogs_;
+  FileSet set_;
+  std::vector<std::string> names_;  // copied and not yet in place
+  std::uint64_t bytes_ = 0, replaced_ = 0;
   std::string inHand_;
 };
 
@@ -144,28 +165,20 @@ CopyCount CopyAllFiles(const Files& files, const std::string& from, const std::s
   TellFailure(dialogs, kAllTitle, destination, [&] {
     if (!HaveFolder(files, source, dialogs) || !HaveFolder(files, destination, dialogs)) return;
     const auto held = files.lock().Hold();
-    Copier copier(files, source, destination, dialogs);
-    const std::span<const std::string> all(names);
-    size_t first = 0;
-    std::uint64_t bytes = 0;
-    for (size_t i = 0; i < all.size(); ++i) {
-      progress.Show(ProgressLine::kItem, "From: " + UCase(WithBackslash(source) + all[i]));
-      progress.Show(ProgressLine::kNote, "To  : " + UCase(WithBackslash(destination) + all[i]));
-      if (!progress.Step(int(i), int(all.size()))) {
-        count.stopped = true;
-        break;
-      }
-      bytes += files.io().Status(files.HostPath(WithBackslash(source) + all[i])).size;
-      if (i + 1 - first < kFilesTogether && bytes < kBytesTogether && i + 1 < all.size()) continue;
-      if (!copier.Copy(all.subspan(first, i + 1 - first), count)) return;
-      first = i + 1;
-      bytes = 0;
+    Copier copier(files, source, destination, count, dialogs);
+    const auto step = [&](size_t i) { return progress.Step(int(i), int(names.size())); };
+    for (size_t i = 0; i < names.size() && !count.stopped; ++i) {
+      progress.Show(ProgressLine::kItem, "From: " + UCase(WithBackslash(source) + names[i]));
+      progress.Show(ProgressLine::kNote, "To  : " + UCase(WithBackslash(destination) + names[i]));
+      count.stopped = !step(i);
+      if (!count.stopped && !copier.Copy(names[i])) return;
     }
+    if (!copier.PutInPlace()) return;
     if (count.stopped) {
       dialogs.Message("Stopped behind " + Str(count.files) + " files", kAllTitle);
       return;
     }
-    progress.Step(int(all.size()), int(all.size()));
+    step(names.size());
     count.done = true;
   });
   return count;

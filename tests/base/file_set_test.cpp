@@ -10,6 +10,7 @@
 
 #include "tests/support/error_of.h"
 #include "tests/support/failing_io.h"
+#include "tests/support/forwarding_io.h"
 #include "tests/support/temp_home.h"
 
 using namespace kora;
@@ -283,4 +284,116 @@ TEST(FileSetTest, AFolderThatCannotBeListedForAFailureOfTheDiskIsTold) {
   // name file for missing would make an empty one beside it.
   EXPECT_EQ(ErrorOf([&] { home.files().CheckFile("c:\\NAMES.DAT"); }), kDeviceError);
   EXPECT_EQ(ErrorOf([&] { home.files().WriteAll("c:\\NAMES.DAT", "x"); }), kDeviceError);
+}
+
+// ---- Copies
+
+TEST(FileSetTest, ACopyIsPutInPlaceWithTheBytesOfItsSourceAndTheAccessOfTheOldFile) {
+  TempHome home;
+  std::string large(3'000'000, 'x');
+  for (size_t i = 0; i < large.size(); i += 1000) large[i] = char('a' + i / 1000 % 26);
+  home.Put("drive_c/a/one.dat", large);
+  home.Put("drive_c/a/two.dat", "");
+  home.Put("drive_c/b/one.dat", "old");
+  std::filesystem::permissions(
+      home.path() + "/drive_c/b/one.dat",
+      std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
+  FileSet set(home.files());
+  EXPECT_EQ(set.AddCopy("c:\\a\\one.dat", "c:\\b\\ONE.dat"), large.size());
+  EXPECT_EQ(set.AddCopy("c:\\a\\two.dat", "c:\\b\\two.dat"), 0u);
+  EXPECT_EQ(home.Get("drive_c/b/one.dat"), "old") << "not committed yet";
+  set.Commit();
+  EXPECT_TRUE(home.Get("drive_c/b/one.dat") == large);
+  EXPECT_TRUE(home.Exists("drive_c/b/two.dat"));
+  EXPECT_EQ(home.files().List("c:\\b").size(), 2u);
+  EXPECT_EQ(std::filesystem::status(home.path() + "/drive_c/b/one.dat").permissions(),
+            std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
+}
+
+TEST(FileSetTest, ACopyThatFailsLeavesWhatTheSetHas) {
+  FailingIo io;
+  TempHome home(io);
+  for (const char* name : {"one.dat", "two.dat"}) home.Put(std::string("drive_c/a/") + name, name);
+  home.files().MakeFolder("c:\\b");
+  FileSet set(home.files());
+  set.AddCopy("c:\\a\\one.dat", "c:\\b\\one.dat");
+  EXPECT_EQ(ErrorOf([&] { set.AddCopy("c:\\a\\none.dat", "c:\\b\\none.dat"); }), kFileNotFound);
+  io.Reset(2);  // made, and then written
+  EXPECT_EQ(ErrorOf([&] { set.AddCopy("c:\\a\\two.dat", "c:\\b\\two.dat"); }), kDiskFull);
+  io.Reset();
+  set.Commit();
+  EXPECT_EQ(home.files().List("c:\\b"), std::vector<std::string>{"one.dat"});
+  EXPECT_EQ(home.Get("drive_c/b/one.dat"), "one.dat");
+}
+
+TEST(FileSetTest, CopiesThatAreNotCommittedLeaveNothing) {
+  TempHome home;
+  home.Put("drive_c/a.dat", "new");
+  home.Put("drive_c/b/a.dat", "old");
+  {
+    FileSet set(home.files());
+    set.AddCopy("c:\\a.dat", "c:\\b\\a.dat");
+  }
+  EXPECT_EQ(home.Get("drive_c/b/a.dat"), "old");
+  EXPECT_EQ(home.files().List("c:\\b").size(), 1u);
+}
+
+TEST(FileSetTest, ManyCopiesReadTheFolderOnceAndFlushTheDiskOnce) {
+  struct Counting : ForwardingIo {
+    int lists = 0, disks = 0;
+    std::vector<std::string> List(const std::string& folder) override {
+      ++lists;
+      return ForwardingIo::List(folder);
+    }
+    void FlushDisk(const std::string&) override { ++disks; }
+  } io;
+  TempHome home(io);
+  for (int i = 0; i < 200; ++i) home.Put("drive_c/a/" + std::to_string(i), "x");
+  home.files().MakeFolder("c:\\b");
+  FileSet set(home.files());
+  io.lists = 0;
+  for (int i = 0; i < 200; ++i)
+    set.AddCopy("c:\\a\\" + std::to_string(i), "c:\\b\\" + std::to_string(i));
+  set.Commit();
+  EXPECT_LE(io.lists, 3);
+  EXPECT_EQ(io.disks, 1);
+  EXPECT_EQ(home.files().List("c:\\b").size(), 200u);
+}
+
+TEST(FileSetTest, KillsAmongCopiesLeaveWholeFiles) {
+  FailingIo io;
+  TempHome home(io);
+  for (int at = 1;; ++at) {
+    SCOPED_TRACE(at);
+    io.Reset();
+    std::filesystem::remove_all(home.path() + "/drive_c");
+    for (const char* name : {"one", "two"}) {
+      home.Put(std::string("drive_c/a/") + name, std::string("new ") + name);
+      home.Put(std::string("drive_c/b/") + name, std::string("old ") + name);
+    }
+    const pid_t child = ::fork();
+    if (child == 0) {
+      io.Reset(at);
+      io.kills = true;
+      const auto held = home.files().lock().Hold();
+      FileSet set(home.files());
+      for (const char* name : {"one", "two"})
+        set.AddCopy(std::string("c:\\a\\") + name, std::string("c:\\b\\") + name);
+      set.Commit();
+      ::_exit(0);
+    }
+    int status = 0;
+    ASSERT_EQ(::waitpid(child, &status, 0), child);
+    // The next who takes the lock finishes what was begun: both are old, or both new.
+    Files next(home.path());
+    { const auto held = next.lock().Hold(); }
+    const std::string one = home.Get("drive_c/b/one"), two = home.Get("drive_c/b/two");
+    EXPECT_TRUE((one == "old one" && two == "old two") || (one == "new one" && two == "new two"))
+        << one << ", " << two;
+    if (!WIFSIGNALED(status)) {
+      EXPECT_EQ(one, "new one");
+      EXPECT_GT(at, 6);
+      break;
+    }
+  }
 }

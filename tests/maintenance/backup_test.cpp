@@ -104,13 +104,31 @@ TEST_F(BackupTest, AnotherFailureStopsWithItsNumber) {
   EXPECT_EQ(LastTitle(), "Copy all Files");
 }
 
-TEST_F(BackupTest, StoppingIsTold) {
+TEST_F(BackupTest, AStoppedBackupKeepsWhatWasCopiedAndTellsHowMuch) {
   Lay();
   progress.stopAt = 3;
   const CopyCount count = Backup();
   EXPECT_TRUE(count.stopped);
   EXPECT_FALSE(count.done);
-  EXPECT_EQ(LastSaid(), "Stopped behind 0 files");
+  EXPECT_EQ(count.files, 2);
+  EXPECT_EQ(LastSaid(), "Stopped behind 2 files");
+  EXPECT_EQ(home.Get(kHostBack + "BBB.WDT"), home.Get(kHostData + "BBB.WDT"));
+  EXPECT_FALSE(home.Exists(kHostBack + "Names.dat"));
+}
+
+TEST_F(BackupTest, AFileThatCanNotBeCopiedLeavesThoseBeforeItInPlace) {
+  Lay();
+  home.Put(kHostBack + "Names.dat", "old");
+  std::filesystem::permissions(home.path() + "/" + kHostBack + "Names.dat",
+                               std::filesystem::perms::owner_read);
+  const CopyCount count = Backup();
+  EXPECT_FALSE(count.done);
+  EXPECT_EQ(count.files, 2);
+  EXPECT_EQ(count.last, "BBB.WDT");
+  EXPECT_EQ(home.Get(kHostBack + "AAA.WDT"), home.Get(kHostData + "AAA.WDT"));
+  EXPECT_EQ(home.Get(kHostBack + "Names.dat"), "old");
+  EXPECT_NE(LastSaid().find("Unexpected Error No. 75 Cannot continue"), std::string::npos);
+  EXPECT_NE(LastSaid().find("Names.dat"), std::string::npos);
 }
 
 TEST_F(BackupTest, OneFileIsCopiedAndTold) {
