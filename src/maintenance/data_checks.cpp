@@ -106,34 +106,35 @@ void PriceCheck::Visit(const MarketItem& item) {
   check_.last = code;
   ++check_.checked;
   progress_.Show(ProgressLine::kState, "CHECKING :   " + code);
-  const auto first = std::find_if(item.records.begin(), item.records.end(),
-                                  [](const PriceRec& rec) { return rec.Close != 0; });
-  if (first == item.records.end()) {
+  bool gaps = false;
+  float first = 0;
+  for (const PriceRec& rec : item.records) {
+    const float close = rec.Close;
+    gaps |= (rec.Open == 0) | (rec.High == 0) | (rec.Low == 0) | (close == 0);
+    first = first == 0 ? close : first;
+  }
+  if (first == 0) {
     if (!item.records.empty()) List(item, code + " has no price data values");
     return;
   }
-  const bool gaps = std::any_of(item.records.begin(), item.records.end(), [](const PriceRec& rec) {
-    return rec.Open == 0 || rec.High == 0 || rec.Low == 0 || rec.Close == 0;
-  });
   std::vector<PriceRec> repaired;
   std::span<const PriceRec> records = item.records;
   if (gaps) {
     repaired.assign(records.begin(), records.end());
-    if (Repair(repaired, first->Close)) {
+    if (Repair(repaired, first)) {
       StagePrices(set_, inHand, repaired);
       ++waiting_;
       bytes_ += repaired.size() * sizeof(PriceRec);
     }
     records = repaired;
   }
+  // A day with volume ends both runs: they are counted from the last day back.
   std::int32_t noVolume = 0, noMovement = 0;
-  for (size_t i = 0; i < records.size(); ++i) {
-    if (records[i].Volume != 0) {
-      noVolume = noMovement = 0;
-      continue;
-    }
+  bool same = true;
+  for (size_t i = records.size(); i-- > 0 && records[i].Volume == 0;) {
     ++noVolume;
-    noMovement = i > 0 && records[i].Close == records[i - 1].Close ? noMovement + 1 : 0;
+    same = same && i > 0 && records[i].Close == records[i - 1].Close;
+    if (same) ++noMovement;
   }
   if (noVolume >= plan_.StaleDays && noMovement >= plan_.StaleDays)
     List(item, " No volume and price movement for " + code + " " + Str(noVolume) + " days");

@@ -25,6 +25,8 @@ namespace {
 constexpr std::int32_t kMostItems = 32;
 constexpr std::int32_t kRecordsPerBlock = 10000;
 constexpr size_t kBlocks = 4;
+// Of files that are read whole, whose size is not known before.
+constexpr size_t kWholeFilesPerBlock = 4;
 constexpr std::int32_t kNamesPerRead = 512;
 constexpr std::uint64_t kMostRecords = 32767;
 
@@ -186,6 +188,7 @@ std::unique_ptr<AheadReader> StartReader(const Files& files, const std::string& 
 
 size_t ItemsPerBlock(const WalkPlan& plan) {
   if (!plan.ahead) return 1;
+  if (plan.records == kWholeFile) return kWholeFilesPerBlock;
   return size_t(std::clamp(kRecordsPerBlock / std::max(plan.records, 1), 1, kMostItems));
 }
 
