@@ -4,11 +4,10 @@
 #include <functional>
 
 #include "platform/dialogs.h"
+#include "settings/forms/folder_picker.h"
 #include "settings/locate.h"
 
-class QComboBox;
 class QLabel;
-class QListWidget;
 
 namespace kora {
 
@@ -19,20 +18,12 @@ class Locate : public QDialog {
   Locate(const Files& files, Dialogs& dialogs, const LocateCase& what,
          std::function<void(const std::string&)> saved, QWidget* parent);
 
- protected:
-  bool eventFilter(QObject* object, QEvent* event) override;
-
  private:
-  void ShowFolder(const std::string& folder);
-  void Enter(const QString& name);
   void Save();
 
-  const Files& files_;
   Dialogs& dialogs_;
   std::function<void(const std::string&)> saved_;
-  std::string folder_;
-  QComboBox* drive1_;
-  QListWidget* dir1_;
+  FolderPicker* picker_;
   QLabel* label3_[2];
 };
 
