@@ -13,14 +13,22 @@ namespace kora {
 
 class Dialogs;
 
-// The notes of a code; nothing, and told, where there is no file.
-std::optional<std::vector<ChartNote>> OpenNotes(const Files& files,
-                                                const std::string& ChartMiscPath,
-                                                const std::string& code, Dialogs& dialogs);
+struct NoteList {
+  std::vector<NoteLine> lines;  // lines that are no texts as well
+  FileStamp stamp;              // of the file as it was read
+};
 
-// Rewrites the file with these notes. False, and told, when it fails.
+// "14/9/98   1.50   A text"; a line that is none as it stands. UTF-8.
+std::string NoteListText(const NoteLine& line);
+
+// The lines of a code's file; nothing, and told, where there is no file.
+std::optional<NoteList> OpenNotes(const Files& files, const std::string& ChartMiscPath,
+                                  const std::string& code, Dialogs& dialogs);
+
+// Rewrites the file with these lines. Where another program changed it since, the user is asked, No
+// standing. False, and told, when it fails or is not wanted.
 bool SaveNotes(const Files& files, const std::string& ChartMiscPath, const std::string& code,
-               const std::vector<ChartNote>& notes, Dialogs& dialogs);
+               NoteList& notes, Dialogs& dialogs);
 
 // Deletes the file. False, and told, when it fails.
 bool RemoveAllNotes(const Files& files, const std::string& ChartMiscPath, const std::string& code,
