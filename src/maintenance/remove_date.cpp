@@ -127,12 +127,17 @@ RemovedDate RemoveDate(const Files& files, Settings& settings, const std::string
                        Dialogs& dialogs, RemoveDateBox& focus) {
   RemovedDate removed;
   focus = RemoveDateBox::kNone;
-  settings.paths.CurrentDataPath = WithBackslash(Trim(folder));
-  const std::string path = settings.paths.CurrentDataPath;
+  const std::string path = WithBackslash(Trim(folder));
   if (path.empty()) {
     focus = RemoveDateBox::kFolder;
     return removed;
   }
+  if (!files.IsFolder(path)) {
+    focus = RemoveDateBox::kFolder;
+    dialogs.Message("Cannot find " + path, kTitle);
+    return removed;
+  }
+  settings.paths.CurrentDataPath = path;
   if (Trim(date).empty()) {
     focus = RemoveDateBox::kDate;
     dialogs.Message("Date to remove must be entered.", kTitle);
@@ -142,11 +147,6 @@ RemovedDate RemoveDate(const Files& files, Settings& settings, const std::string
   if (!wanted) {
     focus = RemoveDateBox::kDate;
     dialogs.Message("The date is not a date d/m/yy", kTitle);
-    return removed;
-  }
-  if (!files.IsFolder(path)) {
-    focus = RemoveDateBox::kFolder;
-    dialogs.Message("Cannot find " + path, kTitle);
     return removed;
   }
   DateRemoval removal(files, path, FormatFileDate(*wanted), latestOnly);

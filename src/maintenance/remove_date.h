@@ -24,8 +24,8 @@ struct RemovedDate {
 };
 
 // Takes the date (d/m/yy) out of the price files of all names of the folder, every record of it or
-// the latest of each file alone. The folder becomes the data folder of the whole program, even when
-// the date is refused then. An empty folder or date leads back to its box.
+// the latest of each file alone. A folder that is there becomes the data folder of the whole
+// program, even when the date is refused then. An empty folder or date leads back to its box.
 //
 // Files are put in place whole, some tens at a time; where the user stops it, or a failure does,
 // those in front of the place told are done and the others as they were. A file without the date

@@ -88,6 +88,7 @@ TEST_F(RemoveDateTest, RefusalsLeadBackToTheirBox) {
   EXPECT_EQ(LastSaid(), "The date is not a date d/m/yy");
   Remove("15/9/98", false, "c:\\nowhere");
   EXPECT_EQ(focus, RemoveDateBox::kFolder);
+  EXPECT_EQ(settings.paths.CurrentDataPath, kData) << "no folder that is there was named";
 }
 
 TEST_F(RemoveDateTest, StoppingIsToldAndLeavesWholeFiles) {
