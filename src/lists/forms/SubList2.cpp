@@ -83,7 +83,11 @@ SubList2::SubList2(ListFormServices services, QWidget* parent)
   save_ = button("Command2(2)", "&Save", "");
   auto* close = button("Command2(0)", "&Close", "");
   auto* buttons = new QHBoxLayout;
+  state_ = new QLabel(this);
+  state_->setObjectName("Label4");
+  state_->setTextFormat(Qt::PlainText);
   buttons->addWidget(check);
+  buttons->addWidget(state_);
   buttons->addStretch();
   buttons->addWidget(save_);
   buttons->addWidget(close);
@@ -185,8 +189,12 @@ void SubList2::DeleteAll(int side) {
 void SubList2::CheckAll() {
   if (!LeaveList(0) || !LeaveList(1)) return;
   services_.dialogs.SetBusy(true);
-  TellErrors(services_.dialogs, kTitle,
-             [this] { CheckAllLists(services_.files, services_.settings.paths.CurrentDataPath); });
+  state_->setText("Checking SubLists");
+  state_->repaint();
+  const bool checked = TellErrors(services_.dialogs, kTitle, [this] {
+    CheckAllLists(services_.files, services_.settings.paths.CurrentDataPath);
+  });
+  state_->setText(checked ? "COMPLETED" : "");
   services_.dialogs.SetBusy(false);
   ShowSide(0);
   ShowSide(1);

@@ -4,6 +4,8 @@
 
 #include "lists/forms/SubList.h"
 
+class QLabel;
+
 namespace kora {
 
 // "Chart List Utilities": copies and moves between two lists.
@@ -33,6 +35,7 @@ class SubList2 : public QDialog {
   QComboBox* combo1_[2];
   CodeList* list1_[2];
   QPushButton* save_;
+  QLabel* state_;
   ListSide sides_[2];
   FileStamp stamps_[2];  // of the files that they were read from
   CodeNames names_;

@@ -328,6 +328,7 @@ TEST_F(SubList2Test, CheckAllListsRefreshesNumbersAndDropsCodesThatLeft) {
   OpenBoth();
   EXPECT_EQ(On<QPushButton>("Command2(1)")->toolTip(), "Checks all codes with Name file list");
   Press("Command2(1)");
+  EXPECT_EQ(On<QLabel>("Label4")->text(), "COMPLETED");
   EXPECT_EQ(ListBytes('K'), Bytes({Entry(6, "ZZZ")}));
   EXPECT_EQ(ListBytes('Z'), "");
   EXPECT_TRUE(home.Exists("drive_c/korawin/data/SubListZ.Dat"));
@@ -367,6 +368,7 @@ TEST_F(SubList2Test, ACheckThatFailsIsTold) {
   Press("Command2(1)");
   ASSERT_EQ(dialogs.said.size(), 1u);
   EXPECT_EQ(dialogs.said[0].text.substr(0, 38), "There is an unexpected error number 53");
+  EXPECT_EQ(On<QLabel>("Label4")->text(), "");
   EXPECT_EQ(ListBytes('B'), Bytes({Entry(1, "AAA")}));
 }
 
