@@ -91,7 +91,12 @@ Main::Main(Session& session, std::string commandLine)
                                    QWidget* over) { desk_.PrintList(table, over); },
               .textPage = [this] { desk_.OpenTextPage(); },
               .showChart = [this](std::int16_t list,
-                                  std::int16_t place) { desk_.ShowChart(list, place); }}) {
+                                  std::int16_t place) { desk_.ShowChart(list, place); }}),
+      maintenance_(session, this,
+                   {.printTable = [this](const TextTable& table,
+                                         QWidget* over) { desk_.PrintList(table, over); },
+                    .changed = [this] { desk_.PricesChanged(); },
+                    .folderChanged = [this] { FolderChanged(); }}) {
   setObjectName("Main");
   mdi_->setObjectName("MDI");
   mdi_->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
@@ -158,6 +163,17 @@ void Main::SetOpeners() {
   SetOpener("mnuChartScan2", [this] { scans_.OpenScan2(); });
   SetOpener("mnuChtScan3", [this] { scans_.OpenScan3(); });
   SetOpener("mnStats", [this] { scans_.OpenStats(); });
+  SetOpener("mnuKBUpdate", [this] { maintenance_.OpenEntry(); });
+  SetOpener("mnuCodeChanged", [this] { maintenance_.OpenCodeChange(); });
+  SetOpener("mnuMveData", [this] { maintenance_.OpenMove(); });
+  SetOpener("mnuDataCk", [this] { maintenance_.OpenDataCheck(); });
+  SetOpener("mnuChkNameData", [this] { maintenance_.OpenNameCheck(); });
+  SetOpener("mnuADCheck", [this] { maintenance_.OpenTotals(); });
+  SetOpener("mnuBackupData", [this] { maintenance_.OpenBackup(); });
+  SetOpener("mnuRestoreData", [this] { maintenance_.OpenRestore(); });
+  SetOpener("mnuTextFile", [this] { maintenance_.OpenCloses(); });
+  SetOpener("mnuTFD", [this] { maintenance_.OpenHistory(); });
+  SetOpener("mnuCDupDts", [this] { maintenance_.OpenRemoveDate(); });
   SetOpener("mnuMMAScan", [this] { RunSibling("Mmascan.EXE"); });
   SetOpener("mnSHlp", [this] { OpenHelp(); });
   SetOpener("mnuAboutKora", [this] {
@@ -168,7 +184,10 @@ void Main::SetOpeners() {
 }
 
 void Main::SetOpener(const std::string& entry, std::function<void()> open) {
-  openers_[entry] = std::move(open);
+  if (open)
+    openers_[entry] = std::move(open);
+  else
+    openers_.erase(entry);
   EnableMenus();
 }
 

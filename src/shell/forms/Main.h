@@ -11,6 +11,7 @@
 #include "shell/forms/chart_desk.h"
 #include "shell/forms/company_desk.h"
 #include "shell/forms/data_desk.h"
+#include "shell/forms/maintenance_desk.h"
 #include "shell/forms/name_desk.h"
 #include "shell/forms/scan_desk.h"
 #include "shell/forms/update_desk.h"
@@ -80,6 +81,7 @@ class Main : public QMainWindow {
   NameDesk names_;
   CompanyDesk companies_;
   ScanDesk scans_;
+  MaintenanceDesk maintenance_;
   QPointer<CPath> cpath_;
   QPointer<HelpWindow> help_;
   std::map<std::string, std::function<void()>> openers_;

@@ -8,6 +8,7 @@
 
 #include "base/dates.h"
 #include "base/runtime_error.h"
+#include "base/text.h"
 #include "chart/forms/CHTPage.h"
 #include "chart/forms/Page.h"
 #include "chart/forms/PrinterSetup.h"
@@ -34,6 +35,7 @@
 #include "looks/forms/PLW.h"
 #include "looks/forms/Scales.h"
 #include "looks/forms/VHeight.h"
+#include "maintenance/forms/TxtData.h"
 #include "platform/qt/form_parts.h"
 #include "store/name_file.h"
 
@@ -212,6 +214,7 @@ void ChartDesk::WireWindow() {
   w.window().SetAskBoxValue([this](float computed) { return AskBoxValue(computed); });
   w.SetForm("cmuSwingsettings", [this] { OpenSwingSet(); });
   w.SetForm("cmMMASet", look([this](LookServices s) { return new MMASet(s, chts_); }));
+  w.SetForm("cmRText", [this] { OpenTexts(); });
   // The window draws again itself when this one is closed.
   w.SetForm("cmSLInd", [this] { RunForm(new StpLs(Look({}), chts_)); });
   OfferStock();
@@ -231,6 +234,17 @@ void ChartDesk::OfferStock() {
 void ChartDesk::PricesChanged() {
   OfferStock();
   Refresh();
+}
+
+void ChartDesk::OpenTexts() {
+  auto form = std::make_unique<TxtData>(
+      TxtDataServices{.files = session_.files,
+                      .dialogs = session_.dialogs,
+                      .ChartMiscPath = session_.settings.paths.ChartMiscPath,
+                      .code = std::string(Trim(session_.current.Rec.Code.trimmed())),
+                      .refresh = [this] { Refresh(); }},
+      chts_);
+  if (chts_->window().HasChart() && form->Fill()) RunForm(form.release());
 }
 
 // ---- The multi-oscillator view

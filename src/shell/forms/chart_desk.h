@@ -68,6 +68,7 @@ class ChartDesk {
   void OpenView(int set);
   void CloseView();
   void OpenMultiOsc();
+  void OpenTexts();
   void PrintView();
   bool AnySecurity();
   void WireWindow();

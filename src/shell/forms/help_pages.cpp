@@ -75,6 +75,18 @@ QString HelpPageOf(const QString& form) {
       {"EnterCode", "data.html"},
       {"DataForm", "data.html"},
       {"VolMod", "data.html"},
+      {"ADTotals", "maintenance.html"},
+      {"ASXChg", "maintenance.html"},
+      {"ChartBak", "maintenance.html"},
+      {"DataEntry", "maintenance.html"},
+      {"DataStat", "maintenance.html"},
+      {"MoveFiles", "maintenance.html"},
+      {"NameData", "maintenance.html"},
+      {"RTypeCk", "maintenance.html"},
+      {"RemDate", "maintenance.html"},
+      {"TextData", "maintenance.html"},
+      {"TextFull", "maintenance.html"},
+      {"TxtData", "maintenance.html"},
   };
   return pages.value(form, kFirstPage);
 }

@@ -59,6 +59,14 @@ class EveryForm : public test::FormTest {
     QTimer::singleShot(0, qApp, [] { QCoreApplication::exit(0); });
     QApplication::exec();
     ReadSettings();
+    // What some of the forms show.
+    home.Put("drive_c/korawin/data/Names.dat",
+             test::Bytes(std::vector<NameRec>{test::Security("AAA"), test::Security("BBB"),
+                                              test::Security("CCC"),
+                                              test::Security("XAD", 1, kAdvanceDecline)}));
+    home.Put("drive_c/korawin/chtmisc/AAA.Txt", "T,8.25,20260226,10.00,A note,255\r\n");
+    session->settings.download.DataService = 3;
+    session->settings.paths.ChartBackupPath = session->settings.paths.CurrentDataPath;
     session->settings.words.OptionXS = session->settings.words.OptionXT = true;
     main = std::make_unique<Main>(*session, "");
     main->show();
@@ -70,12 +78,12 @@ class EveryForm : public test::FormTest {
   void Visit(const char* entry, const std::function<void(QWidget*)>& look) {
     bool seen = false;
     const auto visit = [&] {
-      if (seen) return;
-      QWidget* form = QApplication::activeModalWidget();
-      if (!form) return;
-      seen = true;
-      look(form);
-      form->close();
+      // One form may have opened another over itself.
+      while (QWidget* form = seen ? nullptr : QApplication::activeModalWidget()) {
+        look(form);
+        form->close();
+        seen = !QApplication::activeModalWidget();
+      }
     };
     QTimer timer;
     QObject::connect(&timer, &QTimer::timeout, visit);
@@ -98,11 +106,15 @@ class EveryForm : public test::FormTest {
 };
 
 constexpr const char* kOfTheMenu[] = {
-    "mnuViewData", "mnuChartDefaults", "mnFnts",   "mnTPSU",      "mnPrSU",      "mnuLists",
-    "mnuListsUte", "mnuRenameCL",      "mnuPaths", "mnuDDetails", "mnuAboutKora"};
+    "mnuViewData", "mnuChartDefaults", "mnFnts", "mnTPSU", "mnPrSU", "mnuLists", "mnuListsUte",
+    "mnuRenameCL", "mnuPaths", "mnuDDetails", "mnuAboutKora",
+    // Those that keep the data, one a line.
+    "mnuKBUpdate", "mnuCodeChanged", "mnuMveData", "mnuDataCk", "mnuChkNameData", "mnuADCheck",
+    "mnuBackupData", "mnuRestoreData", "mnuTextFile", "mnuTFD", "mnuCDupDts"};
 constexpr const char* kOfTheChart[] = {"cmChtDef",   "cmColours",   "cmfonts",     "cmBSpaces",
                                        "cmGLSpaces", "cmLineWidth", "cmVHeight",   "cmMMASet",
-                                       "cmSLInd",    "cmChtSpaces", "cmPageSetup", "cmPrintChart"};
+                                       "cmSLInd",    "cmChtSpaces", "cmPageSetup", "cmPrintChart",
+                                       "cmRText"};
 
 TEST_F(EveryForm, EachControlThatTakesTheKeyboardHasAName) {
   const std::set<std::string> none;

@@ -72,8 +72,16 @@ TEST_F(MainTest, AnEntryWhoseFormIsNotThereIsGreyed) {
         "mnuChartScan", "mnuChartScan2", "mnuChtScan3", "mnStats", "mnuListsUte", "mnuRenameCL",
         "mnuManAdjust", "mnuDDetails", "mnuModem", "mnSHlp", "mnuAboutKora"})
     EXPECT_TRUE(Entry(there)->isEnabled()) << there;
-  for (const char* notYet : {"mnuKBUpdate", "mnuTextFile", "mnuTFD"})
-    EXPECT_FALSE(Entry(notYet)->isEnabled()) << notYet;
+  for (const char* there :
+       {"mnuKBUpdate", "mnuCodeChanged", "mnuDataCk", "mnuChkNameData", "mnuADCheck",
+        "mnuBackupData", "mnuRestoreData", "mnuTextFile", "mnuTFD", "mnuCDupDts"})
+    EXPECT_TRUE(Entry(there)->isEnabled()) << there;
+  EXPECT_FALSE(Entry("mnuMveData")->isEnabled()) << "one folder";
+  session->settings.download.DataService = 3;
+  form->EnableMenus();
+  EXPECT_TRUE(Entry("mnuMveData")->isEnabled());
+  form->SetOpener("mnuTextFile", {});
+  EXPECT_FALSE(Entry("mnuTextFile")->isEnabled());
   form->SetOpener("mnuTextFile", [] {});
   EXPECT_TRUE(Entry("mnuTextFile")->isEnabled());
 }
