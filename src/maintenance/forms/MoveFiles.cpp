@@ -67,7 +67,13 @@ MoveFiles::Side MoveFiles::AddSide(QBoxLayout* columns, const char* title, int i
                                  index == 0 ? "F&older" : "Fol&der", box);
   side.file1 = new QListWidget(box);
   side.file1->setObjectName("File1" + number);
+  side.file1->setAccessibleName("Files");
   side.file1->setUniformItemSizes(true);
+  side.folder = new QLabel(box);
+  side.folder->setObjectName("Label3" + number);
+  side.folder->setTextFormat(Qt::PlainText);
+  side.folder->setTextInteractionFlags(Qt::TextSelectableByMouse);
+  rows->addWidget(side.folder);
   rows->addWidget(side.picker, 1);
   rows->addWidget(NewLabel(box, index == 0 ? "&Files" : "F&iles", side.file1));
   rows->addWidget(side.file1, 1);
@@ -79,6 +85,7 @@ void MoveFiles::ShowFiles(const Side& side) {
   const QListWidgetItem* item = side.file1->currentItem();
   const QString chosen = item ? item->text() : QString();
   side.file1->clear();
+  side.folder->setText(ToQt(side.picker->folder()));
   try {
     for (const std::string& name : services_.files.List(side.picker->folder()))
       if (UCase(name).ends_with(".WDT")) side.file1->addItem(ToQt(name));

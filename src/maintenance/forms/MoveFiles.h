@@ -17,6 +17,7 @@ class MoveFiles : public WorkForm {
   struct Side {
     FolderPicker* picker;
     QListWidget* file1;
+    QLabel* folder;
   };
   Side AddSide(QBoxLayout* columns, const char* title, int index);
   void ShowFiles(const Side& side);

@@ -20,6 +20,7 @@ FolderPicker::FolderPicker(const Files& files, const QString& index, const QStri
   for (const std::string& drive : Drives(files_)) drive1_->addItem(ToQt(drive));
   dir1_ = new QListWidget(this);
   dir1_->setObjectName("Dir1" + index);
+  dir1_->setAccessibleName(QString(folderCaption).remove('&'));
   auto* grid = new QGridLayout(this);
   grid->setContentsMargins(0, 0, 0, 0);
   grid->addWidget(NewLabel(this, driveCaption, drive1_), 0, 0);

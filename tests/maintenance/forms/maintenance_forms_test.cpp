@@ -99,6 +99,7 @@ TEST_F(MoveFilesForm, AFileIsMovedWithItsName) {
   dirs->setCurrentItem(found.first());
   QTest::keyClick(dirs, Qt::Key_Return);
   EXPECT_TRUE(Items("File1(1)").empty());
+  EXPECT_EQ(Label("Label3(0)") + " " + Label("Label3(1)"), "c:\\korawin\\data\\ c:\\m\\");
   List("File1(0)")->setFocus();
   Key(Qt::Key_Return);
   EXPECT_TRUE(dialogs.said.empty());

@@ -66,7 +66,7 @@ class EveryForm : public test::FormTest {
                                               test::Security("XAD", 1, kAdvanceDecline)}));
     home.Put("drive_c/korawin/chtmisc/AAA.Txt", "T,8.25,20260226,10.00,A note,255\r\n");
     session->settings.download.DataService = 3;
-    session->settings.paths.ChartBackupPath = session->settings.paths.CurrentDataPath;
+    home.Put("drive_c/korawin/backup/AAA.WDT", "");
     session->settings.words.OptionXS = session->settings.words.OptionXT = true;
     main = std::make_unique<Main>(*session, "");
     main->show();
