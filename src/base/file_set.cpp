@@ -17,14 +17,14 @@ void FileSet::Add(std::string_view path, std::string bytes) {
   Note(host, true);
 }
 
-std::uint64_t FileSet::AddCopy(std::string_view from, std::string_view path) {
+CopiedFile FileSet::AddCopy(std::string_view from, std::string_view path) {
   const std::string host = files_.Locate(path, true);
   const std::string folder = HostFolderOf(host);
   const std::int64_t before = files_.Modified(folder);
-  const std::uint64_t bytes = set_.Copy(files_.HostPath(from), host);
+  const CopiedFile copied = set_.Copy(files_.HostPath(from), host);
   Note(host, true);
   folders_[folder] = files_.NoteTemporary(folder, before);
-  return bytes;
+  return copied;
 }
 
 void FileSet::Remove(std::string_view path) {

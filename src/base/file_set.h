@@ -23,9 +23,9 @@ class FileSet {
 
   // New bytes for a file, which is made when missing.
   void Add(std::string_view path, std::string bytes);
-  // The bytes of another file, copied beside the path at once; how many. A failure leaves what the
-  // set has so far. Called under the home's lock.
-  std::uint64_t AddCopy(std::string_view from, std::string_view path);
+  // The bytes of another file, copied beside the path at once. A failure leaves what the set has so
+  // far. Called under the home's lock.
+  CopiedFile AddCopy(std::string_view from, std::string_view path);
   // Nothing where it is not there by then.
   void Remove(std::string_view path);
   // Replaces `to`. Error 53 in Commit where `from` is not there by then.

@@ -152,16 +152,17 @@ void HostFileSet::Rename(std::string from, std::string to) {
                     .aside = std::move(aside)});
 }
 
-std::uint64_t HostFileSet::Copy(const std::string& from, std::string path) {
+CopiedFile HostFileSet::Copy(const std::string& from, std::string path) {
   const auto source = io_.Open(from, OpenMode::kRead);
   Write(std::move(path), {});
   Step& step = steps_.back();
   try {
-    OpenStaged(step);
-    const std::uint64_t bytes = step.making->CopyFrom(*source);
+    CopiedFile copied;
+    copied.replaces = OpenStaged(step);
+    copied.bytes = step.making->CopyFrom(*source);
     step.flushed = false;
     step.making.reset();
-    return bytes;
+    return copied;
   } catch (...) {
     if (step.staged) Quietly([&] { io_.Remove(step.temporary); });
     steps_.pop_back();
@@ -169,11 +170,12 @@ std::uint64_t HostFileSet::Copy(const std::string& from, std::string path) {
   }
 }
 
-void HostFileSet::OpenStaged(Step& step) {
+std::uint64_t HostFileSet::OpenStaged(Step& step) {
   const HostStatus old = io_.Status(step.path);
   step.making = OpenTemporary(io_, step.path, step.temporary);
   step.staged = true;
   if (old.exists) step.making->TakeAccess(old);
+  return old.exists ? old.size : 0;
 }
 
 void HostFileSet::StageOne(Step& step, bool flush) {

@@ -9,6 +9,11 @@
 
 namespace kora {
 
+struct CopiedFile {
+  std::uint64_t bytes = 0;
+  std::uint64_t replaces = 0;  // bytes of the file that is to give way
+};
+
 // The one way in which files are replaced: several files by host paths, changed together or not
 // at all.
 //
@@ -41,9 +46,9 @@ class HostFileSet {
   // Each only notes what is to be done; nothing is changed yet. Error 75 as above.
   void Write(std::string path, std::string bytes);
   // The bytes of another file: they are copied to the temporary file at once, unflushed, so that
-  // thousands of large files take no memory. How many. A failure leaves what the set has so far.
-  // Called under the home's lock.
-  std::uint64_t Copy(const std::string& from, std::string path);
+  // thousands of large files take no memory. A failure leaves what the set has so far. Called under
+  // the home's lock.
+  CopiedFile Copy(const std::string& from, std::string path);
   void Remove(std::string path);                  // nothing where it is not there by then
   void Rename(std::string from, std::string to);  // replaces `to`
 
@@ -70,7 +75,8 @@ class HostFileSet {
     bool done = false;
   };
 
-  void OpenStaged(Step& step);
+  // Bytes of the file that is to give way.
+  std::uint64_t OpenStaged(Step& step);
   void StageOne(Step& step, bool flush);
   void Perform(Step& step);
   void KeepAside(Step& step, const std::string& path);

@@ -342,7 +342,8 @@ std::uint64_t HostFile::CopyFrom(HostFile& source) { return CopyRest(source, 0);
 std::uint64_t HostFile::CopyRest(HostFile& source, std::uint64_t at) {
   constexpr size_t kBlock = 1 << 20;
   const std::uint64_t first = at;
-  std::string block(std::min<std::uint64_t>(kBlock, source.Size() + 1), '\0');
+  const std::uint64_t size = source.Size();
+  std::string block(std::min<std::uint64_t>(kBlock, (size > at ? size - at : 0) + 1), '\0');
   while (const size_t got = source.ReadAt(at, block.data(), block.size())) {
     WriteAt(at, block.data(), got);
     at += got;

@@ -55,9 +55,9 @@ class Copier {
     for (;;) {
       try {
         inHand_ = name;
-        const HostStatus old = files_.io().Status(files_.HostPath(destination_ + name));
-        bytes_ += set_.AddCopy(source_ + name, destination_ + name);
-        if (old.exists) replaced_ += old.size;
+        const CopiedFile copied = set_.AddCopy(source_ + name, destination_ + name);
+        bytes_ += copied.bytes;
+        replaced_ += copied.replaces;
         names_.push_back(name);
         return names_.size() < kFilesTogether && replaced_ < kReplacedTogether ? true
                                                                                : PutInPlace();

@@ -14,7 +14,6 @@
 #include "platform/dialogs.h"
 #include "platform/progress.h"
 #include "store/market_walk.h"
-#include "store/price_edit.h"
 
 namespace kora {
 namespace {
@@ -24,18 +23,39 @@ constexpr const char* kTitle = "Remove Selected Data";
 constexpr int kFilesTogether = 64;
 constexpr size_t kBytesTogether = 32u << 20;
 
-// The records without the date; as many as before where it is not there.
-std::vector<PriceRec> Without(std::span<const PriceRec> records, double date, bool latestOnly) {
-  std::vector<PriceRec> kept;
-  size_t latest = records.size();
-  if (latestOnly)
-    for (size_t i = records.size(); i-- > 0 && latest == records.size();)
-      if (Val(records[i].RecDate.raw()) == date) latest = i;
-  kept.reserve(records.size());
-  for (size_t i = 0; i < records.size(); ++i)
-    if (latestOnly ? i != latest : Val(records[i].RecDate.raw()) != date)
-      kept.push_back(records[i]);
-  return kept;
+// Dates are compared by value; eight digits have that of no other eight.
+bool HasDate(const PriceRec& rec, std::string_view yyyymmdd) {
+  const std::string_view date = rec.RecDate.raw();
+  if (date == yyyymmdd) return true;
+  bool digits = true;
+  for (const char c : date) digits &= c >= '0' && c <= '9';
+  return !digits && Val(date) == Val(yyyymmdd);
+}
+
+// The bytes of the records without the date, and how many were left out.
+std::string Without(std::span<const PriceRec> records, std::string_view date, bool latestOnly,
+                    std::int32_t& removed) {
+  std::vector<size_t> out;
+  if (latestOnly) {
+    for (size_t i = records.size(); i-- > 0 && out.empty();)
+      if (HasDate(records[i], date)) out.push_back(i);
+  } else {
+    for (size_t i = 0; i < records.size(); ++i)
+      if (HasDate(records[i], date)) out.push_back(i);
+  }
+  removed = std::int32_t(out.size());
+  std::string bytes;
+  if (out.empty()) return bytes;
+  bytes.reserve((records.size() - out.size()) * sizeof(PriceRec));
+  size_t from = 0;
+  const auto take = [&](size_t to) {
+    bytes.append(reinterpret_cast<const char*>(records.data() + from),
+                 (to - from) * sizeof(PriceRec));
+    from = to + 1;
+  };
+  for (const size_t i : out) take(i);
+  take(records.size());
+  return bytes;
 }
 
 class DateRemoval {
@@ -70,12 +90,13 @@ void DateRemoval::Visit(const MarketItem& item, Progress& progress) {
   const std::string code(item.code);
   if (!seen_.insert(UCase(code)).second) return;
   progress.Show(ProgressLine::kState, "Removing " + DateToDisplay(date_) + " from " + code);
-  const auto kept = Without(item.records, Val(date_), latestOnly_);
-  if (kept.size() == item.records.size()) return;
-  StagePrices(set_, folder_ + CodeFileName(code, ".WDT"), kept);
+  std::int32_t removed = 0;
+  std::string kept = Without(item.records, date_, latestOnly_, removed);
+  if (removed == 0) return;
+  bytes_ += kept.size();
+  set_.Add(folder_ + CodeFileName(code, ".WDT"), std::move(kept));
   ++waiting_;
-  bytes_ += kept.size() * sizeof(PriceRec);
-  records_ += std::int32_t(item.records.size() - kept.size());
+  records_ += removed;
 }
 
 void DateRemoval::PutInPlace(RemovedDate& removed) {

@@ -299,8 +299,11 @@ TEST(FileSetTest, ACopyIsPutInPlaceWithTheBytesOfItsSourceAndTheAccessOfTheOldFi
       home.path() + "/drive_c/b/one.dat",
       std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
   FileSet set(home.files());
-  EXPECT_EQ(set.AddCopy("c:\\a\\one.dat", "c:\\b\\ONE.dat"), large.size());
-  EXPECT_EQ(set.AddCopy("c:\\a\\two.dat", "c:\\b\\two.dat"), 0u);
+  const CopiedFile one = set.AddCopy("c:\\a\\one.dat", "c:\\b\\ONE.dat");
+  EXPECT_EQ(one.bytes, large.size());
+  EXPECT_EQ(one.replaces, 3u);
+  const CopiedFile two = set.AddCopy("c:\\a\\two.dat", "c:\\b\\two.dat");
+  EXPECT_EQ(two.bytes + two.replaces, 0u);
   EXPECT_EQ(home.Get("drive_c/b/one.dat"), "old") << "not committed yet";
   set.Commit();
   EXPECT_TRUE(home.Get("drive_c/b/one.dat") == large);
