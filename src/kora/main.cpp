@@ -1,5 +1,6 @@
 #include <QApplication>
 #include <QDir>
+#include <QFileInfo>
 #include <QThread>
 #include <cstdio>
 #include <exception>
@@ -7,12 +8,15 @@
 
 #include "base/runtime_error.h"
 #include "base/version.h"
+#include "demo/demo_market.h"
 #include "platform/qt/accessible_names.h"
 #include "platform/qt/focus_mark.h"
 #include "platform/qt/form_style.h"
 #include "platform/qt/keyboard_back.h"
 #include "platform/qt/qt_dialogs.h"
 #include "platform/qt/single_instance.h"
+#include "revision/revision.h"
+#include "shell/forms/FirstStart.h"
 #include "shell/forms/Logo.h"
 #include "shell/program_arguments.h"
 
@@ -46,24 +50,48 @@ class Application : public QApplication {
 
 }  // namespace
 
+namespace {
+
+std::vector<std::string> Words(const QStringList& arguments) {
+  std::vector<std::string> words;
+  for (const QString& argument : arguments) words.push_back(argument.toStdString());
+  return words;
+}
+
+// What is only printed needs no display. Options of the toolkit are still among the words, so that
+// what can't be read here may yet be.
+bool PrintOnly(int argc, char** argv) {
+  std::string fault;
+  const auto arguments =
+      kora::ParseProgramArguments(std::vector<std::string>(argv + 1, argv + argc), fault);
+  if (!arguments || !(arguments->help || arguments->version)) return false;
+  const std::string text = arguments->help ? kora::ProgramHelp() : kora::VersionLine("kora") + "\n";
+  std::fputs(text.c_str(), stdout);
+  return true;
+}
+
+}  // namespace
+
 int main(int argc, char** argv) {
   using namespace kora;
+  if (argc > 0 && PrintOnly(argc, argv)) return 0;
   Application app(argc, argv);
   QApplication::setApplicationName("KORA Charting");
+  QApplication::setDesktopFileName("org.koracharting.kora");
   QApplication::setQuitOnLastWindowClosed(false);  // the splash closes before the main window
 
-  std::vector<std::string> words;
-  for (const QString& argument : app.arguments().mid(1)) words.push_back(argument.toStdString());
   std::string fault;
-  const auto arguments = ParseProgramArguments(words, fault);
+  const auto arguments = ParseProgramArguments(Words(app.arguments().mid(1)), fault);
   if (!arguments) {
-    std::fprintf(stderr,
-                 "kora: %s\nusage: kora [--home DIR] [--set SECTION.KEY=VALUE]... "
-                 "[RM] [A] [N] [XT] [XS]\n",
-                 fault.c_str());
+    std::fprintf(stderr, "kora: %s\n\n%s", fault.c_str(), ProgramHelp().c_str());
     return 2;
   }
   const std::string home = arguments->home.empty() ? DefaultHome() : arguments->home;
+  // The working folder is where the shell left it only now.
+  const QString chart =
+      arguments->file.empty()
+          ? QString()
+          : QFileInfo(QString::fromStdString(arguments->file)).absoluteFilePath();
   QDir().mkpath(QString::fromStdString(home));
 
   const KeyboardBack keyboardBack;
@@ -81,6 +109,15 @@ int main(int argc, char** argv) {
   };
   for (const auto& o : arguments->overrides) session.ini.Override(o.section, o.key, o.value);
   Logo logo(session, arguments->words);
+  if (!chart.isEmpty())
+    logo.Opened = [&chart](Main& main) { main.OpenSavedChart(chart.toStdString()); };
+  if (!instance.Previous() && NeedsFirstStart(session)) {
+    FirstStart question(
+        {.session = session, .makeDemo = [&] {
+           return MakeDemo(session.files, session.ini, session.user, dialogs, DemoOptions());
+         }});
+    if (question.exec() != QDialog::Accepted) return 1;
+  }
   if (!logo.Start(instance.Previous())) return 1;
   return app.exec();
 }

@@ -1,20 +1,8 @@
-#include "base/runtime_error.h"
-#include "indicators/osc_settings.h"
 #include "koractl/run.h"
+#include "shell/new_home.h"
 
 namespace kora {
 namespace {
-
-// What a broken-off or hand-made installation left is never emptied.
-void MakeFolders(const Files& files, const Paths& paths) {
-  for (const std::string& folder :
-       {paths.SystemPath, paths.CurrentDataPath, paths.ChartBackupPath, paths.PfmDataPath,
-        paths.PfmBackupPath, paths.SystemPath + "download\\"})
-    files.MakeFolder(folder);
-  files.Open(NameFilePath(paths.CurrentDataPath), OpenMode::kCreate);
-  files.Open(paths.SystemPath + "IndClass.dat", OpenMode::kCreate);
-  WriteColourVariants(files, paths.SystemPath);
-}
 
 int Init(const CommandLine& line) {
   Run run(line);
@@ -26,20 +14,10 @@ int Init(const CommandLine& line) {
     run.Open();
     if (session.files.CheckFile(NameFilePath(run.dataPath())))
       run.Abandon("There is an installation in " + session.files.home() + " already.", "KORA");
-    MakeFolders(session.files, session.settings.paths);
+    MakeHomeFolders(session.files, session.settings.paths);
     return kDone;
   }
-  Paths paths;
-  SetDefaultPaths(paths, "C:");
-  MakeFolders(session.files, paths);
-  // The settings file last: it is what makes a folder an installation.
-  {
-    const SettingsFile::Batch batch(session.ini);
-    WriteDefaultSettings(session.ini);
-    WriteDefaultOscPeriods(session.ini);
-  }
-  if (!session.ini.Exists())
-    throw RunTimeError(kPathAccess, "Kora.ini can't be written in " + session.files.home());
+  MakeEmptyHome(session.files, session.ini);
   run.Open();  // makes the folders of saved charts and notes
   return kDone;
 }

@@ -6,6 +6,7 @@
 #include "koractl/command.h"
 #include "koractl/koractl.h"
 #include "koractl/options.h"
+#include "revision/revision.h"
 
 namespace kora {
 namespace {
@@ -26,6 +27,8 @@ int RunKoractl(int argc, const char* const* argv, Io& io) {
   CommandLine line;
   line.io = &io;
   app.require_subcommand(1);
+  app.set_version_flag("--version", [] { return VersionLine("koractl"); },
+                       "Print the version and the revision, and exit");
   app.fallthrough();
   app.add_option("--home", line.home,
                  "Folder of the installation (default: KORA_HOME, else kora under the user's "
@@ -88,7 +91,7 @@ int RunKoractl(int argc, const char* const* argv, Io& io) {
 
   try {
     app.parse(argc, argv);
-  } catch (const CLI::CallForHelp& e) {
+  } catch (const CLI::Success& e) {
     return app.exit(e);
   } catch (const CLI::ParseError& e) {
     const auto strange = app.remaining();

@@ -14,12 +14,45 @@ std::optional<ProgramArguments::Override> ParseOverride(std::string_view text) {
                                     std::string(text.substr(equals + 1))};
 }
 
+std::string ProgramHelp() {
+  return "KORA Charting\n"
+         "Usage: kora [--home DIR] [--set SECTION.KEY=VALUE]... [WORD]... [FILE.cht]\n"
+         "\n"
+         "FILE.cht is a saved chart, which is shown.\n"
+         "\n"
+         "Options:\n"
+         "  -h,--help                Print this help message and exit\n"
+         "  --version                Print the version and the revision, and exit\n"
+         "  --home DIR               Folder of the installation (default: KORA_HOME, else kora\n"
+         "                           under the user's data folder)\n"
+         "  --set SECTION.KEY=VALUE  A setting for this run only\n"
+         "\n"
+         "Words:\n"
+         "  RM                       Marks of the signals of the Stochastic\n"
+         "  A                        No downloads and no market snapshot\n"
+         "  N                        Scripts for print: the user's sizes of fonts\n"
+         "  XT                       Further menu entries, and RM\n"
+         "  XS                       Further menu entries of the chart window\n";
+}
+
 std::optional<ProgramArguments> ParseProgramArguments(const std::vector<std::string>& arguments,
                                                       std::string& fault) {
   ProgramArguments out;
   for (size_t i = 0; i < arguments.size(); ++i) {
     std::string_view argument = arguments[i];
+    if (argument == "--help" || argument == "-h" || argument == "--version") {
+      (argument == "--version" ? out.version : out.help) = true;
+      continue;
+    }
     if (argument.substr(0, 2) != "--") {
+      if (argument.find_first_of("./") != argument.npos) {
+        if (!out.file.empty()) {
+          fault = "one file at a time: " + out.file + ", " + std::string(argument);
+          return std::nullopt;
+        }
+        out.file = argument;
+        continue;
+      }
       if (!out.words.empty()) out.words += ' ';
       out.words += argument;
       continue;

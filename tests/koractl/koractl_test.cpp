@@ -5,8 +5,10 @@
 #include <filesystem>
 #include <fstream>
 #include <map>
+#include <regex>
 #include <sstream>
 
+#include "base/version.h"
 #include "store/name_rec.h"
 #include "store/price_rec.h"
 #include "tests/support/places.h"
@@ -104,6 +106,13 @@ TEST_F(KoractlTest, EveryCommandButInitAndDemoNeedsASettingsFile) {
     ExpectAbandoned(words, "[KORA] There is no Kora.ini in " + home.path() + "/kora.");
   std::filesystem::create_directories(home.path() + "/kora/Kora.ini");
   ExpectAbandoned({"names"}, "[KORA] There is no Kora.ini in ");
+}
+
+TEST_F(KoractlTest, TheVersionIsThatOfTheProgramWithTheRevision) {
+  const std::string out = Out({"--version"});
+  EXPECT_TRUE(std::regex_match(out, std::regex("koractl " + std::string(kVersion) +
+                                               " \\(revision (unknown|[0-9a-f]{7,}(-dirty)?)\\)\n")))
+      << out;
 }
 
 TEST_F(KoractlTest, InitMakesAnEmptyInstallationAndNeverOverwritesOne) {

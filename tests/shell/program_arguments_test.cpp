@@ -30,6 +30,31 @@ TEST(ProgramArguments, NoneAreFine) {
   EXPECT_EQ(a->words, "");
 }
 
+TEST(ProgramArguments, WhatHasAPointOrASlashIsAFileAndStandsAnywhere) {
+  std::string fault;
+  const auto a = ParseProgramArguments({"RM", "charts/BHP.cht", "--home", "/h.cht", "A"}, fault);
+  ASSERT_TRUE(a);
+  EXPECT_EQ(a->file, "charts/BHP.cht");
+  EXPECT_EQ(a->words, "RM A");
+  EXPECT_EQ(a->home, "/h.cht");
+  EXPECT_FALSE(ParseProgramArguments({"a.cht", "b.cht"}, fault));
+  EXPECT_EQ(fault, "one file at a time: a.cht, b.cht");
+}
+
+TEST(ProgramArguments, HelpAndVersionAreAskedFor) {
+  std::string fault;
+  EXPECT_TRUE(ParseProgramArguments({"--help"}, fault)->help);
+  EXPECT_TRUE(ParseProgramArguments({"-h"}, fault)->help);
+  EXPECT_TRUE(ParseProgramArguments({"XT", "--version"}, fault)->version);
+  EXPECT_FALSE(ParseProgramArguments({"--home", "--version"}, fault)->version) << "a value";
+}
+
+TEST(ProgramArguments, TheHelpNamesEveryOptionAndWord) {
+  for (const char* part : {"--home DIR", "--set SECTION.KEY=VALUE", "--version", "-h,--help",
+                           "FILE.cht", "\n  RM ", "\n  A ", "\n  N ", "\n  XT ", "\n  XS "})
+    EXPECT_NE(ProgramHelp().find(part), std::string::npos) << part;
+}
+
 TEST(ProgramArguments, WrongOnesAreTold) {
   for (const std::vector<std::string>& wrong : {std::vector<std::string>{"--hom", "/h"},
                                                 {"--home"},

@@ -758,7 +758,11 @@ void Chts::ShowSaved() {
         QFileDialog::getOpenFileName(this, "Display Saved Chart", folder, "Saved charts (*.cht)");
     if (!file.isEmpty()) path = s_.files.DosPath(file.toStdString());
   }
-  if (path) Do([&] { window_.ShowSaved(*path); });
+  if (path) ShowSavedFile(*path);
+}
+
+void Chts::ShowSavedFile(const std::string& path) {
+  Do([&] { window_.ShowSaved(path); });
 }
 
 QImage Chts::Picture() {

@@ -70,6 +70,8 @@ class Chts : public QMainWindow {
   void Refresh();
   // Chart selection was left without a choice.
   void BackToChart();
+  // A saved chart by its DOS path.
+  void ShowSavedFile(const std::string& path);
   // The second chart of a pair was not chosen: the first is drawn alone again.
   void DropSecondChart();
   // After the data folder changed.

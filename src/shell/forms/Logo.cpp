@@ -129,6 +129,7 @@ void Logo::Timer() {
   if (AskForWaitingDownloads(session_.files, session_.settings.download, session_.dialogs))
     main_->OpenUpdate();
   close();
+  if (Opened) Opened(*main_);
 }
 
 }  // namespace kora

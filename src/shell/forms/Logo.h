@@ -21,6 +21,8 @@ class Logo : public QWidget {
 
   // Called with the main window before it shows.
   std::function<void(Main&)> Prepare;
+  // Called once the main window stands and the splash is gone.
+  std::function<void(Main&)> Opened;
 
   Main* main() const { return main_.get(); }
 

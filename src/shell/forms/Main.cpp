@@ -191,6 +191,14 @@ void Main::SetOpener(const std::string& entry, std::function<void()> open) {
   EnableMenus();
 }
 
+void Main::OpenSavedChart(const std::string& hostPath) {
+  try {
+    desk_.ShowSavedChart(session_.files.DosPath(hostPath));
+  } catch (const RunTimeError& e) {
+    session_.dialogs.Message(e.what(), kProgramTitle);
+  }
+}
+
 // The one place where what goes wrong in an entry's work is told.
 void Main::Open(const std::string& entry) {
   const auto opener = openers_.find(entry);

@@ -43,6 +43,8 @@ class Main : public QMainWindow {
   bool OpenPaths();
   // The list of waiting downloads, to take them in.
   void OpenUpdate() { updates_.OpenUpdate(); }
+  // The chart window with a saved chart, a file of the host.
+  void OpenSavedChart(const std::string& hostPath);
 
   Chts* charts() const { return desk_.window(); }
 

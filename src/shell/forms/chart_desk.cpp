@@ -115,14 +115,26 @@ void ChartDesk::OpenCharts() {
   OpenSelection();
 }
 
-void ChartDesk::ShowChart(std::int16_t ChartListNo, std::int16_t place) {
+void ChartDesk::StandWindow() {
   if (selectionForm_) delete selectionForm_;
   if (secondForm_) delete secondForm_;
   if (!chts_) {
     // In a run that has not met chart selection yet charts are drawn as the settings have them.
-    selection_.Load();
+    // Where there is nothing to select a saved chart can be shown all the same.
+    if (CountSecurities() > 0) selection_.Load();
     OpenWindow();
   }
+  if (auto* frame = qobject_cast<QMdiSubWindow*>(chts_->parentWidget()))
+    mdi_->setActiveSubWindow(frame);
+}
+
+void ChartDesk::ShowSavedChart(const std::string& path) {
+  StandWindow();
+  chts_->ShowSavedFile(path);
+}
+
+void ChartDesk::ShowChart(std::int16_t ChartListNo, std::int16_t place) {
+  StandWindow();
   ChartState& state = session_.charts;
   state.ChartListNo = ChartListNo;
   state.ChartListName = ChartListNo == kFullList ? std::string(" FULL LIST   (Names.Dat)")
@@ -131,9 +143,15 @@ void ChartDesk::ShowChart(std::int16_t ChartListNo, std::int16_t place) {
   state.ICFilter.clear();
   state.ChartDirection = 1;
   state.ChartIndex = std::int16_t(place);
-  if (auto* frame = qobject_cast<QMdiSubWindow*>(chts_->parentWidget()))
-    mdi_->setActiveSubWindow(frame);
   chts_->ShowChosen();
+}
+
+size_t ChartDesk::CountSecurities() const {
+  try {
+    return ReadNames(session_.files, session_.settings.paths.CurrentDataPath).size();
+  } catch (const RunTimeError&) {
+    return 0;
+  }
 }
 
 // Without one there is nothing to choose from, and what to do next is told instead.

@@ -44,6 +44,8 @@ class ChartDesk {
   // The chart at a place, from 1, of a chart list or of the whole name file; from there the window
   // pages through that list.
   void ShowChart(std::int16_t ChartListNo, std::int16_t place);
+  // A saved chart by its DOS path, as the chart window's own menu shows it.
+  void ShowSavedChart(const std::string& path);
   void OpenDefaults();       // ChtDef
   void OpenFonts();          // ChtFonts
   void OpenLists();          // SubList
@@ -63,6 +65,7 @@ class ChartDesk {
  private:
   QWidget* Over() const;
   void OpenWindow();
+  void StandWindow();
   void OpenSelection();
   void OpenSecondChart();
   void OpenView(int set);
@@ -70,6 +73,7 @@ class ChartDesk {
   void OpenMultiOsc();
   void OpenTexts();
   void PrintView();
+  size_t CountSecurities() const;  // 0 too where they can't be read
   bool AnySecurity();
   void WireWindow();
   void OfferStock();

@@ -12,6 +12,7 @@ constexpr const char* kFirstPage = "index.html";
 QString HelpPageOf(const QString& form) {
   static const QHash<QString, QString> pages{
       {"Main", "start.html"},
+      {"FirstStart", "start.html"},
       {"CPath", "folders.html"},
       {"Locate", "folders.html"},
       {"Chts", "charts.html"},

@@ -873,6 +873,53 @@ TEST_F(LogoTest, NoWaitingFilesNoMessageAndTheMainWindowStands) {
   EXPECT_EQ(logo->main()->findChild<QDialog*>("DLList"), nullptr);
 }
 
+TEST_F(LogoTest, ASavedChartIsShownOnceTheMainWindowStands) {
+  home.Put("drive_c/korawin/chtsave/a.cht", "L,10,10,300,200,255\r\n");
+  Make().Opened = [this](Main& main) {
+    EXPECT_FALSE(logo->isVisible());
+    main.OpenSavedChart(home.path() + "/drive_c/korawin/chtsave/a.cht");
+  };
+  EXPECT_TRUE(logo->Start(false));
+  EXPECT_TRUE(MainShows());
+  EXPECT_TRUE(dialogs.said.empty());
+  ASSERT_NE(logo->main()->charts(), nullptr);
+  EXPECT_TRUE(logo->main()->charts()->window().ChartFromFile);
+  EXPECT_EQ(logo->main()->charts()->window().SavedChartFile, "c:\\korawin\\chtsave\\a.cht");
+  EXPECT_EQ(logo->main()->findChild<QDialog*>("ChtSel"), nullptr);
+}
+
+TEST_F(LogoTest, ASavedChartNeedsNoSecurity) {
+  home.Put("drive_c/korawin/data/Names.dat", "");
+  home.Put("elsewhere/a.cht", "L,10,10,300,200,255\r\n");
+  Make().Opened = [this](Main& main) { main.OpenSavedChart(home.path() + "/elsewhere/a.cht"); };
+  EXPECT_TRUE(logo->Start(false));
+  EXPECT_TRUE(MainShows());
+  EXPECT_TRUE(dialogs.said.empty()) << dialogs.said.at(0).text;
+  EXPECT_TRUE(logo->main()->charts()->window().ChartFromFile);
+}
+
+TEST_F(LogoTest, AChartThatIsMissingOrNoneIsToldAndTheWindowStands) {
+  home.Put("none.cht", "Date,Close\r\n");
+  home.Put("picture.png", "L,10,10,300,200,255\r\n");
+  Make().Opened = [this](Main& main) {
+    for (const char* file : {"/missing.cht", "/none.cht", "/picture.png", "/folder/"})
+      main.OpenSavedChart(home.path() + file);
+  };
+  EXPECT_TRUE(logo->Start(false));
+  EXPECT_TRUE(MainShows());
+  ASSERT_EQ(dialogs.said.size(), 4u);
+  for (int i : {0, 1}) {
+    EXPECT_EQ(dialogs.said[size_t(i)].title, "Show Saved Chart");
+    EXPECT_EQ(dialogs.said[size_t(i)].text,
+              "There is problem displaying this chart - format invalid.");
+  }
+  for (int i : {2, 3}) {
+    EXPECT_EQ(dialogs.said[size_t(i)].title, "Saved Charts");
+    EXPECT_EQ(dialogs.said[size_t(i)].text, "File extension must be .cht");
+  }
+  EXPECT_FALSE(logo->main()->charts()->window().ChartFromFile);
+}
+
 TEST_F(LogoTest, WaitingFilesAreListedOnOkAndPassedOverOnCancel) {
   home.Put("drive_c/korawin/download/02NOV26.d", kDay);
   for (const Answer answer : {Answer::kOk, Answer::kCancel}) {
