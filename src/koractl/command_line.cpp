@@ -4,6 +4,7 @@
 
 #include "base/runtime_error.h"
 #include "koractl/command.h"
+#include "koractl/describe.h"
 #include "koractl/koractl.h"
 #include "koractl/options.h"
 #include "revision/revision.h"
@@ -88,6 +89,17 @@ int RunKoractl(int argc, const char* const* argv, Io& io) {
        })
     // clang-format on
     add(app, line);
+
+  // Asked by the scripts that complete what is typed in a shell, and by the build.
+  const std::vector<std::string> words(argv + (argc > 0 ? 1 : 0), argv + argc);
+  const std::string first = words.empty() ? "" : words.front();
+  if (first == "--complete" || first == "--manual") {
+    const std::string text = first == "--manual"
+                                 ? ManualSections(app)
+                                 : Candidates(app, {words.begin() + 1, words.end()}, io);
+    std::fwrite(text.data(), 1, text.size(), stdout);
+    return kDone;
+  }
 
   try {
     app.parse(argc, argv);

@@ -10,7 +10,14 @@ namespace kora {
 std::unique_ptr<Pictures> LoadPictures() {
   std::error_code error;
   const auto program = std::filesystem::read_symlink("/proc/self/exe", error);
-  const std::string file = (program.parent_path() / kPicturesFile).string();
+  std::string file = (program.parent_path() / kPicturesFile).string();
+  // Beside the program where it was built, otherwise where it was installed; by a way from the
+  // program, so that the whole of it can be moved.
+  for (const char* place : {"../" KORA_MODULE_PLACE, "../lib/kora"}) {
+    if (std::filesystem::exists(file, error)) break;
+    const auto installed = program.parent_path() / place / kPicturesFile;
+    if (std::filesystem::exists(installed, error)) file = installed.lexically_normal().string();
+  }
   const auto refuse = [&file](const std::string& why) {
     throw RunTimeError(kFileNotFound, "Pictures can't be drawn, only scripts (.cht): " + file +
                                           " can't be loaded" + why);
