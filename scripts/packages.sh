@@ -6,8 +6,11 @@ kora_packages=(
   libcli11-dev libgtest-dev libbenchmark-dev
   fonts-liberation
 )
-# For tests that are left out without them: those of a print queue.
-test_packages=(cups printer-driver-cups-pdf)
+# For tests that are left out without them: those of a print queue, and the checks of what is
+# installed.
+test_packages=(cups printer-driver-cups-pdf desktop-file-utils appstream man-db shared-mime-info)
+# For the packages of scripts/package.sh and their check.
+package_packages=(dpkg-dev lintian debootstrap)
 
 # Installs what is missing of the packages named. Nothing is asked, and nothing is looked up
 # where all are there.

@@ -1,4 +1,5 @@
 #include <dlfcn.h>
+#include <sys/auxv.h>
 
 #include <filesystem>
 
@@ -6,10 +7,22 @@
 #include "koractl/pictures/pictures.h"
 
 namespace kora {
+namespace {
+
+// The program's own file, its links followed; by the name it was started with where the host
+// does not show its processes.
+std::filesystem::path OwnProgram() {
+  std::error_code error;
+  if (auto program = std::filesystem::read_symlink("/proc/self/exe", error); !error) return program;
+  const auto* started = reinterpret_cast<const char*>(::getauxval(AT_EXECFN));
+  return started ? std::filesystem::canonical(started, error) : std::filesystem::path();
+}
+
+}  // namespace
 
 std::unique_ptr<Pictures> LoadPictures() {
   std::error_code error;
-  const auto program = std::filesystem::read_symlink("/proc/self/exe", error);
+  const auto program = OwnProgram();
   std::string file = (program.parent_path() / kPicturesFile).string();
   // Beside the program where it was built, otherwise where it was installed; by a way from the
   // program, so that the whole of it can be moved.
