@@ -151,11 +151,11 @@ std::optional<std::string> MergeBulletinLine(std::string_view text, const Bullet
   return line;
 }
 
-int CheckBulletins(const Files& files, const Settings& settings, const std::string& path,
-                   const std::string& baseName, Progress& progress) {
+void MergeBulletins(const Files& files, const Settings& settings, const std::string& path,
+                    const std::string& baseName, Progress& progress, int& added) {
   const std::string_view in = Trim(settings.download.ServiceIn);
   const std::string_view out = Trim(settings.download.ServiceOut);
-  if (in.empty() || in == kUnknown || out.empty() || out == kUnknown) return 0;
+  if (in.empty() || in == kUnknown || out.empty() || out == kUnknown) return;
   const BulletinRules rules{baseName, OptionsFolder(files, settings), settings.download.NoWarrants,
                             settings.NoShortNames, settings.AdjDivs};
   progress.Show(ProgressLine::kNote, "Checking and updating adjustments list.");
@@ -163,39 +163,44 @@ int CheckBulletins(const Files& files, const Settings& settings, const std::stri
                                                                 {".Sfe.Btn", ".Sfe.Btx"},
                                                                 {".Wcm.Btn", ".Wcm.Btx"},
                                                                 {".Btn", ".Btx"}};
-  int added = 0;
-  try {
-    const auto held = files.lock().Hold();
-    for (const auto& [input, copy] : kBulletins) {
-      const std::string from = WithBackslash(in) + baseName + input;
-      const std::string to = WithBackslash(out) + baseName + copy;
-      if (!files.CheckFile(from) || files.CheckFile(to)) continue;
-      const std::string text = files.ReadAll(from, kLargestBulletin);
-      if (text.empty()) continue;
-      const std::string listPath = AdjustListPath(path);
-      std::string list =
-          files.CheckFile(listPath) ? files.ReadAll(listPath, kLargestBulletin) : std::string();
-      if (!list.empty() && !list.ends_with('\n')) list += "\r\n";
-      int lines = 0;
-      LineReader reader(std::string_view(text).substr(text.starts_with("\xEF\xBB\xBF") ? 3 : 0));
-      std::string_view line;
-      while (reader.Next(line)) {
-        if (Trim(line).empty()) continue;
-        if (const auto merged = MergeBulletinLine(line, rules)) {
-          list += *merged + "\r\n";
-          ++lines;
-        }
+  const auto held = files.lock().Hold();
+  for (const auto& [input, copy] : kBulletins) {
+    const std::string from = WithBackslash(in) + baseName + input;
+    const std::string to = WithBackslash(out) + baseName + copy;
+    if (!files.CheckFile(from) || files.CheckFile(to)) continue;
+    const std::string text = files.ReadAll(from, kLargestBulletin);
+    if (text.empty()) continue;
+    const std::string listPath = AdjustListPath(path);
+    std::string list =
+        files.CheckFile(listPath) ? files.ReadAll(listPath, kLargestBulletin) : std::string();
+    if (!list.empty() && !list.ends_with('\n')) list += "\r\n";
+    int lines = 0;
+    LineReader reader(std::string_view(text).substr(text.starts_with("\xEF\xBB\xBF") ? 3 : 0));
+    std::string_view line;
+    while (reader.Next(line)) {
+      if (Trim(line).empty()) continue;
+      if (const auto merged = MergeBulletinLine(line, rules)) {
+        list += *merged + "\r\n";
+        ++lines;
       }
-      FileSet changes(files);
-      changes.Add(to, text);
-      if (lines > 0) changes.Add(listPath, std::move(list));
-      changes.Commit();
-      added += lines;
     }
-  } catch (const RunTimeError&) {
-    // The bulletin waits for the next run.
+    FileSet changes(files);
+    changes.Add(to, text);
+    if (lines > 0) changes.Add(listPath, std::move(list));
+    changes.Commit();
+    added += lines;
   }
   progress.Show(ProgressLine::kNote, "");
+}
+
+int CheckBulletins(const Files& files, const Settings& settings, const std::string& path,
+                   const std::string& baseName, Progress& progress) {
+  int added = 0;
+  try {
+    MergeBulletins(files, settings, path, baseName, progress, added);
+  } catch (const RunTimeError&) {
+    progress.Show(ProgressLine::kNote, "");  // the bulletin waits for the next run
+  }
   return added;
 }
 

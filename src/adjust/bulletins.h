@@ -31,10 +31,15 @@ std::optional<std::string> MergeBulletinLine(std::string_view line, const Bullet
 
 // Takes the bulletins of `baseName` ("15SEP98") that were not taken yet from the download-in
 // folder into Adjust.Lst of the folder `path`, and copies each to the download-out folder, which
-// marks it as taken. List and copy change together. Returns the number of lines added; what
-// fails ends the work without a word, with the bulletin as it was, to be taken the next time.
+// marks it as taken. List and copy change together. Adds the number of new lines to `added`. What
+// fails is raised, with the bulletin in hand as it was, to be taken the next time.
 //
 // Its progress is a line kNote, empty again at the end.
+void MergeBulletins(const Files& files, const Settings& settings, const std::string& path,
+                    const std::string& baseName, Progress& progress, int& added);
+
+// The same behind an update, which goes on without a word where it fails. Returns the number of
+// lines added.
 int CheckBulletins(const Files& files, const Settings& settings, const std::string& path,
                    const std::string& baseName, Progress& progress);
 

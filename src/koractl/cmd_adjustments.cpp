@@ -35,8 +35,8 @@ int TakeBulletins(const CommandLine& line, const std::string& name) {
     folder = WithBackslash(Trim(lines[kWmAsx]));
   }
   PassBar bar(run.dialogs, "Bulletins");
-  const int added =
-      CheckBulletins(run.session.files, settings, folder, std::string(Trim(name)), bar.get());
+  int added = 0;
+  MergeBulletins(run.session.files, settings, folder, std::string(Trim(name)), bar.get(), added);
   WriteOut("# Added=" + Str(std::int32_t(added)) + "\n");
   return kDone;
 }

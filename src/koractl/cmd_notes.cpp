@@ -49,8 +49,8 @@ void AddNote(Run& run, const NoteOptions& o, const ChartRequest& request, const 
   tool.Press({at[0], at[1]}, MouseButton::kLeft);
   for (const char c : o.text) tool.Type(char32_t(static_cast<unsigned char>(c)));
   tool.Type(13);
-  if (script.text().size() == before && !run.dialogs.said())
-    run.Abandon("There is no text to keep", kTitle);
+  if (run.dialogs.said()) throw Abandoned();  // it told why the text is not on file
+  if (script.text().size() == before) run.Abandon("There is no text to keep", kTitle);
 }
 
 // `n` counts the texts as they are listed; lines that are none stay.

@@ -170,8 +170,14 @@ bool SaveEntry(const Files& files, EntrySecurity& security, const EntryTexts& te
                            throw RunTimeError(
                                kOverflow, "the file is full, with " + Str(file.count()) + " days");
                          // A record at the end of a file that was not written whole does not count.
+                         const std::int32_t days = file.count();
                          file.Append(rec);
-                         file.Flush();
+                         try {
+                           file.Flush();
+                         } catch (const RunTimeError&) {
+                           file.Truncate(days);  // told as not saved: it is entered again
+                           throw;
+                         }
                          security.previous = rec;
                        } catch (const Refused& refused) {
                          focus = refused.box;

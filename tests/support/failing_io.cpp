@@ -13,10 +13,8 @@ class FailingIo::File : public ForwardingFile {
     return base_->ReadAt(offset, data, size);
   }
   void WriteAt(std::uint64_t offset, const void* data, size_t size) override {
-    if (io_.Fails()) {
-      if (io_.torn && io_.calls == io_.failAt) base_->WriteAt(offset, data, size / 2);
-      throw RunTimeError(io_.error);
-    }
+    if (io_.torn && io_.calls + 1 == io_.failAt) base_->WriteAt(offset, data, size / 2);
+    if (io_.Fails()) throw RunTimeError(io_.error);
     base_->WriteAt(offset, data, size);
   }
   void Truncate(std::uint64_t size) override {
