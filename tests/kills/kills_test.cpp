@@ -322,7 +322,10 @@ TEST_P(Kills, AreOldOrNewAndTheNextRunEndsIt) {
   LayScene();
   if (HasFatalFailure()) return;
   ++tally.operations;
-  for (const bool torn : {false, true})
+  // A torn write shows where records are written in place; elsewhere it is of a file that is not in
+  // place yet.
+  for (const bool torn : {false, true}) {
+    if (torn && !(GetParam().ends & (kDayByDay | kAppends))) break;
     for (int at = 1; at <= changes; at += Stride()) {
       SCOPED_TRACE("killed at change " + std::to_string(at) + (torn ? ", torn" : ""));
       LayStore(home.path(), before);
@@ -353,14 +356,18 @@ TEST_P(Kills, AreOldOrNewAndTheNextRunEndsIt) {
       ExpectSame(end, whole);
       if (HasFailure()) return;
     }
+  }
 }
 
 // A failure is told, and all is as it was.
 TEST_P(Kills, FailuresAreToldAndChangeNothing) {
   LayScene();
   if (HasFatalFailure()) return;
-  for (const int error : {kDiskFull, kPathAccess, kDeviceError, kTooManyFiles})
+  // Each change fails with two of them.
+  const int errors[] = {kDiskFull, kPathAccess, kDeviceError, kTooManyFiles};
+  for (const int turn : {0, 1})
     for (int at = 1; at <= changes; at += Stride()) {
+      const int error = errors[(2 * turn + at) % 4];
       SCOPED_TRACE("error " + std::to_string(error) + " at change " + std::to_string(at));
       LayStore(home.path(), before);
       const ChildRun run = Run(GetParam().command, [&](FailingIo& io) {
