@@ -138,7 +138,7 @@ TEST_F(MaintenanceCommand, PricesAreExported) {
   EXPECT_EQ(home.Get("kora/drive_c/korawin/chtmisc/OLD.Txt"), "OLD,10/9/98,3,3,3,3,0\r\n");
 }
 
-// A day typed in, a code changed, a file moved, all checked, a date removed: the backup brings every
+// A day typed in, a price corrected, a code changed, a file moved, all checked, a date removed: the backup brings every
 // chart back as it was.
 TEST_F(MaintenanceCommand, EveryChartLooksAsBeforeBehindARestore) {
   Good({"demo", "--securities", "8", "--years", "1"});
@@ -159,6 +159,7 @@ TEST_F(MaintenanceCommand, EveryChartLooksAsBeforeBehindARestore) {
   Good({"enter", codes[0], "--date", "1/1/30", "--open", "1", "--high", "2", "--low", "1",
         "--close", "2"});
   EXPECT_NE(charts(), before);
+  Good({"edit", codes[3], "set", "5", "Close", "99.5"});
   Good({"change-code", codes[1], "QQQ"});
   fs::create_directories(home.path() + "/kora/drive_c/m/b");
   Good({"move", codes[2], "--from", "c:\\korawin\\data", "--to", "c:\\m\\b"});
