@@ -954,8 +954,11 @@ bool ChartWindow::ChangeSpacing(int by) {
   if (Loading || !HasChart() || ChartFromFile || IsPair(arrangement_) ||
       s.ChartStyle == Style::kPointFigure)
     return false;
-  const bool three = s.ChartStyle == Style::kCandlestick || s.SwingOn;
-  const auto spacing = std::int16_t(std::clamp(int(s.BarSpacing) + by, three ? 3 : 1, 20));
+  const int needed = s.ChartStyle == Style::kCandlestick || s.SwingOn ? 3 : 1;
+  const int now = s.BarSpacing > 0 ? s.BarSpacing : 2;
+  // What is closer already is not moved apart by narrowing.
+  const int least = by > 0 ? needed : std::min(now, needed);
+  const auto spacing = std::int16_t(std::clamp(now + by, least, 20));
   if (spacing == s.BarSpacing) return false;
   s.BarSpacing = services_.settings.charts.Spacing = spacing;
   return DrawAll();

@@ -346,6 +346,8 @@ TEST_F(ChtsWheelTest, WithControlTheSpacingChangesFromOneToTwenty) {
   EXPECT_EQ(request().BarSpacing, 1);
   EXPECT_EQ(LastDate(), "20260204");
   Press("cstick");
+  Turn(-1, Qt::ControlModifier);
+  EXPECT_EQ(request().BarSpacing, 1) << "no wider by narrowing";
   Turn(4, Qt::ControlModifier);
   Turn(-30, Qt::ControlModifier);
   EXPECT_EQ(request().BarSpacing, 3) << "a candle needs three";

@@ -35,8 +35,7 @@ namespace kora {
 namespace {
 
 // Controls that can take the keyboard and have no name, by the accessible tree, as a screen reader
-// walks it; tables and lists are left to the names
-// of their rows.
+// walks it; tables and lists are left to the names of their rows.
 void AccessiblyNameless(QAccessibleInterface* node, int depth, std::set<std::string>& found) {
   if (!node || depth > 12 || node->state().invisible || node->state().disabled) return;
   const QObject* object = node->object();
