@@ -284,6 +284,24 @@ TEST_F(KoractlTest, AChartsScriptIsTheSameInAFileAndOnStandardOutput) {
   EXPECT_NE(home.Get("chart.svg").find("Abcot Mining"), std::string::npos);
 }
 
+TEST_F(KoractlTest, ANewInstallationHasLegibleLabelsAndAMissingKeyHasNot) {
+  EXPECT_EQ(Run({"demo", "--securities", "8", "--years", "1"}).code, 0);
+  EXPECT_NE(home.Get("kora/Kora.ini").find("Legible=True\r\n"), std::string::npos);
+  std::filesystem::remove_all(home.path() + "/kora");
+  MakeHome();
+  EXPECT_NE(home.Get("kora/Kora.ini").find("Legible=True\r\n"), std::string::npos);
+  home.Put("dear.csv", "DEAR,20240104,1000,1010,990,1000,100,0\r\n");
+  EXPECT_EQ(Run({"import", home.path() + "/dear.csv"}).code, 0);
+  const std::string legible = Out({"chart", "DEAR", "--out", "-"});
+  EXPECT_NE(legible.find("S,8.25,1,"), std::string::npos);
+  std::string ini = home.Get("kora/Kora.ini");
+  ini.erase(ini.find("Legible=True\r\n"), 14);
+  home.Put("kora/Kora.ini", ini);
+  const std::string plain = Out({"chart", "DEAR", "--out", "-"});
+  EXPECT_NE(plain.find("S,8.25,-3,"), std::string::npos);
+  EXPECT_EQ(Out({"chart", "DEAR", "--set", "Charts.Legible=True", "--out", "-"}), legible);
+}
+
 TEST_F(KoractlTest, ChartsFollowTheirOptions) {
   MakeHome();
   const std::string plain = Out({"chart", "ABC", "--out", "-"});

@@ -35,6 +35,10 @@ TEST_F(SessionTest, AMissingSettingsFileStartsThePromptOfTheDrive) {
   EXPECT_TRUE(ReadAllSettings(session, "", false));
   EXPECT_EQ(session.settings.paths.SystemPath, "C:\\korawin\\");
   EXPECT_EQ(session.ini.GetSetting("KoraPaths", "System"), "C:\\korawin\\");
+  // What a new installation has on.
+  for (const char* key : {"DarkPaper", "FitSide", "KeepOsc", "Legible"})
+    EXPECT_EQ(session.ini.GetSetting("Charts", key), "True") << key;
+  EXPECT_TRUE(session.settings.charts.Legible);
 }
 
 TEST_F(SessionTest, TheTwoPrinterQuestionsComeOnceWhenThereIsNoAnswerYet) {
