@@ -35,6 +35,21 @@ void FormStyle::drawPrimitive(PrimitiveElement element, const QStyleOption* opti
   painter->restore();
 }
 
+QIcon FormStyle::standardIcon(StandardPixmap which, const QStyleOption* option,
+                              const QWidget* widget) const {
+  if (which != SP_ToolBarHorizontalExtensionButton)
+    return QProxyStyle::standardIcon(which, option, widget);
+  constexpr int kSize = 32;
+  QPixmap arrows(kSize, kSize);
+  arrows.fill(Qt::transparent);
+  QPainter painter(&arrows);
+  painter.setRenderHint(QPainter::Antialiasing);
+  const QPalette colours = widget ? widget->palette() : QApplication::palette();
+  painter.setPen(QPen(colours.color(QPalette::ButtonText), 3));
+  for (const int x : {7, 17}) painter.drawPolyline(QPolygon({{x, 8}, {x + 8, 16}, {x, 24}}));
+  return QIcon(arrows);
+}
+
 void InstallFormStyle() {
   if (QApplication::style()->name() == kOwnStyle) QApplication::setStyle(new FormStyle);
 }

@@ -39,6 +39,25 @@ TEST(FormStyle, BoxesAndButtonsHaveARimOnADarkGround) {
   }
 }
 
+TEST(FormStyle, TheArrowsOfAToolBarHaveTheColourOfItsTexts) {
+  FormStyle style;
+  QWidget bar;
+  for (const QColor text : {QColor(Qt::white), QColor(Qt::black)}) {
+    QPalette colours;
+    colours.setColor(QPalette::ButtonText, text);
+    bar.setPalette(colours);
+    const QImage arrows =
+        style.standardIcon(QStyle::SP_ToolBarHorizontalExtensionButton, nullptr, &bar)
+            .pixmap(32, 32)
+            .toImage();
+    int drawn = 0;
+    for (int y = 0; y < arrows.height(); ++y)
+      for (int x = 0; x < arrows.width(); ++x)
+        drawn += arrows.pixelColor(x, y).alpha() > 250 && arrows.pixelColor(x, y) == text;
+    EXPECT_GT(drawn, 20);
+  }
+}
+
 TEST(FormStyle, OnALightGroundTheyAreAsTheyWere) {
   FormStyle style;
   QCheckBox box;
