@@ -3,6 +3,8 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <fstream>
+#include <iterator>
 
 #include "tests/support/help_text.h"
 #include "tests/support/places.h"
@@ -153,6 +155,36 @@ TEST(Completion, FishListsEveryCommand) {
   };
   EXPECT_EQ(offered("koractl "), Commands());
   EXPECT_EQ(offered("koractl chart --style "), (std::set<std::string>{"B", "C", "L", "P"}));
+}
+
+TEST(Completion, OfKoraHasItsOptionsWordsAndCharts) {
+  const std::string help = RunProgram(BinDir() + "/kora", {"--help"}).out;
+  const auto words = WordsUnder(help, "Words:");
+  EXPECT_EQ(words.size(), 5u);
+  for (const char* name : {"kora.bash", "_kora", "kora.fish"}) {
+    std::ifstream in(Script(name));
+    const std::string script{std::istreambuf_iterator<char>(in), {}};
+    for (std::string option : {"home", "set", "help", "version"})
+      EXPECT_NE(script.find(option), script.npos) << name << " " << option;
+    EXPECT_NE(script.find("RM A N XT XS"), script.npos) << name;
+  }
+  const std::string bash = Shell("bash");
+  if (bash.empty()) GTEST_SKIP() << "bash is not installed";
+  TempHome home;
+  for (const char* file : {"a.cht", "b.png", "folder/c.cht"}) home.Put(file, "");
+  const auto offered = [&](const std::string& typed) {
+    return FirstColumn(RunProgram(bash,
+                                  {"--norc", "-c",
+                                   "cd '" + home.path() + "'; source '" + Script("kora.bash") +
+                                       "'; COMP_WORDS=(kora \"$1\"); COMP_CWORD=1; _kora; "
+                                       "printf '%s\\n' \"${COMPREPLY[@]}\"",
+                                   "bash", typed})
+                           .out);
+  };
+  auto all = words;
+  all.insert({"a.cht", "folder", "drive_c"});
+  EXPECT_EQ(offered(""), all);
+  EXPECT_EQ(offered("--h"), (std::set<std::string>{"--help", "--home"}));
 }
 
 }  // namespace

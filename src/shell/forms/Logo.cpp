@@ -47,7 +47,8 @@ Logo::Logo(Session& session, std::string commandLine)
   colours.setColor(QPalette::WindowText, Qt::white);
   setPalette(colours);
 
-  QApplication::setWindowIcon(Emblem(7, 4, 1));
+  // The icon that was installed; without it the emblem.
+  QApplication::setWindowIcon(QIcon::fromTheme("org.koracharting.kora", QIcon(Emblem(7, 4, 1))));
 
   auto* column = new QVBoxLayout(this);
   auto* title = new QLabel(ToQt(kProgramTitle), this);
