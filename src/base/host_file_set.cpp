@@ -269,12 +269,13 @@ void HostFileSet::Commit() {
     }
     throw;
   }
-  RemoveJournal();
-  // What gave way is no longer wanted. One that stays is taken away by the next write.
+  // What gave way is no longer wanted. Until it is gone the journal stands, so that the next writer
+  // sweeps what a kill leaves; without a journal the next write of the file does.
   for (Step& step : steps_) {
     if (step.kept) Quietly([&] { io_.Remove(step.aside); });
     step.kept = false;
   }
+  RemoveJournal();
   Clear();
 }
 

@@ -1,6 +1,7 @@
 #include "base/file_set.h"
 
 #include <gtest/gtest.h>
+#include <signal.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -166,6 +167,43 @@ TEST(FileSetTest, KilledAnywhereAllAreOldOrAllAreNewForTheNextWriter) {
     EXPECT_FALSE(home.Exists("Kora.set~"));
   }
   EXPECT_GT(finished, 5);
+}
+
+// Dies in place of the n-th removal of a file that a commit had beside another.
+struct DiesSweeping : ForwardingIo {
+  int dieAt = 0;
+  void Remove(const std::string& path) override {
+    if (path.ends_with('~') && --dieAt == 0) ::raise(SIGKILL);
+    ForwardingIo::Remove(path);
+  }
+};
+
+TEST(FileSetTest, KilledWhileItSweepsTheNextWriterSweeps) {
+  DiesSweeping io;
+  TempHome home(io);
+  int kills = 0;
+  for (int at = 1;; ++at) {
+    ASSERT_LT(at, 100);
+    PutBefore(home);
+    const pid_t child = ::fork();
+    if (child == 0) {
+      io.dieAt = at;
+      ::_exit(ErrorOf([&] {
+        FileSet set(home.files());
+        FillSet(set);
+        set.Commit();
+      }));
+    }
+    int status = 0;
+    EXPECT_EQ(::waitpid(child, &status, 0), child);
+    if (!WIFSIGNALED(status)) break;
+    ++kills;
+    { const auto held = home.files().lock().Hold(); }
+    EXPECT_EQ(ContentsOf(home), kAfter) << at;
+    for (const std::string& name : home.files().List("c:\\"))
+      EXPECT_FALSE(name.ends_with('~')) << name << " at " << at;
+  }
+  EXPECT_GT(kills, 2);
 }
 
 TEST(FileSetTest, AJournalCutShortOrOfRubbishIsClearedAwayAndChangesNothing) {
