@@ -7,6 +7,7 @@
 
 #include "chart/script_player.h"
 #include "chartwindow/forms/Chts.h"
+#include "chartwindow/tools/saved_marks.h"
 #include "chartwindow/tools/zoom_chart.h"
 #include "demo/demo_market.h"
 #include "indicators/osc_settings.h"
@@ -179,6 +180,32 @@ void ComposeLines(benchmark::State& bench) {
   bench.counters["lines"] = double(ReadTrendlines(market.files, path).size());
 }
 
+// Reading 200 saved lines and finding their places on that chart, without drawing them.
+void PlaceLines(benchmark::State& bench) {
+  Market market;
+  QtRasterSurface price(1280, 800), panel(1280, 144);
+  ChartWindow window = market.Window(price, panel);
+  window.Load();
+  window.NextChart();
+  const Composition& chart = window.Chart;
+  const std::string& misc = market.settings.paths.ChartMiscPath;
+  const std::string code(window.Request.Name.Code.trimmed());
+  market.files.MakeFolder(misc);
+  RemoveTrendlines(market.files, TrendlinePath(misc, code));
+  for (int i = 0; i < 200; ++i) {
+    const double x = chart.ChartLeft + (i % 100 + 1) * double(chart.BarSpacing);
+    const auto line = TrendlineOf(chart, window.Request, {x, 150.0 + i, x + 40, 160.0 + i});
+    if (line) SaveTrendline(market.files, TrendlinePath(misc, code), *line);
+  }
+  int placed = 0;
+  for (auto _ : bench) {
+    placed = 0;
+    for (const TrendlineRec& rec : ReadSavedMarks(market.files, misc, code).lines)
+      placed += PlaceTrendline(chart, window.Request, rec).has_value();
+  }
+  bench.counters["placed"] = placed;
+}
+
 // Forty bars of a candle chart over 1280 x 800, beside the composition of that chart.
 void ZoomOf40(benchmark::State& bench, bool zoom) {
   Market market;
@@ -238,6 +265,7 @@ BENCHMARK(ComposeLines)
     ->Arg(0)
     ->Arg(200)
     ->Unit(benchmark::kMicrosecond);
+BENCHMARK(PlaceLines)->Name("WindowPlaceSavedLines")->Unit(benchmark::kMicrosecond);
 BENCHMARK(ComposeCandles)->Name("WindowComposeCandles1280x800")->Unit(benchmark::kMicrosecond);
 BENCHMARK(Zoom40)->Name("WindowZoomOf40Bars")->Unit(benchmark::kMicrosecond);
 BENCHMARK(ComposeSaved)->Name("WindowComposeChart")->Unit(benchmark::kMicrosecond);
