@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -28,13 +29,22 @@ std::string_view DateAt(const Composition& chart, std::int32_t column) {
 
 bool IsDigit(char c) { return c >= '0' && c <= '9'; }
 
-// x of the first bar from `first` on with that date or a later one; 0 where there is none.
-double XOfDate(const Composition& chart, std::int32_t first, std::string_view date) {
+// Eight bytes as a number that sorts as they do: bars are many, and saved lines too.
+std::uint64_t SortKey(std::string_view date) {
+  std::uint64_t key = 0;
+  for (size_t i = 0; i < 8; ++i)
+    key = key << 8 | (i < date.size() ? static_cast<unsigned char>(date[i]) : 0);
+  return key;
+}
+
+// The first bar from `first` on with that date or a later one; -1 where there is none.
+std::int32_t ColumnOfDate(const Composition& chart, std::int32_t first, std::string_view date) {
   const auto last =
       std::min<std::int32_t>(chart.Bars.BarCount, std::int32_t(chart.Bars.bars.size()) - 1);
+  const std::uint64_t wanted = SortKey(date);
   for (std::int32_t column = first; column <= last; ++column)
-    if (chart.Bars[size_t(column)].date() >= date) return XOfColumn(chart, column);
-  return 0;
+    if (SortKey(chart.Bars[size_t(column)].date()) >= wanted) return column;
+  return -1;
 }
 
 double YOfPrice(const Composition& chart, double price) {
@@ -85,11 +95,14 @@ std::optional<ScreenLine> Place(const Composition& chart, const ChartRequest& re
   const std::string_view start = rec.TLStartDate.raw(), end = rec.TLEndDate.raw();
   if (rec.TLStartDate.trimmed().empty() || start < DateAt(chart, 1)) return std::nullopt;
   ScreenLine line;
-  line.x1 = XOfDate(chart, 1, start);
-  if (line.x1 == 0) return std::nullopt;
+  const std::int32_t from = ColumnOfDate(chart, 1, start);
+  if (from < 0) return std::nullopt;
+  line.x1 = XOfColumn(chart, from);
   if (IsDigit(end.front())) {
-    line.x2 = XOfDate(chart, 1, end);
-    if (line.x2 == 0) return std::nullopt;
+    // A later date stands on no earlier bar.
+    const std::int32_t to = ColumnOfDate(chart, end < start ? 1 : from, end);
+    if (to < 0) return std::nullopt;
+    line.x2 = XOfColumn(chart, to);
   } else if (end.front() == 'X') {
     line.x2 = line.x1 + chart.BarSpacing * Val(end.substr(1));
   } else {
@@ -143,7 +156,8 @@ std::optional<NotePlace> PlaceNote(const Composition& chart, const NoteLine& not
   try {
     if (note.Date.size() == 8 && std::all_of(note.Date.begin(), note.Date.end(), IsDigit)) {
       if (note.Date < DateAt(chart, 0)) return std::nullopt;
-      place.x = XOfDate(chart, 0, note.Date);
+      const std::int32_t column = ColumnOfDate(chart, 0, note.Date);
+      place.x = column < 0 ? 0 : XOfColumn(chart, column);
     } else {
       place.x = Val(note.Date);
     }
