@@ -249,10 +249,13 @@ class Kills : public ::testing::TestWithParam<Operation> {
   // Nothing that was there is missing, records are whole, and each file is an old or a new one.
   void ExpectSound(const Store& after) {
     for (const auto& [name, bytes] : before)
-      if (whole.contains(name)) EXPECT_TRUE(after.contains(name)) << name << " is missing";
+      if (whole.contains(name)) {
+        EXPECT_TRUE(after.contains(name)) << name << " is missing";
+      }
     for (const auto& [name, bytes] : after) {
-      if (!(GetParam().ends & (kDayByDay | kAppends)))
+      if (!(GetParam().ends & (kDayByDay | kAppends))) {
         EXPECT_EQ(bytes.size() % RecordSize(name), 0u) << name;
+      }
       const auto old = before.find(name), fresh = whole.find(name);
       const bool known = (old != before.end() && old->second == bytes) ||
                          (fresh != whole.end() && fresh->second == bytes);
@@ -340,8 +343,9 @@ TEST_P(Kills, AreOldOrNewAndTheNextRunEndsIt) {
       OpenAgain();
       const Store opened = StoreOf(home.path());
       ExpectSound(opened);
-      if (GetParam().ends == kWhole)
+      if (GetParam().ends == kWhole) {
         EXPECT_TRUE(WithoutCopy(opened) == WithoutCopy(before) || opened == whole);
+      }
       Store end = opened;
       if (IsToRunAgain(opened)) {
         const ChildRun again = Run(GetParam().command);
@@ -383,7 +387,9 @@ TEST_P(Kills, FailuresAreToldAndChangeNothing) {
       } else {
         EXPECT_EQ(run.code, 1) << run.err;
         EXPECT_NE(run.err, "");
-        if (GetParam().ends == kWhole) EXPECT_TRUE(WithoutCopy(after) == WithoutCopy(before));
+        if (GetParam().ends == kWhole) {
+          EXPECT_TRUE(WithoutCopy(after) == WithoutCopy(before));
+        }
       }
       for (const std::string& name : TemporariesOf(home.path()))
         ADD_FAILURE() << name << " is left over";

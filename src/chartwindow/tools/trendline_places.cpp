@@ -82,7 +82,7 @@ std::optional<TrendlineRec> MakeRecord(const Composition& chart, const ChartRequ
     if (end.empty()) return std::nullopt;
     rec.TLEndDate.set(end);
   } else {
-    rec.TLEndDate.set("X" + Str(CLng(Divide(line.x2 - line.x1, chart.BarSpacing))));
+    rec.TLEndDate.set(std::string("X") + Str(CLng(Divide(line.x2 - line.x1, chart.BarSpacing))));
   }
   rec.TLSpacing = CInt(chart.BarSpacing + 1.0);
   rec.TLPeriod.set(TextOf(request.ChartPeriod));
