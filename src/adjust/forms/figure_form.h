@@ -29,6 +29,7 @@ struct FigureFormServices {
 // and its look-up. Each kind gives its texts.
 class FigureForm : public QDialog {
  public:
+  ~FigureForm() override;
   // Another security is on show: what was looked up is forgotten.
   void SecurityChanged() { Forget(); }
   void done(int result) override;
