@@ -3,13 +3,13 @@
 #include <QHeaderView>
 #include <QLabel>
 #include <QMenuBar>
-#include <QScreen>
 #include <QVBoxLayout>
 #include <algorithm>
 
 #include "adjust/forms/AdjOpts.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "platform/qt/form_parts.h"
 #include "platform/qt/to_qt.h"
 
 namespace kora {
@@ -95,9 +95,7 @@ AdjList::AdjList(AdjListServices services, QWidget* parent)
   rows->addWidget(panel_);
   AddMenu();
   panel_->Hold({ss1_, bar_});
-  const QFontMetrics metrics = fontMetrics();
-  resize(QSize(metrics.averageCharWidth() * 130, metrics.height() * 32)
-             .boundedTo(screen()->availableSize() * 0.9));
+  SizeInLetters(this, 130, 32);
   ss1_->setFocus();
 }
 
@@ -107,41 +105,36 @@ AdjList::~AdjList() { delete ss1_; }
 void AdjList::AddMenu() {
   bar_ = new QMenuBar(this);
   layout()->setMenuBar(bar_);
-  const auto entry = [this](QMenu* menu, const char* name, const char* caption, auto work) {
-    QAction* action = menu->addAction(caption, this, work);
-    action->setObjectName(name);
-    return action;
-  };
   QMenu* file = bar_->addMenu("&File");
-  entry(file, "alSave", "&Save", [this] { Save(); })->setShortcut(QKeySequence::Save);
-  entry(file, "alPage", "Pa&ge Setup", [this] {
+  AddEntry(this, file, "alSave", "&Save", [this] { Save(); })->setShortcut(QKeySequence::Save);
+  AddEntry(this, file, "alPage", "Pa&ge Setup", [this] {
     services_.pageSetup(this);
   })->setEnabled(bool(services_.pageSetup));
-  entry(file, "alPrint", "&Print Adjustments List", [this] {
+  AddEntry(this, file, "alPrint", "&Print Adjustments List", [this] {
     Print();
   })->setEnabled(bool(services_.print));
   file->addSeparator();
-  entry(file, "alExit", "&Close", [this] { reject(); });
+  AddEntry(this, file, "alExit", "&Close", [this] { reject(); });
 
   QMenu* edit = bar_->addMenu("&Edit");
-  entry(edit, "alSort", "&Sort List", [this] { Sort(); });
+  AddEntry(this, edit, "alSort", "&Sort List", [this] { Sort(); });
   edit->addSeparator();
   for (const char letter : {'Y', 'N', 'D'})
-    entry(edit,
-          letter == 'Y'   ? "alSetY"
-          : letter == 'N' ? "alSetN"
-                          : "alSetD",
-          letter == 'Y'   ? "Set all ADJ items to Y"
-          : letter == 'N' ? "Set all ADJ items to N"
-                          : "Set all ADJ items to D",
-          [this, letter] { Change([this, letter] { MarkAll(rows_, letter); }); });
+    AddEntry(this, edit,
+             letter == 'Y'   ? "alSetY"
+             : letter == 'N' ? "alSetN"
+                             : "alSetD",
+             letter == 'Y'   ? "Set all ADJ items to Y"
+             : letter == 'N' ? "Set all ADJ items to N"
+                             : "Set all ADJ items to D",
+             [this, letter] { Change([this, letter] { MarkAll(rows_, letter); }); });
   edit->addSeparator();
-  entry(edit, "rmOPTS", "Remove ASX.OPT and OPT from list",
-        [this] { Change([this] { MarkOptions(rows_); }); });
-  entry(edit, "rmWNT", "Remove ASX.WNT and WNT from list",
-        [this] { Change([this] { MarkWarrants(rows_); }); });
+  AddEntry(this, edit, "rmOPTS", "Remove ASX.OPT and OPT from list",
+           [this] { Change([this] { MarkOptions(rows_); }); });
+  AddEntry(this, edit, "rmWNT", "Remove ASX.WNT and WNT from list",
+           [this] { Change([this] { MarkWarrants(rows_); }); });
   edit->addSeparator();
-  entry(edit, "alDelRow", "&Delete Row/s", [this] { ss1_->DeleteSelected(); });
+  AddEntry(this, edit, "alDelRow", "&Delete Row/s", [this] { ss1_->DeleteSelected(); });
 
   const auto top = [this](const char* name, const char* caption, auto work) {
     QAction* action = bar_->addAction(caption, this, work);

@@ -59,10 +59,7 @@ FigureForm::FigureForm(FigureFormServices services, IssueKind kind, const Texts&
   FocusField(first_ ? first_ : amount_);
 }
 
-// A box that loses the focus as its form goes has nobody left to tell.
-FigureForm::~FigureForm() {
-  for (QLineEdit* box : findChildren<QLineEdit*>()) box->disconnect(this);
-}
+FigureForm::~FigureForm() { ForgetBoxes(this); }
 
 QLineEdit* FigureForm::AddBox(QGridLayout* grid, const char* name, const char* caption) {
   QLineEdit* box = NewField(this, name, 10, 20);

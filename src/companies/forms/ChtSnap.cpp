@@ -3,7 +3,6 @@
 #include <QComboBox>
 #include <QLabel>
 #include <QMenuBar>
-#include <QScreen>
 #include <QTabWidget>
 #include <QVBoxLayout>
 
@@ -160,9 +159,7 @@ ChtSnap::ChtSnap(ChtSnapServices services, QWidget* parent)
     if (AskToSave()) ChooseList(index + 1);
     combo1_->setCurrentIndex(list_ - 1);
   });
-  const QFontMetrics metrics = fontMetrics();
-  resize(QSize(metrics.averageCharWidth() * 110, metrics.height() * 30)
-             .boundedTo(screen()->availableSize() * 0.9));
+  SizeInLetters(this, 110, 30);
 }
 
 // A cell that is open asks the rows once more as it goes.
@@ -191,36 +188,31 @@ Grid* ChtSnap::Front() const { return sheets_->currentIndex() == 0 ? ss1_ : ss2_
 void ChtSnap::AddMenu() {
   auto* bar = new QMenuBar(this);
   layout()->setMenuBar(bar);
-  const auto entry = [this](QMenu* menu, const char* name, const char* caption, auto work) {
-    QAction* action = menu->addAction(caption, this, work);
-    action->setObjectName(name);
-    return action;
-  };
   QMenu* file = bar->addMenu("&File");
   file->setObjectName("csFile");
-  entry(file, "smSave", "&Save List ", [this] { Save(); });
-  entry(file, "csPage", "Page Set&up", [this] {
+  AddEntry(this, file, "smSave", "&Save List ", [this] { Save(); });
+  AddEntry(this, file, "csPage", "Page Set&up", [this] {
     services_.pageSetup(this);
   })->setEnabled(bool(services_.pageSetup));
-  entry(file, "csPnt", "&Print", [this] { Print(); })->setEnabled(bool(services_.print));
-  entry(file, "csExit", "&Close", [this] { reject(); });
+  AddEntry(this, file, "csPnt", "&Print", [this] { Print(); })->setEnabled(bool(services_.print));
+  AddEntry(this, file, "csExit", "&Close", [this] { reject(); });
   QMenu* edit = bar->addMenu("&Edit");
   edit->setObjectName("csEdit");
-  entry(edit, "csAdd", "&Add Row", [this] { Add(); });
-  entry(edit, "cdDel", "&Delete Row/s", [this] { Front()->DeleteSelected(); });
+  AddEntry(this, edit, "csAdd", "&Add Row", [this] { Add(); });
+  AddEntry(this, edit, "cdDel", "&Delete Row/s", [this] { Front()->DeleteSelected(); });
   for (int list = 1; list <= kSnapshotLists; ++list)
-    entry(edit, qPrintable(QString("csMove(%1)").arg(list)),
-          qPrintable(QString("Move to LIST &%1").arg(list)), [this, list] { MoveTo(list); });
+    AddEntry(this, edit, qPrintable(QString("csMove(%1)").arg(list)),
+             qPrintable(QString("Move to LIST &%1").arg(list)), [this, list] { MoveTo(list); });
   QMenu* display = bar->addMenu("&Display");
   display->setObjectName("csDisp");
-  entry(display, "csSize", "&Size", [this] {
+  AddEntry(this, display, "csSize", "&Size", [this] {
     if (!services_.changeSize) return;
     const int size = services_.changeSize(this);
     ss1_->SetZoom(size);
     ss2_->SetZoom(size);
   });
   QMenu* fetch = bar->addMenu("&Get Prices");
-  entry(fetch, "csFetchSnap", "&Get Snapshot Prices (Tarvo On-line)", [this] { Fetch(); });
+  AddEntry(this, fetch, "csFetchSnap", "&Get Snapshot Prices (Tarvo On-line)", [this] { Fetch(); });
 }
 
 void ChtSnap::ChooseList(int list) {

@@ -3,7 +3,6 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenuBar>
-#include <QScreen>
 #include <QVBoxLayout>
 #include <algorithm>
 
@@ -112,9 +111,7 @@ bool Fundmnt::Fill() {
   AddMenu();
   panel_->Hold({text1_, layout()->menuBar()});
   ss1_->GoTo(0, 0);
-  const QFontMetrics metrics = fontMetrics();
-  resize(QSize(metrics.averageCharWidth() * 140, metrics.height() * 34)
-             .boundedTo(screen()->availableSize() * 0.9));
+  SizeInLetters(this, 140, 34);
   return true;
 }
 
@@ -123,27 +120,22 @@ void Fundmnt::AddMenu() {
   layout()->setMenuBar(bar);
   QMenu* menu = bar->addMenu("&Details");
   menu->setObjectName("mnFrm");
-  const auto entry = [&](const char* name, const char* caption, auto work) {
-    QAction* action = menu->addAction(caption, this, work);
-    action->setObjectName(name);
-    return action;
-  };
-  entry("mnYCP", "Calculate &Yields %", [this] { Yields(); });
-  entry("mnInGrp", "Insert &Industry Classifications", [this] { InsertClasses(); });
-  entry("mnScanList", "Make Chart &List of these", [this] { MakeList(); });
+  AddEntry(this, menu, "mnYCP", "Calculate &Yields %", [this] { Yields(); });
+  AddEntry(this, menu, "mnInGrp", "Insert &Industry Classifications", [this] { InsertClasses(); });
+  AddEntry(this, menu, "mnScanList", "Make Chart &List of these", [this] { MakeList(); });
   menu->addSeparator();
-  entry("mnHdCol", "&Hide Column", [this] { HideColumn(); });
-  entry("mnSeeAll", "See &All", [this] { SeeAll(); });
-  entry("mnCngDisp", "Change &Display", [this] {
+  AddEntry(this, menu, "mnHdCol", "&Hide Column", [this] { HideColumn(); });
+  AddEntry(this, menu, "mnSeeAll", "See &All", [this] { SeeAll(); });
+  AddEntry(this, menu, "mnCngDisp", "Change &Display", [this] {
     if (services_.changeSize) ss1_->SetZoom(services_.changeSize(this));
   });
   menu->addSeparator();
-  entry("mnUpName", "&Copy to Name file", [this] { CopyToNames(); });
-  entry("mnPrint", "&Print", [this] {
+  AddEntry(this, menu, "mnUpName", "&Copy to Name file", [this] { CopyToNames(); });
+  AddEntry(this, menu, "mnPrint", "&Print", [this] {
     services_.print(ss1_->ToPrint(std::string(kCompanyTitle)), this);
   })->setEnabled(bool(services_.print));
-  entry("mnSaveAs", "&Save As (.csv)", [this] { ss1_->SaveAs(); });
-  entry("mnClse", "Cl&ose", [this] { reject(); });
+  AddEntry(this, menu, "mnSaveAs", "&Save As (.csv)", [this] { ss1_->SaveAs(); });
+  AddEntry(this, menu, "mnClse", "Cl&ose", [this] { reject(); });
 }
 
 void Fundmnt::ShowClass() {

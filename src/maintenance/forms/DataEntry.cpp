@@ -134,11 +134,6 @@ DataEntry::DataEntry(MaintenanceServices services, QWidget* parent)
   text1_->setFocus();
 }
 
-// A box that loses the focus as its form goes has nobody left to tell.
-DataEntry::~DataEntry() {
-  for (QLineEdit* box : findChildren<QLineEdit*>()) box->disconnect(this);
-}
-
 bool DataEntry::Fill() { return Open(1); }
 
 bool DataEntry::Open(std::int32_t number) {

@@ -16,7 +16,6 @@ namespace kora {
 class DataEntry : public WorkForm {
  public:
   DataEntry(MaintenanceServices services, QWidget* parent);
-  ~DataEntry() override;
 
   // Shows the first security. False, and told, where there is none.
   bool Fill();

@@ -2,7 +2,6 @@
 
 #include <QHeaderView>
 #include <QMenuBar>
-#include <QScreen>
 #include <QScrollBar>
 #include <QVBoxLayout>
 
@@ -56,9 +55,7 @@ DataForm::DataForm(DataFormServices services, DataFormFile file, QWidget* parent
   AddMenu();
   panel_->Hold({ss1_, bar_});
   ShowCount();
-  const QFontMetrics metrics = fontMetrics();
-  resize(QSize(metrics.averageCharWidth() * 135, metrics.height() * 36)
-             .boundedTo(screen()->availableSize() * 0.9));
+  SizeInLetters(this, 135, 36);
 }
 
 // A cell that is open asks the rows once more as it goes.
@@ -67,26 +64,21 @@ DataForm::~DataForm() { delete ss1_; }
 void DataForm::AddMenu() {
   bar_ = new QMenuBar(this);
   layout()->setMenuBar(bar_);
-  const auto entry = [this](auto* over, const char* name, const char* caption, auto work) {
-    QAction* action = over->addAction(caption, this, work);
-    action->setObjectName(name);
-    return action;
-  };
   QMenu* file = bar_->addMenu("&File");
-  entry(file, "nmSave", "&Save ", [this] { Save(); })->setShortcut(QKeySequence::Save);
-  entry(file, "nmPage", "Pa&ge Setup", [this] {
+  AddEntry(this, file, "nmSave", "&Save ", [this] { Save(); })->setShortcut(QKeySequence::Save);
+  AddEntry(this, file, "nmPage", "Pa&ge Setup", [this] {
     services_.pageSetup(this);
   })->setEnabled(bool(services_.pageSetup));
-  entry(file, "nmPrint", "&Print", [this] { Print(); })->setEnabled(bool(services_.print));
+  AddEntry(this, file, "nmPrint", "&Print", [this] { Print(); })->setEnabled(bool(services_.print));
   file->addSeparator();
-  entry(file, "nmClose", "&Close", [this] { reject(); });
+  AddEntry(this, file, "nmClose", "&Close", [this] { reject(); });
 
   QMenu* edit = bar_->addMenu("&Edit");
-  entry(edit, "nmDelete", "&Delete Rows", [this] { ss1_->DeleteSelected(); });
-  entry(edit, "nmSort", "S&ort List", [this] { Sort(); });
-  entry(edit, "nmAdjVol", "&Adjust Data", [this] { AdjustData(); });
+  AddEntry(this, edit, "nmDelete", "&Delete Rows", [this] { ss1_->DeleteSelected(); });
+  AddEntry(this, edit, "nmSort", "S&ort List", [this] { Sort(); });
+  AddEntry(this, edit, "nmAdjVol", "&Adjust Data", [this] { AdjustData(); });
 
-  entry(bar_, "dmDisp", "&Display", [this] {
+  AddEntry(this, bar_, "dmDisp", "&Display", [this] {
     ss1_->SetZoom(services_.changeSize(this));
   })->setEnabled(bool(services_.changeSize));
 }

@@ -55,11 +55,6 @@ TextFull::TextFull(MaintenanceServices services, QWidget* parent)
   });
 }
 
-// A box that loses the focus as its form goes has nobody left to tell.
-TextFull::~TextFull() {
-  for (QLineEdit* box : findChildren<QLineEdit*>()) box->disconnect(this);
-}
-
 bool TextFull::Fill() {
   if (!TellErrors(services_.dialogs, "Create Text File",
                   [this] { names_ = ReadNames(services_.files, dataPath()); }))

@@ -11,7 +11,6 @@ namespace kora {
 class TextFull : public WorkForm {
  public:
   TextFull(MaintenanceServices services, QWidget* parent);
-  ~TextFull() override;
 
   // Shows the first security. False, and told, where the name file can't be read or has none.
   bool Fill();

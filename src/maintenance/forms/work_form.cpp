@@ -89,6 +89,8 @@ void WorkForm::Run(const std::function<void(Progress&)>& work) {
   }
 }
 
+WorkForm::~WorkForm() { ForgetBoxes(this); }
+
 void WorkForm::reject() {
   if (panel_ && panel_->StopFirst()) return;
   QDialog::reject();

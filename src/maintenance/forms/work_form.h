@@ -35,6 +35,7 @@ struct MaintenanceServices {
 // and what is told behind them.
 class WorkForm : public QDialog {
  public:
+  ~WorkForm() override;
   // Close. While work goes on it is stopped instead, and the form stays.
   void reject() override;
   void done(int result) override;

@@ -2,7 +2,6 @@
 
 #include <QHeaderView>
 #include <QMenuBar>
-#include <QScreen>
 #include <QScrollBar>
 #include <QShortcut>
 #include <QVBoxLayout>
@@ -10,6 +9,7 @@
 #include "base/numbers.h"
 #include "base/runtime_error.h"
 #include "names/forms/ExMaster.h"
+#include "platform/qt/form_parts.h"
 #include "platform/qt/to_qt.h"
 
 namespace kora {
@@ -102,9 +102,7 @@ NameForm::NameForm(NameFormServices services, QWidget* parent)
   rows->addWidget(ss1_);
   AddMenu();
   ShowCount();
-  const QFontMetrics metrics = fontMetrics();
-  resize(QSize(metrics.averageCharWidth() * 160, metrics.height() * 36)
-             .boundedTo(screen()->availableSize() * 0.9));
+  SizeInLetters(this, 160, 36);
 }
 
 // A cell that is open asks the rows once more as it goes.
@@ -118,50 +116,46 @@ void NameForm::AddMenu() {
     made->setObjectName(name);
     return made;
   };
-  const auto entry = [this](QMenu* over, const char* name, const char* caption, auto work) {
-    QAction* action = over->addAction(caption, this, work);
-    action->setObjectName(name);
-    return action;
-  };
   QMenu* file = menu(bar, "nmFile", "&File");
-  entry(file, "nmSave", "&Save ", [this] { Save(); })->setShortcut(QKeySequence::Save);
-  entry(file, "nfPage", "Page Set&up", [this] {
+  AddEntry(this, file, "nmSave", "&Save ", [this] { Save(); })->setShortcut(QKeySequence::Save);
+  AddEntry(this, file, "nfPage", "Page Set&up", [this] {
     services_.pageSetup(this);
   })->setEnabled(bool(services_.pageSetup));
-  entry(file, "nmPrint", "&Print", [this] { Print(); })->setEnabled(bool(services_.print));
-  entry(file, "nmSaveAs", "Save &As (.csv)", [this] { ss1_->SaveAs(); });
+  AddEntry(this, file, "nmPrint", "&Print", [this] { Print(); })->setEnabled(bool(services_.print));
+  AddEntry(this, file, "nmSaveAs", "Save &As (.csv)", [this] { ss1_->SaveAs(); });
   file->addSeparator();
-  entry(file, "nmQuit", "&Close", [this] { reject(); });
+  AddEntry(this, file, "nmQuit", "&Close", [this] { reject(); });
 
   QMenu* edit = menu(bar, "nmEdit", "&Edit");
-  entry(edit, "nmAdd", "&Add Row", [this] {
+  AddEntry(this, edit, "nmAdd", "&Add Row", [this] {
     Update([this] { editor_.Insert(editor_.rows().size()); });
     ss1_->GoTo(source_->RowCount() - 1, kCodeColumn);
     ss1_->setFocus();
   });
-  entry(edit, "nmDelete", "&Delete Row/s", [this] { ss1_->DeleteSelected(); });
+  AddEntry(this, edit, "nmDelete", "&Delete Row/s", [this] { ss1_->DeleteSelected(); });
   QMenu* sort = menu(edit, "nmSort", "&Sort");
-  entry(sort, "mnSrtCde", "Sort by Code", [this] { Sort(NameSort::kCode); });
-  entry(sort, "mnSrtCat", "Sort By Category", [this] { Sort(NameSort::kCategory); });
-  entry(sort, "mnSrtClass", "Sort by Industry Classification",
-        [this] { Sort(NameSort::kIndClass); });
+  AddEntry(this, sort, "mnSrtCde", "Sort by Code", [this] { Sort(NameSort::kCode); });
+  AddEntry(this, sort, "mnSrtCat", "Sort By Category", [this] { Sort(NameSort::kCategory); });
+  AddEntry(this, sort, "mnSrtClass", "Sort by Industry Classification",
+           [this] { Sort(NameSort::kIndClass); });
   edit->addSeparator();
-  entry(edit, "nmMList", "&Update Names from KORA Master list", [this] { UpdateFromMasterList(); });
-  entry(edit, "mnRmvWar", "Remove &Warrants from List", [this] {
+  AddEntry(this, edit, "nmMList", "&Update Names from KORA Master list",
+           [this] { UpdateFromMasterList(); });
+  AddEntry(this, edit, "mnRmvWar", "Remove &Warrants from List", [this] {
     Update([this] {
       if (editor_.DeleteWarrants() && services_.saved) services_.saved();
     });
   });
-  entry(edit, "nmDupE", "Check for Du&plicate Entries",
-        [this] { Update([this] { editor_.Dupnames(); }); });
-  entry(edit, "nmIndUp", "Update Indust.Classifications from underlying stock",
-        [this] { Update([this] { editor_.FillClasses(); }); });
-  entry(edit, "nmCngCase", "&Change Case to Title Case",
-        [this] { Update([this] { editor_.TitleCase(); }); });
-  entry(edit, "nmClean", "C&lean Optional Details",
-        [this] { Update([this] { editor_.CleanOptional(); }); });
-  entry(edit, "nmRemExOpt", "&Remove Expired Options",
-        [this] { Update([this] { editor_.RemoveExpired(); }); });
+  AddEntry(this, edit, "nmDupE", "Check for Du&plicate Entries",
+           [this] { Update([this] { editor_.Dupnames(); }); });
+  AddEntry(this, edit, "nmIndUp", "Update Indust.Classifications from underlying stock",
+           [this] { Update([this] { editor_.FillClasses(); }); });
+  AddEntry(this, edit, "nmCngCase", "&Change Case to Title Case",
+           [this] { Update([this] { editor_.TitleCase(); }); });
+  AddEntry(this, edit, "nmClean", "C&lean Optional Details",
+           [this] { Update([this] { editor_.CleanOptional(); }); });
+  AddEntry(this, edit, "nmRemExOpt", "&Remove Expired Options",
+           [this] { Update([this] { editor_.RemoveExpired(); }); });
 }
 
 bool NameForm::Fill() {

@@ -1,11 +1,13 @@
 #include "platform/qt/form_parts.h"
 
+#include <QAction>
 #include <QDialog>
 #include <QGridLayout>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPointer>
 #include <QPushButton>
+#include <QScreen>
 #include <QSpinBox>
 #include <QStyle>
 #include <QToolButton>
@@ -92,6 +94,25 @@ void RunForm(QDialog* form) {
     ~Owner() { delete form.data(); }
   } owner{form};
   form->exec();
+}
+
+QAction* AddEntry(QWidget* form, QWidget* menu, const QString& name, const QString& caption,
+                  std::function<void()> chosen) {
+  auto* action = new QAction(caption, menu);
+  action->setObjectName(name);
+  QObject::connect(action, &QAction::triggered, form, std::move(chosen));
+  menu->addAction(action);
+  return action;
+}
+
+void SizeInLetters(QWidget* form, int columns, int lines) {
+  const QFontMetrics metrics = form->fontMetrics();
+  form->resize(QSize(metrics.averageCharWidth() * columns, metrics.height() * lines)
+                   .boundedTo(form->screen()->availableSize() * 0.9));
+}
+
+void ForgetBoxes(QWidget* form) {
+  for (QLineEdit* box : form->findChildren<QLineEdit*>()) box->disconnect(form);
 }
 
 void FocusField(QLineEdit* field) {

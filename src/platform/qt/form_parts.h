@@ -6,6 +6,7 @@
 
 #include "platform/qt/to_qt.h"
 
+class QAction;
 class QDialog;
 class QGridLayout;
 class QLabel;
@@ -53,6 +54,17 @@ QPushButton* AddOkCancel(QDialog* form, QGridLayout* grid, std::function<void()>
 // Runs a modal form until it is left and takes it down, also where an exception ends it. The form
 // may go with its parent before that; then nothing is left to take down.
 void RunForm(QDialog* form);
+
+// An entry of a menu or of a menu bar; `chosen` is not called once the form is gone.
+QAction* AddEntry(QWidget* form, QWidget* menu, const QString& name, const QString& caption,
+                  std::function<void()> chosen);
+
+// As wide as `columns` letters and as high as `lines` of them, where the screen has that room.
+void SizeInLetters(QWidget* form, int columns, int lines);
+
+// For the destructor of a form: a box that loses the focus as its form goes has nobody left to
+// tell that it was edited.
+void ForgetBoxes(QWidget* form);
 
 // Focus into the box with its text selected.
 void FocusField(QLineEdit* field);

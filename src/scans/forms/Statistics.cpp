@@ -8,7 +8,6 @@
 #include <QPointer>
 #include <QPushButton>
 #include <QRadioButton>
-#include <QScreen>
 
 #include "base/numbers.h"
 #include "base/runtime_error.h"
@@ -60,9 +59,7 @@ Statistics::Statistics(ScanFormServices services, const Clock& clock, QWidget* p
   command1_->setText("&Update Statistics");
   AddMenu();
   ShowTexts(KeptStats(services_.files, dataPath()));
-  const QFontMetrics metrics = fontMetrics();
-  resize(QSize(metrics.averageCharWidth() * 160, metrics.height() * 36)
-             .boundedTo(screen()->availableSize() * 0.9));
+  SizeInLetters(this, 160, 36);
 }
 
 QWidget* Statistics::Criteria() {
@@ -97,18 +94,16 @@ void Statistics::AddMenu() {
     m->setObjectName(name);
     return m;
   };
-  const auto entry = [this](QMenu* m, const char* name, const char* caption, auto work) {
-    QAction* action = m->addAction(caption, this, work);
-    action->setObjectName(name);
-    return action;
-  };
   QMenu* file = menu("nmFile", "&File");
-  entry(file, "nfPage", "Pa&ge Setup", [this] {
+  AddEntry(this, file, "nfPage", "Pa&ge Setup", [this] {
     services_.pageSetup();
   })->setEnabled(bool(services_.pageSetup));
-  entry(file, "nmPrint", "&Print", [this] { PrintHits(); })->setEnabled(bool(services_.print));
-  entry(file, "nmQuit", "&Close", [this] { reject(); });
-  entry(menu("mnDisp", "&Display"), "mnUpStats", "&Update Statistics", [this] { Proceed(); });
+  AddEntry(this, file, "nmPrint", "&Print", [this] {
+    PrintHits();
+  })->setEnabled(bool(services_.print));
+  AddEntry(this, file, "nmQuit", "&Close", [this] { reject(); });
+  AddEntry(this, menu("mnDisp", "&Display"), "mnUpStats", "&Update Statistics",
+           [this] { Proceed(); });
   panel_->Hold({bar});
 }
 

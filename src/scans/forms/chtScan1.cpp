@@ -150,9 +150,6 @@ Scan1Choices chtScan1::Choices() const {
   return c;
 }
 
-// A box that loses the focus as its form goes has nobody left to tell.
-chtScan1::~chtScan1() { text5_->disconnect(this); }
-
 void chtScan1::LeaveText5() {
   if (!text5_->isModified()) return;
   text5_->setModified(false);

@@ -14,7 +14,6 @@ namespace kora {
 class chtScan1 : public ScanForm {
  public:
   chtScan1(ScanFormServices services, QWidget* parent);
-  ~chtScan1() override;
 
  private:
   // The hits; a click on the heading of the percentages orders them by SortByPercentage.

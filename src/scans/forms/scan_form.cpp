@@ -6,7 +6,6 @@
 #include <QLineEdit>
 #include <QPointer>
 #include <QPushButton>
-#include <QScreen>
 #include <new>
 
 #include "base/runtime_error.h"
@@ -27,7 +26,7 @@ ScanForm::ScanForm(ScanFormServices services, QWidget* parent)
   setWindowFlag(Qt::WindowMinMaxButtonsHint);
 }
 
-ScanForm::~ScanForm() = default;
+ScanForm::~ScanForm() { ForgetBoxes(this); }
 
 QLineEdit* ScanForm::NewText(const QString& name, const QString& about, const std::string& text,
                              int columns) {
@@ -110,9 +109,7 @@ void ScanForm::LayOut(QWidget* criteria, const char* gridName, std::vector<GridC
   box->addWidget(panel_);
   box->addLayout(buttons);
   panel_->Hold({criteria, command1_, command3_, copy, saveAs});
-  const QFontMetrics metrics = fontMetrics();
-  resize(QSize(metrics.averageCharWidth() * 104, metrics.height() * 36)
-             .boundedTo(screen()->availableSize() * 0.9));
+  SizeInLetters(this, 104, 36);
 }
 
 void ScanForm::RunScan(const QString& title, const std::function<void(Progress&)>& scan) {

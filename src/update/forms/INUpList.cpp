@@ -8,7 +8,6 @@
 #include <QMenuBar>
 #include <QPushButton>
 #include <QRadioButton>
-#include <QScreen>
 #include <algorithm>
 #include <set>
 
@@ -16,6 +15,7 @@
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "lists/forms/RecSav.h"
+#include "platform/qt/form_parts.h"
 
 namespace kora {
 namespace {
@@ -92,9 +92,7 @@ INUpList::INUpList(UpdateFormServices services, QWidget* parent)
   ss1_->Refresh();
   LoadMaster();
   ShowChoice();
-  const QFontMetrics metrics = fontMetrics();
-  resize(QSize(metrics.averageCharWidth() * 130, metrics.height() * 34)
-             .boundedTo(screen()->availableSize() * 0.9));
+  SizeInLetters(this, 130, 34);
 }
 
 // A cell that is open asks the rows once more as it goes.
@@ -103,24 +101,21 @@ INUpList::~INUpList() { delete ss1_; }
 void INUpList::AddMenu() {
   auto* bar = new QMenuBar(this);
   layout()->setMenuBar(bar);
-  const auto entry = [this](QMenu* menu, const char* name, const char* caption, auto work) {
-    QAction* action = menu->addAction(caption, this, work);
-    action->setObjectName(name);
-    return action;
-  };
   QMenu* file = bar->addMenu("&File");
-  entry(file, "ulSave", "&Save List", [this] { Save(this); });
-  entry(file, "UlPrint", "&Print List", [this] { Print(); })->setEnabled(bool(services_.print));
-  entry(file, "ulClose", "&Close", [this] { reject(); });
+  AddEntry(this, file, "ulSave", "&Save List", [this] { Save(this); });
+  AddEntry(this, file, "UlPrint", "&Print List", [this] {
+    Print();
+  })->setEnabled(bool(services_.print));
+  AddEntry(this, file, "ulClose", "&Close", [this] { reject(); });
   QMenu* edit = bar->addMenu("&Edit");
-  ulAdd_ = entry(edit, "ulAdd", "&Add Row/s", [this] {
+  ulAdd_ = AddEntry(this, edit, "ulAdd", "&Add Row/s", [this] {
     if (!ss1_->EndEdit()) return;
     AddRow({});
     ss1_->Refresh();
     ss1_->GoTo(rows_.RowCount() - 1, 0);
     ss1_->setFocus();
   });
-  ulDel_ = entry(edit, "ulDel", "&Delete Row/s", [this] { ss1_->DeleteSelected(); });
+  ulDel_ = AddEntry(this, edit, "ulDel", "&Delete Row/s", [this] { ss1_->DeleteSelected(); });
 }
 
 void INUpList::LoadMaster() {
