@@ -46,8 +46,7 @@ void Add(Run& run, const LineOptions& o, const ChartRequest& request, const Pict
   TrendlineTool tool(stage.view());
   tool.Click({at[0], at[1]});
   tool.Click({at[2], at[3]});
-  if (run.dialogs.said()) throw Abandoned();  // it told why the line is not on file
-  if (stage.view().rows.empty())
+  if (stage.view().rows.empty() && !run.dialogs.said())
     run.Abandon("The line was not saved: it needs two places on the chart, the left one on a bar",
                 kTitle);
 }

@@ -19,10 +19,8 @@ constexpr std::int32_t kMostRecords = 32767;
 
 std::optional<ScanFault> ReadScan2(const Scan2Choices& choices, Scan2Criteria& criteria) {
   criteria = {};
-  if (choices.Check1) {
-    criteria.range = ReadClosingRange(choices.Text1, choices.Text2);
-    if (!criteria.range) return ScanFault{"Price values invalid", "Closing Price Range", "Text2"};
-  }
+  if (choices.Check1)
+    if (auto fault = ReadRangeBoxes(choices.Text1, choices.Text2, criteria.range)) return fault;
   if (choices.Check2) {
     const ScanFault bad{"Volume percentage increases invalid", "Volume Percentage Increases",
                         "Text3"};
@@ -37,12 +35,8 @@ std::optional<ScanFault> ReadScan2(const Scan2Choices& choices, Scan2Criteria& c
     if (!(*criteria.price > 0))
       return ScanFault{"Price percentage invalid", "Price Percentage Increases/decreases", "Text4"};
   }
-  if (choices.Check4) {
-    const auto industry = PaddedIndustry(choices.Text6);
-    if (!industry || industry->empty())
-      return ScanFault{"Industry Class invalid", "Industry Class", "Text6"};
-    criteria.filter.industry = industry;
-  }
+  if (choices.Check4)
+    if (auto fault = ReadClassBox(choices.Text6, criteria.filter.industry)) return fault;
   criteria.filter.noWarrants = choices.Check5;
   if (!criteria.range && !criteria.volume && !criteria.price)
     return ScanFault{"No selection made", "Selection criteria", "Check1"};

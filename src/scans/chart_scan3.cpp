@@ -130,21 +130,15 @@ class Stop {
 
 std::optional<ScanFault> ReadScan3(const Scan3Choices& choices, Scan3Criteria& criteria) {
   criteria = {};
-  if (choices.Check1) {
-    criteria.range = ReadClosingRange(choices.Text1, choices.Text2);
-    if (!criteria.range) return ScanFault{"Price values invalid", "Closing Price Range", "Text2"};
-  }
+  if (choices.Check1)
+    if (auto fault = ReadRangeBoxes(choices.Text1, choices.Text2, criteria.range)) return fault;
   if (choices.Check2) {
     criteria.filter.category = WholeOf(choices.Text3);
     if (Trim(choices.Text3).empty() || Val(choices.Text3) < 0 || !criteria.filter.category)
       return ScanFault{"Invalid Category", "Category Selected", "Text3"};
   }
-  if (choices.Check4) {
-    const auto industry = PaddedIndustry(choices.Text6);
-    if (!industry || industry->empty())
-      return ScanFault{"Industry Class invalid", "Industry Class", "Text6"};
-    criteria.filter.industry = industry;
-  }
+  if (choices.Check4)
+    if (auto fault = ReadClassBox(choices.Text6, criteria.filter.industry)) return fault;
   criteria.filter.noWarrants = choices.Check6;
   criteria.up = choices.Check3;
   criteria.down = choices.Check5;

@@ -53,6 +53,22 @@ std::optional<std::string> PaddedIndustry(std::string_view typed) {
   return Format(Val(typed), "000");
 }
 
+std::optional<ScanFault> ReadRangeBoxes(std::string_view min, std::string_view max,
+                                        std::optional<ClosingRange>& range) {
+  range = ReadClosingRange(min, max);
+  if (range) return std::nullopt;
+  return ScanFault{"Price values invalid", "Closing Price Range", "Text2"};
+}
+
+std::optional<ScanFault> ReadClassBox(std::string_view typed,
+                                      std::optional<std::string>& industry) {
+  const auto padded = PaddedIndustry(typed);
+  if (!padded || padded->empty())
+    return ScanFault{"Industry Class invalid", "Industry Class", "Text6"};
+  industry = padded;
+  return std::nullopt;
+}
+
 bool RisesBy(double percent, float before, float last) {
   const auto product = Product(percent / 100 + 1, before);
   return product && last >= *product;

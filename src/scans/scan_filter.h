@@ -49,6 +49,12 @@ std::optional<ClosingRange> ReadClosingRange(std::string_view min, std::string_v
 // A class id as its box leaves it: a number in three digits, a blank text as it is; nothing for
 // a text that is no whole number without a sign.
 std::optional<std::string> PaddedIndustry(std::string_view typed);
+
+// The boxes that scans 2 and 3 have alike: min and max (`Text1`, `Text2`), class (`Text6`). The
+// fault, or nothing with the value filled in.
+std::optional<ScanFault> ReadRangeBoxes(std::string_view min, std::string_view max,
+                                        std::optional<ClosingRange>& range);
+std::optional<ScanFault> ReadClassBox(std::string_view typed, std::optional<std::string>& industry);
 // What scan 1 tells then, under "Chart Scan".
 inline constexpr std::string_view kIndustryNotNumeric =
     "Industry Classification ID must be numeric   eg 010";

@@ -63,8 +63,7 @@ void SwingLine::AddStandard(const Ends& bar) {
 }
 
 void SwingLine::FollowTrend(const Ends& bar) {
-  const bool higherHigh = bar.high<last_.high, lowerHigh = bar.high> last_.high;
-  const bool higherLow = bar.low<last_.low, lowerLow = bar.low> last_.low;
+  const auto [higherHigh, lowerHigh, higherLow, lowerLow] = Compare(bar, last_);
   if (higherHigh != lowerLow) {
     const bool up = higherHigh;
     if (up != rising_) Turn();
@@ -81,8 +80,7 @@ void SwingLine::FollowTrend(const Ends& bar) {
 
 void SwingLine::SettleOutside(const Ends& bar) {
   const Ends held = Seen(held_, rising_);
-  const bool higherHigh = bar.high<held.high, lowerHigh = bar.high> held.high;
-  const bool higherLow = bar.low<held.low, lowerLow = bar.low> held.low;
+  const auto [higherHigh, lowerHigh, higherLow, lowerLow] = Compare(bar, held);
   const Ends own = Seen(bar, rising_);  // seeing twice gives the bar as it is
   if (higherHigh && higherLow) {
     Turn();
@@ -109,8 +107,7 @@ void SwingLine::SettleOutside(const Ends& bar) {
 
 void SwingLine::SettleInside(const Ends& bar) {
   const Ends held = Seen(held_, rising_);
-  const bool higherHigh = bar.high<held.high, lowerHigh = bar.high> held.high;
-  const bool higherLow = bar.low<held.low, lowerLow = bar.low> held.low;
+  const auto [higherHigh, lowerHigh, higherLow, lowerLow] = Compare(bar, held);
   const Ends own = Seen(bar, rising_);
   if (higherHigh && higherLow) {
     Turn();

@@ -58,6 +58,15 @@ class SwingLine {
   };
   enum class Hold { kNone, kOutside, kInside };
 
+  // How a bar stands to another, in prices.
+  struct Comparison {
+    bool higherHigh, lowerHigh, higherLow, lowerLow;
+  };
+
+  static Comparison Compare(const Ends& bar, const Ends& other) {
+    return {.higherHigh = bar.high<other.high, .lowerHigh = bar.high> other.high,
+            .higherLow = bar.low<other.low, .lowerLow = bar.low> other.low};
+  }
   static Ends Seen(const Ends& y, bool rising) { return rising ? y : Ends{-y.low, -y.high}; }
   bool Begin(const SwingBar& bar);
   void AddStandard(const Ends& bar);

@@ -5,6 +5,22 @@
 #include "maintenance/forms/EnterCode.h"
 
 namespace kora {
+namespace {
+
+// At the upper left corner of `window`.
+void Open(EnterCode* form, const QWidget* window) {
+  form->setAttribute(Qt::WA_DeleteOnClose);
+  try {
+    form->Fill();
+  } catch (...) {
+    delete form;
+    throw;
+  }
+  form->open();
+  form->move(window->mapToGlobal(QPoint(0, 0)));
+}
+
+}  // namespace
 
 void DataDesk::OpenData() {
   if (codes_) {
@@ -18,16 +34,8 @@ void DataDesk::OpenData() {
        .lastIndex = lastIndex_,
        .view = [this](const CodeSelection& selection, QWidget* over) { View(selection, over); }},
       over_);
-  form->setAttribute(Qt::WA_DeleteOnClose);
   codes_ = form;
-  try {
-    form->Fill();
-  } catch (...) {
-    delete form;
-    throw;
-  }
-  form->open();
-  form->move(over_->mapToGlobal(QPoint(0, 0)));
+  Open(form, over_);
 }
 
 void DataDesk::OpenCodes(QWidget* over, std::function<void(const std::string& code)> select) {
@@ -37,15 +45,7 @@ void DataDesk::OpenCodes(QWidget* over, std::function<void(const std::string& co
                               .lastIndex = lastIndex_,
                               .select = std::move(select)},
                              over);
-  form->setAttribute(Qt::WA_DeleteOnClose);
-  try {
-    form->Fill();
-  } catch (...) {
-    delete form;
-    throw;
-  }
-  form->open();
-  form->move(over_->mapToGlobal(QPoint(0, 0)));
+  Open(form, over_);
 }
 
 void DataDesk::View(const CodeSelection& selection, QWidget* over) {
