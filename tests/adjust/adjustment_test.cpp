@@ -1,8 +1,6 @@
 #include "adjust/adjustment.h"
 
 #include <gtest/gtest.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 #include <cmath>
 #include <csignal>
@@ -13,6 +11,7 @@
 #include "base/numbers.h"
 #include "tests/support/error_of.h"
 #include "tests/support/failing_io.h"
+#include "tests/support/killed_runs.h"
 #include "tests/support/records.h"
 #include "tests/support/temp_home.h"
 
@@ -204,20 +203,13 @@ class AdjustedFiles : public ::testing::Test {
   // In a process of its own, killed in place of change `at`. False when it came to its end.
   template <typename Action>
   bool KilledAt(int at, Action action) {
-    const pid_t child = ::fork();
-    if (child == 0) {
+    const auto code = InChild([&] {
       io.Reset(at);
       io.kills = io.torn = true;
-      ::_exit(ErrorOf(action));
-    }
-    int status = 0;
-    EXPECT_EQ(::waitpid(child, &status, 0), child);
-    if (WIFSIGNALED(status)) {
-      EXPECT_EQ(WTERMSIG(status), SIGKILL);
-      return true;
-    }
-    EXPECT_EQ(WEXITSTATUS(status), 0);
-    return false;
+      return ErrorOf(action);
+    });
+    EXPECT_EQ(code.value_or(0), 0);
+    return !code;
   }
 
   FailingIo io;

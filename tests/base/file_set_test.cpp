@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 #include <signal.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 #include <filesystem>
 #include <map>
@@ -12,6 +10,7 @@
 #include "tests/support/error_of.h"
 #include "tests/support/failing_io.h"
 #include "tests/support/forwarding_io.h"
+#include "tests/support/killed_runs.h"
 #include "tests/support/temp_home.h"
 
 using namespace kora;
@@ -128,23 +127,18 @@ TEST(FileSetTest, AFailureAtAnyCallOfAnyKindLeavesAllAsItWas) {
   }
 }
 
-// In a process of its own, killed in place of change `at`. False when it came to its end.
-bool KilledAt(int at, FailingIo& io, TempHome& home) {
-  const pid_t child = ::fork();
-  if (child == 0) {
-    io.Reset(at);
-    io.kills = true;
-    ::_exit(ErrorOf([&] {
+// The set committed in a process of its own. False when it was killed.
+bool CommittedBehind(const std::function<void()>& prepare, TempHome& home) {
+  const auto code = InChild([&] {
+    prepare();
+    return ErrorOf([&] {
       FileSet set(home.files());
       FillSet(set);
       set.Commit();
-    }));
-  }
-  int status = 0;
-  EXPECT_EQ(::waitpid(child, &status, 0), child);
-  if (WIFSIGNALED(status)) return true;
-  EXPECT_EQ(WEXITSTATUS(status), 0);
-  return false;
+    });
+  });
+  EXPECT_EQ(code.value_or(0), 0);
+  return code.has_value();
 }
 
 TEST(FileSetTest, KilledAnywhereAllAreOldOrAllAreNewForTheNextWriter) {
@@ -154,7 +148,11 @@ TEST(FileSetTest, KilledAnywhereAllAreOldOrAllAreNewForTheNextWriter) {
   for (int at = 1;; ++at) {
     ASSERT_LT(at, 100);
     PutBefore(home);
-    if (!KilledAt(at, io, home)) break;
+    const auto killed = [&] {
+      io.Reset(at);
+      io.kills = true;
+    };
+    if (CommittedBehind(killed, home)) break;
     const bool waits = home.Exists("Kora.set~");
     { const auto held = home.files().lock().Hold(); }
     Contents now = ContentsOf(home);
@@ -185,18 +183,7 @@ TEST(FileSetTest, KilledWhileItSweepsTheNextWriterSweeps) {
   for (int at = 1;; ++at) {
     ASSERT_LT(at, 100);
     PutBefore(home);
-    const pid_t child = ::fork();
-    if (child == 0) {
-      io.dieAt = at;
-      ::_exit(ErrorOf([&] {
-        FileSet set(home.files());
-        FillSet(set);
-        set.Commit();
-      }));
-    }
-    int status = 0;
-    EXPECT_EQ(::waitpid(child, &status, 0), child);
-    if (!WIFSIGNALED(status)) break;
+    if (CommittedBehind([&] { io.dieAt = at; }, home)) break;
     ++kills;
     { const auto held = home.files().lock().Hold(); }
     EXPECT_EQ(ContentsOf(home), kAfter) << at;
@@ -412,8 +399,7 @@ TEST(FileSetTest, KillsAmongCopiesLeaveWholeFiles) {
       home.Put(std::string("drive_c/a/") + name, std::string("new ") + name);
       home.Put(std::string("drive_c/b/") + name, std::string("old ") + name);
     }
-    const pid_t child = ::fork();
-    if (child == 0) {
+    const auto code = InChild([&] {
       io.Reset(at);
       io.kills = true;
       const auto held = home.files().lock().Hold();
@@ -421,17 +407,15 @@ TEST(FileSetTest, KillsAmongCopiesLeaveWholeFiles) {
       for (const char* name : {"one", "two"})
         set.AddCopy(std::string("c:\\a\\") + name, std::string("c:\\b\\") + name);
       set.Commit();
-      ::_exit(0);
-    }
-    int status = 0;
-    ASSERT_EQ(::waitpid(child, &status, 0), child);
+      return 0;
+    });
     // The next who takes the lock finishes what was begun: both are old, or both new.
     Files next(home.path());
     { const auto held = next.lock().Hold(); }
     const std::string one = home.Get("drive_c/b/one"), two = home.Get("drive_c/b/two");
     EXPECT_TRUE((one == "old one" && two == "old two") || (one == "new one" && two == "new two"))
         << one << ", " << two;
-    if (!WIFSIGNALED(status)) {
+    if (code) {
       EXPECT_EQ(one, "new one");
       EXPECT_GT(at, 6);
       break;

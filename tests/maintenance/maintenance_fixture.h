@@ -1,8 +1,6 @@
 #pragma once
 
 #include <gtest/gtest.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 #include <filesystem>
 #include <functional>
@@ -15,6 +13,7 @@
 #include "store/name_file.h"
 #include "store/price_rec.h"
 #include "tests/support/failing_io.h"
+#include "tests/support/killed_runs.h"
 #include "tests/support/records.h"
 #include "tests/support/scripted_dialogs.h"
 #include "tests/support/temp_home.h"
@@ -108,16 +107,13 @@ class MaintenanceTest : public ::testing::Test {
     for (int at = 1;; ++at) {
       SCOPED_TRACE("change " + std::to_string(at));
       layAnew();
-      const pid_t child = ::fork();
-      if (child == 0) {
+      const auto code = InChild([&] {
         io.Reset(at);
         io.kills = true;
-        ::_exit(work() ? 0 : 1);
-      }
-      int status = 0;
-      EXPECT_EQ(::waitpid(child, &status, 0), child);
-      if (!WIFSIGNALED(status)) {
-        EXPECT_EQ(WEXITSTATUS(status), 0);
+        return work() ? 0 : 1;
+      });
+      if (code) {
+        EXPECT_EQ(*code, 0);
         return at - 1;
       }
       for (const auto& [name, bytes] : Everything()) {

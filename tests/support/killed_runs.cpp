@@ -70,6 +70,22 @@ std::vector<std::string> TemporariesOf(const std::string& folder) {
   return out;
 }
 
+std::optional<int> InChild(const std::function<int()>& work) {
+  std::fflush(nullptr);
+  const pid_t child = ::fork();
+  if (child == 0) {
+    const int code = work();
+    std::fflush(nullptr);
+    ::_exit(code);
+  }
+  int status = 0;
+  if (child < 0 || ::waitpid(child, &status, 0) != child) throw std::runtime_error("no process");
+  if (WIFEXITED(status)) return WEXITSTATUS(status);
+  if (WTERMSIG(status) != SIGKILL)
+    throw std::runtime_error("ended by signal " + std::to_string(WTERMSIG(status)));
+  return std::nullopt;
+}
+
 ChildRun RunInChild(const std::function<void(FailingIo&)>& prepare,
                     const std::function<int(Io&)>& work) {
   void* shared =
@@ -77,23 +93,16 @@ ChildRun RunInChild(const std::function<void(FailingIo&)>& prepare,
   const int err = ::memfd_create("err", 0);
   if (shared == MAP_FAILED || err < 0) throw std::runtime_error("no memory to share");
   auto* counts = static_cast<Counts*>(shared);
-  std::fflush(nullptr);
-  const pid_t child = ::fork();
-  if (child == 0) {
+  const std::optional<int> code = InChild([&] {
     ::dup2(err, STDERR_FILENO);
     ::dup2(::open("/dev/null", O_WRONLY), STDOUT_FILENO);
     FailingIo io;
     prepare(io);
-    const int code = work(io);
-    std::fflush(nullptr);
+    const int given = work(io);
     *counts = {io.calls, io.reads};
-    ::_exit(code);
-  }
-  int status = 0;
-  if (child < 0 || ::waitpid(child, &status, 0) != child) throw std::runtime_error("no process");
-  ChildRun run;
-  run.killed = WIFSIGNALED(status) && WTERMSIG(status) == SIGKILL;
-  run.code = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
+    return given;
+  });
+  ChildRun run{.killed = !code, .code = code.value_or(0)};
   run.calls = counts->calls;
   run.reads = counts->reads;
   run.err.resize(size_t(::lseek(err, 0, SEEK_END)));

@@ -2,6 +2,7 @@
 
 #include <functional>
 #include <map>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -17,6 +18,9 @@ Store StoreOf(const std::string& folder);
 void LayStore(const std::string& folder, const Store& store);
 // Names that end in "~" below a folder.
 std::vector<std::string> TemporariesOf(const std::string& folder);
+
+// Runs `work` in a process of its own. What it gave, or nothing where the process was killed.
+std::optional<int> InChild(const std::function<int()>& work);
 
 // How a piece of work went that ran in a process of its own.
 struct ChildRun {

@@ -1,11 +1,9 @@
 // Updates that are killed, or that the disk fails, at each of their writes.
 
-#include <sys/wait.h>
-#include <unistd.h>
-
 #include <set>
 
 #include "base/file_edits.h"
+#include "tests/support/killed_runs.h"
 #include "tests/update/update_fixture.h"
 
 using namespace kora;
@@ -127,20 +125,13 @@ class FaultTest : public UpdateFixture {
   // In a process of its own that is killed in place of change number `at`. False when it came
   // to its end before.
   bool RunKilledAt(int at) {
-    const pid_t child = ::fork();
-    if (child == 0) {
+    const auto code = InChild([&] {
       io.Reset(at);
       io.kills = true;
-      ::_exit(Update() == UpdateEnd::kUpdated ? 0 : 1);
-    }
-    int status = 0;
-    EXPECT_EQ(::waitpid(child, &status, 0), child);
-    if (WIFSIGNALED(status)) {
-      EXPECT_EQ(WTERMSIG(status), SIGKILL);
-      return true;
-    }
-    EXPECT_EQ(WEXITSTATUS(status), 0);
-    return false;
+      return Update() == UpdateEnd::kUpdated ? 0 : 1;
+    });
+    EXPECT_EQ(code.value_or(0), 0);
+    return !code;
   }
 
   // Whole records, each an old one or one of the undisturbed run; no file gone or shorter. A

@@ -1,8 +1,6 @@
 #include "update/import_history.h"
 
 #include <gtest/gtest.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 #include <filesystem>
 #include <map>
@@ -13,6 +11,7 @@
 #include "store/name_file.h"
 #include "store/price_rec.h"
 #include "tests/support/failing_io.h"
+#include "tests/support/killed_runs.h"
 #include "tests/support/records.h"
 #include "tests/support/scripted_dialogs.h"
 #include "tests/support/temp_home.h"
@@ -534,15 +533,13 @@ TEST_F(ImportTest, AnImportThatWasCutOffIsCompletedByTheSameImport) {
   int points = 0;
   for (int at = 1;; ++at) {
     lay();
-    const pid_t child = ::fork();
-    if (child == 0) {
+    const auto code = InChild([&] {
       io.Reset(at);
       io.kills = true;
-      ::_exit(Import(sources) ? 0 : 1);
-    }
-    int status = 0;
-    ASSERT_EQ(::waitpid(child, &status, 0), child);
-    if (!WIFSIGNALED(status)) break;
+      return Import(sources) ? 0 : 1;
+    });
+    EXPECT_EQ(code.value_or(0), 0);
+    if (code) break;
     ++points;
     io.Reset();
     for (const NameRec& name : Names())
