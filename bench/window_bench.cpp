@@ -68,95 +68,78 @@ void PageForward(benchmark::State& bench) {
       benchmark::Counter(double(bench.iterations()), benchmark::Counter::kIsRate);
 }
 
-// Rules and pixels of one move: both lines taken away, both drawn, the read-out.
-void CrossMove(benchmark::State& bench) {
+// A pointer that goes to and fro.
+template <typename Move>
+void GoAbout(benchmark::State& bench, Move move) {
+  double x = 50;
+  for (auto _ : bench) {
+    move(x);
+    x = x > 600 ? 50 : x + 1;
+  }
+}
+
+// Rules and pixels of one move with a tool that `start` turns on.
+void MoveInWindow(benchmark::State& bench, void (*start)(ChartWindow&)) {
   Market market;
   QtRasterSurface price(double(bench.range(0)), double(bench.range(1)));
   QtRasterSurface panel(double(bench.range(0)), 144);
   ChartWindow window = market.Window(price, panel);
   window.Load();
   window.NextChart();
-  window.ToggleGrid();
-  double x = 50;
-  for (auto _ : bench) {
-    window.MouseMove({x, 200});
-    x = x > 600 ? 50 : x + 1;
-  }
+  start(window);
+  GoAbout(bench, [&](double x) { window.MouseMove({x, 200}); });
 }
 
 // The same through the form: the event, the status bar, and the painting of what changed.
-void CrossMoveForm(benchmark::State& bench) {
+void MoveInForm(benchmark::State& bench, void (*start)(ChartWindow&)) {
   Market market;
-  auto* form = new Chts({.files = market.files,
-                         .dialogs = market.dialogs,
-                         .settings = market.settings,
-                         .ini = market.ini,
-                         .user = market.user,
-                         .colours = market.colours,
-                         .current = market.current,
-                         .state = market.state});
-  form->resize(int(bench.range(0)), int(bench.range(1)));
-  form->show();
+  Chts form({.files = market.files,
+             .dialogs = market.dialogs,
+             .settings = market.settings,
+             .ini = market.ini,
+             .user = market.user,
+             .colours = market.colours,
+             .current = market.current,
+             .state = market.state});
+  form.resize(int(bench.range(0)), int(bench.range(1)));
+  form.show();
   QCoreApplication::processEvents();
-  form->Start();
-  form->window().ToggleGrid();
-  auto* picture = form->findChild<QWidget*>("Picture1");
+  form.Start();
+  start(form.window());
+  auto* picture = form.findChild<QWidget*>("Picture1");
   QCoreApplication::processEvents();
-  double x = 50;
-  for (auto _ : bench) {
+  GoAbout(bench, [&](double x) {
     QMouseEvent move(QEvent::MouseMove, {x, 200}, picture->mapToGlobal(QPointF(x, 200)),
                      Qt::NoButton, Qt::NoButton, Qt::NoModifier);
     QCoreApplication::sendEvent(picture, &move);
     QCoreApplication::processEvents();
-    x = x > 600 ? 50 : x + 1;
-  }
-  delete form;
+  });
 }
 
-// The same with the band of a line from a first click.
-void BandMove(benchmark::State& bench) {
-  Market market;
-  QtRasterSurface price(double(bench.range(0)), double(bench.range(1)));
-  QtRasterSurface panel(double(bench.range(0)), 144);
-  ChartWindow window = market.Window(price, panel);
-  window.Load();
-  window.NextChart();
+// The cross hair: both lines taken away, both drawn, the read-out.
+void StartCross(ChartWindow& window) { window.ToggleGrid(); }
+// The band of a line from a first click.
+void StartBand(ChartWindow& window) {
   window.ToggleTrendline();
   window.MouseRelease({60, 300}, MouseButton::kLeft);
-  double x = 50;
-  for (auto _ : bench) {
-    window.MouseMove({x, 200});
-    x = x > 600 ? 50 : x + 1;
-  }
 }
+void CrossMove(benchmark::State& bench) { MoveInWindow(bench, StartCross); }
+void CrossMoveForm(benchmark::State& bench) { MoveInForm(bench, StartCross); }
+void BandMove(benchmark::State& bench) { MoveInWindow(bench, StartBand); }
+void BandMoveForm(benchmark::State& bench) { MoveInForm(bench, StartBand); }
 
-void BandMoveForm(benchmark::State& bench) {
-  Market market;
-  auto* form = new Chts({.files = market.files,
-                         .dialogs = market.dialogs,
-                         .settings = market.settings,
-                         .ini = market.ini,
-                         .user = market.user,
-                         .colours = market.colours,
-                         .current = market.current,
-                         .state = market.state});
-  form->resize(int(bench.range(0)), int(bench.range(1)));
-  form->show();
-  QCoreApplication::processEvents();
-  form->Start();
-  form->window().ToggleTrendline();
-  form->window().MouseRelease({60, 300}, MouseButton::kLeft);
-  auto* picture = form->findChild<QWidget*>("Picture1");
-  QCoreApplication::processEvents();
-  double x = 50;
-  for (auto _ : bench) {
-    QMouseEvent move(QEvent::MouseMove, {x, 200}, picture->mapToGlobal(QPointF(x, 200)),
-                     Qt::NoButton, Qt::NoButton, Qt::NoModifier);
-    QCoreApplication::sendEvent(picture, &move);
-    QCoreApplication::processEvents();
-    x = x > 600 ? 50 : x + 1;
+// Gives the security on show `count` saved lines.
+void SaveLines(Market& market, const ChartWindow& window, std::int64_t count) {
+  const std::string& misc = market.settings.paths.ChartMiscPath;
+  const std::string path = TrendlinePath(misc, window.Request.Name.Code.trimmed());
+  market.files.MakeFolder(misc);
+  RemoveTrendlines(market.files, path);
+  for (int i = 0; i < count; ++i) {
+    const Composition& chart = window.Chart;
+    const double x = chart.ChartLeft + (i % 100 + 1) * double(chart.BarSpacing);
+    const auto line = TrendlineOf(chart, window.Request, {x, 150.0 + i, x + 40, 160.0 + i});
+    if (line) SaveTrendline(market.files, path, *line);
   }
-  delete form;
 }
 
 // A composition with 200 saved lines on the chart, and without: the floor.
@@ -166,18 +149,8 @@ void ComposeLines(benchmark::State& bench) {
   ChartWindow window = market.Window(price, panel);
   window.Load();
   window.NextChart();
-  const Composition& chart = window.Chart;
-  const std::string path =
-      TrendlinePath(market.settings.paths.ChartMiscPath, window.Request.Name.Code.trimmed());
-  market.files.MakeFolder(market.settings.paths.ChartMiscPath);
-  RemoveTrendlines(market.files, path);
-  for (int i = 0; i < bench.range(0); ++i) {
-    const double x = chart.ChartLeft + (i % 100 + 1) * double(chart.BarSpacing);
-    const auto line = TrendlineOf(chart, window.Request, {x, 150.0 + i, x + 40, 160.0 + i});
-    if (line) SaveTrendline(market.files, path, *line);
-  }
+  SaveLines(market, window, bench.range(0));
   for (auto _ : bench) benchmark::DoNotOptimize(window.Recompose());
-  bench.counters["lines"] = double(ReadTrendlines(market.files, path).size());
 }
 
 // Reading 200 saved lines and finding their places on that chart, without drawing them.
@@ -187,21 +160,14 @@ void PlaceLines(benchmark::State& bench) {
   ChartWindow window = market.Window(price, panel);
   window.Load();
   window.NextChart();
-  const Composition& chart = window.Chart;
-  const std::string& misc = market.settings.paths.ChartMiscPath;
-  const std::string code(window.Request.Name.Code.trimmed());
-  market.files.MakeFolder(misc);
-  RemoveTrendlines(market.files, TrendlinePath(misc, code));
-  for (int i = 0; i < 200; ++i) {
-    const double x = chart.ChartLeft + (i % 100 + 1) * double(chart.BarSpacing);
-    const auto line = TrendlineOf(chart, window.Request, {x, 150.0 + i, x + 40, 160.0 + i});
-    if (line) SaveTrendline(market.files, TrendlinePath(misc, code), *line);
-  }
+  SaveLines(market, window, 200);
   int placed = 0;
   for (auto _ : bench) {
     placed = 0;
-    for (const TrendlineRec& rec : ReadSavedMarks(market.files, misc, code).lines)
-      placed += PlaceTrendline(chart, window.Request, rec).has_value();
+    const SavedMarks marks = ReadSavedMarks(market.files, market.settings.paths.ChartMiscPath,
+                                            window.Request.Name.Code.trimmed());
+    for (const TrendlineRec& rec : marks.lines)
+      placed += PlaceTrendline(window.Chart, window.Request, rec).has_value();
   }
   bench.counters["placed"] = placed;
 }
