@@ -25,8 +25,8 @@ namespace {
 constexpr std::int32_t kMostItems = 32;
 constexpr std::int32_t kRecordsPerBlock = 10000;
 constexpr size_t kBlocks = 4;
-// Of files that are read whole, whose size is not known before.
-constexpr size_t kWholeFilesPerBlock = 4;
+// Of files that are read whole: those in hand are to stay in the cache, however long they are.
+constexpr size_t kWholeFilesPerBlock = 1;
 constexpr std::int32_t kNamesPerRead = 512;
 constexpr std::uint64_t kMostRecords = 32767;
 
