@@ -18,10 +18,20 @@ void FileSet::Add(std::string_view path, std::string bytes) {
 }
 
 CopiedFile FileSet::AddCopy(std::string_view from, std::string_view path) {
+  const auto source = files_.Open(from, OpenMode::kRead);
+  return AddMade(path, [&](std::string host) { return set_.Copy(*source, std::move(host)); });
+}
+
+CopiedFile FileSet::AddNow(std::string_view path, std::span<const std::string_view> pieces) {
+  return AddMade(path, [&](std::string host) { return set_.WriteNow(std::move(host), pieces); });
+}
+
+template <typename Make>
+CopiedFile FileSet::AddMade(std::string_view path, Make make) {
   const std::string host = files_.Locate(path, true);
   const std::string folder = HostFolderOf(host);
   const std::int64_t before = files_.Modified(folder);
-  const CopiedFile copied = set_.Copy(files_.HostPath(from), host);
+  const CopiedFile copied = make(host);
   Note(host, true);
   folders_[folder] = files_.NoteTemporary(folder, before);
   return copied;
@@ -58,10 +68,15 @@ void FileSet::Commit() {
     folders_.clear();
     throw;
   }
+  // All is done: a folder has one time now, which is asked for once.
+  std::map<std::string, std::int64_t> after;
   for (const Change& change : changes) {
-    std::int64_t& before = folders_[HostFolderOf(change.host)];
-    files_.Note(change.host, change.added, before);
-    before = files_.Modified(HostFolderOf(change.host));
+    const std::string folder = HostFolderOf(change.host);
+    std::int64_t& before = folders_[folder];
+    const auto [now, asked] = after.try_emplace(folder, 0);
+    if (asked) now->second = files_.Modified(folder);
+    files_.Note(change.host, change.added, before, now->second);
+    before = now->second;
   }
   folders_.clear();
 }

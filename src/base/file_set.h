@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <map>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -26,6 +27,9 @@ class FileSet {
   // The bytes of another file, copied beside the path at once. A failure leaves what the set has so
   // far. Called under the home's lock.
   CopiedFile AddCopy(std::string_view from, std::string_view path);
+  // The same with bytes that the program has, in pieces that follow one another: what is added for
+  // thousands of files takes no memory.
+  CopiedFile AddNow(std::string_view path, std::span<const std::string_view> pieces);
   // Nothing where it is not there by then.
   void Remove(std::string_view path);
   // Replaces `to`. Error 53 in Commit where `from` is not there by then.
@@ -41,6 +45,8 @@ class FileSet {
     std::string host;
     bool added;
   };
+  template <typename Make>
+  CopiedFile AddMade(std::string_view path, Make make);
   void Note(const std::string& host, bool added);
 
   const Files& files_;

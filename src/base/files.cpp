@@ -123,8 +123,7 @@ Files::Folder* Files::ReadFolder(const std::string& host, std::int64_t modified)
   return folder.get();
 }
 
-Files::Folder* Files::FolderFor(const std::string& host) const {
-  const std::int64_t modified = Modified(host);
+Files::Folder* Files::FolderFor(const std::string& host, std::int64_t modified) const {
   const auto it = listings_.find(host);
   if (modified < 0) {
     if (it != listings_.end()) listings_.erase(it);
@@ -135,8 +134,8 @@ Files::Folder* Files::FolderFor(const std::string& host) const {
 }
 
 const std::string* Files::FindEntry(const std::string& hostFolder, std::string_view name,
-                                    bool making) const {
-  Folder* folder = FolderFor(hostFolder);
+                                    bool making, std::int64_t modified) const {
+  Folder* folder = FolderFor(hostFolder, modified);
   if (!folder) return nullptr;
   const std::string key = LCase(name);
   auto it = folder->entries.find(key);
@@ -154,6 +153,11 @@ const std::string* Files::FindEntry(const std::string& hostFolder, std::string_v
 
 // The program's own changes are entered into a listing that was true before them.
 void Files::Note(const std::string& host, bool added, std::int64_t before) const {
+  Note(host, added, before, Modified(HostFolderOf(host)));
+}
+
+void Files::Note(const std::string& host, bool added, std::int64_t before,
+                 std::int64_t after) const {
   const std::string hostFolder = HostFolderOf(host);
   const auto it = listings_.find(hostFolder);
   if (it == listings_.end()) return;
@@ -170,7 +174,6 @@ void Files::Note(const std::string& host, bool added, std::int64_t before) const
   } else {
     folder.entries.erase(LCase(name));
   }
-  const std::int64_t after = Modified(hostFolder);
   if (after == before && folder.sure) return;  // a file that was there: nothing changed
   folder.modified = after;
   folder.sure = false;
@@ -207,7 +210,8 @@ std::string Files::ResolveFolder(std::string_view dosFolder) const {
   for (const std::string_view name : names) {
     std::string next = Join(host, name);
     if (!io_.Status(next).exists) {
-      if (const std::string* entry = FindEntry(host, name, false)) next = Join(host, *entry);
+      if (const std::string* entry = FindEntry(host, name, false, Modified(host)))
+        next = Join(host, *entry);
     }
     host = std::move(next);
   }
@@ -224,7 +228,8 @@ std::string Files::Locate(std::string_view path, bool making) const {
   std::string hostFolder = ResolveFolder(folder);
   std::string host = Join(hostFolder, name);
   if (io_.Status(host).exists) return host;
-  if (Modified(hostFolder) < 0) {
+  std::int64_t modified = Modified(hostFolder);
+  if (modified < 0) {
     // The folder known under this path is gone; another may stand in its place.
     const auto known = folders_.find(folder);
     if (known == folders_.end()) return host;
@@ -232,8 +237,9 @@ std::string Files::Locate(std::string_view path, bool making) const {
     hostFolder = ResolveFolder(folder);
     host = Join(hostFolder, name);
     if (io_.Status(host).exists) return host;
+    modified = Modified(hostFolder);
   }
-  if (const std::string* entry = FindEntry(hostFolder, name, making))
+  if (const std::string* entry = FindEntry(hostFolder, name, making, modified))
     return Join(hostFolder, *entry);
   return host;
 }
@@ -276,7 +282,7 @@ std::unique_ptr<HostFile> Files::OpenInKnown(Known& known, std::string_view name
   if (known.otherCase) {
     // Where one file is in another case the next one is too: the listing is asked first. It
     // can't be wrong about the exact name, which would win, when it is sure.
-    const Folder* folder = FolderFor(known.host);
+    const Folder* folder = FolderFor(known.host, Modified(known.host));
     if (folder && folder->sure && !folder->twins) {
       const auto it = folder->entries.find(LCase(name));
       if (it != folder->entries.end())

@@ -96,10 +96,13 @@ class Files {
   std::pair<std::string, std::string> RenamePaths(std::string_view from, std::string_view to) const;
   std::unique_ptr<HostFile> OpenInKnown(Known& known, std::string_view name, OpenMode mode) const;
   Folder* ReadFolder(const std::string& host, std::int64_t modified) const;
-  Folder* FolderFor(const std::string& host) const;
-  const std::string* FindEntry(const std::string& hostFolder, std::string_view name,
-                               bool making) const;
+  Folder* FolderFor(const std::string& host, std::int64_t modified) const;
+  // `modified` is the folder's time, just asked for.
+  const std::string* FindEntry(const std::string& hostFolder, std::string_view name, bool making,
+                               std::int64_t modified) const;
   std::string ResolveFolder(std::string_view dosFolder) const;
+  // `before` and `after` are the folder's times around the change.
+  void Note(const std::string& host, bool added, std::int64_t before, std::int64_t after) const;
   void Note(const std::string& host, bool added, std::int64_t before) const;
   // The folder changed by temporary files alone: a listing that was true before holds still.
   // Returns the folder's time now.

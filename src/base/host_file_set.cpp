@@ -17,7 +17,8 @@ constexpr int kManyFiles = 16;
 
 std::string_view NameOf(std::string_view host) { return host.substr(host.rfind('/') + 1); }
 
-void RefuseUnlessReplaceable(Io& io, const std::string& host) {
+// What stands at `host`.
+HostStatus RefuseUnlessReplaceable(Io& io, const std::string& host) {
   const HostStatus status = io.Status(host);
   const char* fault = nullptr;
   if (status.folder) {
@@ -28,23 +29,38 @@ void RefuseUnlessReplaceable(Io& io, const std::string& host) {
     fault = " is read-only";
   }
   if (fault) throw RunTimeError(kPathAccess, std::string(NameOf(host)) + fault);
+  return status;
 }
+
+bool IsLink(Io& io, const std::string& host) { return io.LinkTarget(host) != host; }
 
 // A living writer has it locked.
 bool IsLeftOver(Io& io, const std::string& host) {
-  if (!io.Status(host).plain || io.LinkTarget(host) != host) return false;
+  if (!io.Status(host).plain || IsLink(io, host)) return false;
   std::string heldBy;
   return io.TryLock(host, "", heldBy) != nullptr;
 }
 
-std::unique_ptr<HostFile> OpenTemporary(Io& io, const std::string& host, std::string& temporary) {
-  for (int n = 0;; ++n) {
-    temporary = host + ".tmp" + (n == 0 ? "" : std::to_string(n)) + "~";
-    if (IsLeftOver(io, temporary)) io.Remove(temporary);
-    const bool taken = io.Status(temporary).exists || io.LinkTarget(temporary) != temporary;
-    if (taken && n == kMostTemporaries) throw RunTimeError(kPathAccess, "Temporary names are used");
-    if (!taken) return io.Open(temporary, OpenMode::kNew);
+// Nothing where the name is taken. Its name is looked at only when it can't be made: thousands of
+// files are.
+std::unique_ptr<HostFile> OpenNew(Io& io, const std::string& host) {
+  try {
+    return io.Open(host, OpenMode::kNew);
+  } catch (const RunTimeError& e) {
+    if (e.number() != kPathAccess || !(io.Status(host).exists || IsLink(io, host))) throw;
+    return nullptr;
   }
+}
+
+std::unique_ptr<HostFile> OpenTemporary(Io& io, const std::string& host, std::string& temporary) {
+  for (int n = 0; n <= kMostTemporaries; ++n) {
+    temporary = host + ".tmp" + (n == 0 ? "" : std::to_string(n)) + "~";
+    if (auto file = OpenNew(io, temporary)) return file;
+    if (!IsLeftOver(io, temporary)) continue;
+    io.Remove(temporary);
+    if (auto file = OpenNew(io, temporary)) return file;
+  }
+  throw RunTimeError(kPathAccess, "Temporary names are used");
 }
 
 void CopyHostFile(Io& io, const std::string& from, const std::string& to) {
@@ -131,10 +147,15 @@ bool Quietly(Action action) noexcept {
 HostFileSet::~HostFileSet() { Clear(); }
 
 void HostFileSet::Write(std::string path, std::string bytes) {
+  AddWrite(std::move(path), std::move(bytes));
+}
+
+HostStatus HostFileSet::AddWrite(std::string path, std::string bytes) {
   Step step{.kind = Kind::kWrite, .path = io_.LinkTarget(path), .bytes = std::move(bytes)};
-  RefuseUnlessReplaceable(io_, step.path);
+  const HostStatus old = RefuseUnlessReplaceable(io_, step.path);
   step.aside = step.path + ".old~";
   steps_.push_back(std::move(step));
+  return old;
 }
 
 void HostFileSet::Remove(std::string path) {
@@ -152,14 +173,30 @@ void HostFileSet::Rename(std::string from, std::string to) {
                     .aside = std::move(aside)});
 }
 
-CopiedFile HostFileSet::Copy(const std::string& from, std::string path) {
-  const auto source = io_.Open(from, OpenMode::kRead);
-  Write(std::move(path), {});
+CopiedFile HostFileSet::Copy(HostFile& source, std::string path) {
+  return Fill(std::move(path), [&source](HostFile& file) { return file.CopyFrom(source); });
+}
+
+CopiedFile HostFileSet::WriteNow(std::string path, std::span<const std::string_view> pieces) {
+  return Fill(std::move(path), [pieces](HostFile& file) {
+    std::uint64_t size = 0;
+    for (const std::string_view piece : pieces) {
+      file.WriteAt(size, piece.data(), piece.size());
+      size += piece.size();
+    }
+    return size;
+  });
+}
+
+CopiedFile HostFileSet::Fill(std::string path,
+                             const std::function<std::uint64_t(HostFile&)>& write) {
+  const HostStatus old = AddWrite(std::move(path), {});
   Step& step = steps_.back();
   try {
     CopiedFile copied;
-    copied.replaces = OpenStaged(step);
-    copied.bytes = step.making->CopyFrom(*source);
+    copied.replaces = old.exists ? old.size : 0;
+    OpenStaged(step, old);
+    copied.bytes = write(*step.making);
     step.flushed = false;
     step.making.reset();
     return copied;
@@ -170,16 +207,14 @@ CopiedFile HostFileSet::Copy(const std::string& from, std::string path) {
   }
 }
 
-std::uint64_t HostFileSet::OpenStaged(Step& step) {
-  const HostStatus old = io_.Status(step.path);
+void HostFileSet::OpenStaged(Step& step, const HostStatus& old) {
   step.making = OpenTemporary(io_, step.path, step.temporary);
   step.staged = true;
   if (old.exists) step.making->TakeAccess(old);
-  return old.exists ? old.size : 0;
 }
 
 void HostFileSet::StageOne(Step& step, bool flush) {
-  OpenStaged(step);
+  OpenStaged(step, io_.Status(step.path));
   step.making->WriteAt(0, step.bytes.data(), step.bytes.size());
   if (flush) step.making->Flush();
   step.bytes = {};
@@ -212,9 +247,14 @@ void HostFileSet::Stage() {
 
 // A second name keeps the file at no cost; where the file system has none, a copy does.
 void HostFileSet::KeepAside(Step& step, const std::string& path) {
-  if (io_.Status(step.aside).exists) io_.Remove(step.aside);  // a crash left it
   try {
-    io_.Link(path, step.aside);
+    try {
+      io_.Link(path, step.aside);
+    } catch (const RunTimeError& e) {
+      if (e.number() != kPathAccess || !io_.Status(step.aside).exists) throw;
+      io_.Remove(step.aside);  // a crash left it
+      io_.Link(path, step.aside);
+    }
   } catch (const RunTimeError& e) {
     if (e.number() == kDiskFull) throw;
     step.kept = true;  // a copy that fails half-way is to be cleared away
@@ -283,7 +323,8 @@ void HostFileSet::WriteJournal() {
   std::string text;
   AppendField(text, kFirstField);
   for (const Step& step : steps_) {
-    const HostStatus before = io_.Status(step.path);
+    // What a file that is written replaces does not matter to who goes on.
+    const HostStatus before = step.kind == Kind::kWrite ? HostStatus{} : io_.Status(step.path);
     const char kind[] = {step.kind == Kind::kWrite ? 'W' : step.kind == Kind::kRemove ? 'D' : 'R'};
     AppendField(text, {kind, 1});
     for (const std::string* path : {&step.path, &step.to, &step.temporary, &step.aside})

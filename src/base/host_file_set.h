@@ -1,7 +1,10 @@
 #pragma once
 
+#include <functional>
 #include <memory>
+#include <span>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -20,7 +23,8 @@ struct CopiedFile {
 // New bytes go to a temporary file of a fresh name beside the file, are flushed, and are put in
 // place by renaming; the new file has permissions, owner and group of the old one. Where the
 // path is a link the file that it leads to is replaced, and the link stays. A temporary file is
-// always a new one. What stands under its name, a link too, is left alone, unless a crash left it: a living writer holds a lock on the temporary file of a set of one until it is in place, and the
+// always a new one. What stands under its name, a link too, is left alone, unless a crash left it:
+// a living writer holds a lock on the temporary file of a set of one until it is in place, and the
 // home's lock while it makes several.
 //
 // Commit writes all new bytes first, so that a full disk shows while every file is as it was,
@@ -45,10 +49,12 @@ class HostFileSet {
 
   // Each only notes what is to be done; nothing is changed yet. Error 75 as above.
   void Write(std::string path, std::string bytes);
-  // The bytes of another file: they are copied to the temporary file at once, unflushed, so that
+  // The bytes of another file that is open for reading: they are copied to the temporary file at once, unflushed, so that
   // thousands of large files take no memory. A failure leaves what the set has so far. Called under
   // the home's lock.
-  CopiedFile Copy(const std::string& from, std::string path);
+  CopiedFile Copy(HostFile& source, std::string path);
+  // The same with bytes that the program has, in pieces that follow one another.
+  CopiedFile WriteNow(std::string path, std::span<const std::string_view> pieces);
   void Remove(std::string path);                  // nothing where it is not there by then
   void Rename(std::string from, std::string to);  // replaces `to`
 
@@ -75,8 +81,11 @@ class HostFileSet {
     bool done = false;
   };
 
-  // Bytes of the file that is to give way.
-  std::uint64_t OpenStaged(Step& step);
+  // `write` returns how many bytes it wrote.
+  CopiedFile Fill(std::string path, const std::function<std::uint64_t(HostFile&)>& write);
+  // Returns what is to give way.
+  HostStatus AddWrite(std::string path, std::string bytes);
+  void OpenStaged(Step& step, const HostStatus& old);
   void StageOne(Step& step, bool flush);
   void Perform(Step& step);
   void KeepAside(Step& step, const std::string& path);

@@ -106,6 +106,7 @@ class PosixFile : public HostFile {
         if (n < 0 && errno == EINTR) continue;
         if (n < 0 && (errno == ENOSPC || errno == EDQUOT || errno == EFBIG || errno == EIO))
           Fail(errno, {});
+        if (n == 0 && done > 0) return done;
         if (n <= 0) break;
         done += std::uint64_t(n);
       }

@@ -140,10 +140,11 @@ std::vector<std::string> FilesToCopy(const Files& files, const std::string& fold
   std::vector<std::string> names;
   try {
     if (!files.IsFolder(source)) throw RunTimeError(kPathNotFound);
+    const std::string host = files.HostPath(source);
     for (const std::string& name : files.List(source)) {
       // A host's name may hold what parts the folders of a path.
       if (name.find('\\') != std::string::npos || IsLeftOver(name)) continue;
-      if (files.io().Status(files.HostPath(source + name)).plain) names.push_back(name);
+      if (files.io().Status(host + "/" + name).plain) names.push_back(name);
     }
   } catch (const RunTimeError& e) {
     names.clear();

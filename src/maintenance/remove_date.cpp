@@ -1,6 +1,8 @@
 #include "maintenance/remove_date.h"
 
+#include <algorithm>
 #include <span>
+#include <string_view>
 #include <unordered_set>
 #include <vector>
 
@@ -19,9 +21,7 @@ namespace kora {
 namespace {
 
 constexpr const char* kTitle = "Remove Selected Data";
-// Files that are put in place together, and bytes.
-constexpr int kFilesTogether = 64;
-constexpr size_t kBytesTogether = 32u << 20;
+constexpr int kFilesTogether = 64;  // are put in place
 
 // Dates are compared by value; eight digits have that of no other eight.
 bool HasDate(const PriceRec& rec, std::string_view yyyymmdd) {
@@ -32,30 +32,30 @@ bool HasDate(const PriceRec& rec, std::string_view yyyymmdd) {
   return !digits && Val(date) == Val(yyyymmdd);
 }
 
-// The bytes of the records without the date, and how many were left out.
-std::string Without(std::span<const PriceRec> records, std::string_view date, bool latestOnly,
-                    std::int32_t& removed) {
-  std::vector<size_t> out;
-  if (latestOnly) {
-    for (size_t i = records.size(); i-- > 0 && out.empty();)
-      if (HasDate(records[i], date)) out.push_back(i);
-  } else {
-    for (size_t i = 0; i < records.size(); ++i)
-      if (HasDate(records[i], date)) out.push_back(i);
-  }
-  removed = std::int32_t(out.size());
-  std::string bytes;
-  if (out.empty()) return bytes;
-  bytes.reserve((records.size() - out.size()) * sizeof(PriceRec));
+// The records with the date; of them the last one alone where only that is to go.
+std::vector<size_t> WithDate(std::span<const PriceRec> records, std::string_view date,
+                             bool latestOnly) {
+  std::vector<size_t> found;
+  for (size_t i = records.size(); i-- > 0 && !(latestOnly && !found.empty());)
+    if (HasDate(records[i], date)) found.push_back(i);
+  std::reverse(found.begin(), found.end());
+  return found;
+}
+
+// The bytes between the records that go.
+std::vector<std::string_view> Without(std::span<const PriceRec> records,
+                                      const std::vector<size_t>& gone) {
+  std::vector<std::string_view> pieces;
   size_t from = 0;
   const auto take = [&](size_t to) {
-    bytes.append(reinterpret_cast<const char*>(records.data() + from),
-                 (to - from) * sizeof(PriceRec));
+    if (to > from)
+      pieces.emplace_back(reinterpret_cast<const char*>(records.data() + from),
+                          (to - from) * sizeof(PriceRec));
     from = to + 1;
   };
-  for (const size_t i : out) take(i);
+  for (const size_t i : gone) take(i);
   take(records.size());
-  return bytes;
+  return pieces;
 }
 
 class DateRemoval {
@@ -81,7 +81,6 @@ class DateRemoval {
   const bool latestOnly_;
   FileSet set_;
   int waiting_ = 0;
-  size_t bytes_ = 0;
   std::int32_t records_ = 0;
   std::unordered_set<std::string> seen_;  // files of two names are gone through once
 };
@@ -90,13 +89,11 @@ void DateRemoval::Visit(const MarketItem& item, Progress& progress) {
   const std::string code(item.code);
   if (!seen_.insert(UCase(code)).second) return;
   progress.Show(ProgressLine::kState, "Removing " + DateToDisplay(date_) + " from " + code);
-  std::int32_t removed = 0;
-  std::string kept = Without(item.records, date_, latestOnly_, removed);
-  if (removed == 0) return;
-  bytes_ += kept.size();
-  set_.Add(folder_ + CodeFileName(code, ".WDT"), std::move(kept));
+  const auto gone = WithDate(item.records, date_, latestOnly_);
+  if (gone.empty()) return;
+  set_.AddNow(folder_ + CodeFileName(code, ".WDT"), Without(item.records, gone));
   ++waiting_;
-  records_ += removed;
+  records_ += std::int32_t(gone.size());
 }
 
 void DateRemoval::PutInPlace(RemovedDate& removed) {
@@ -105,7 +102,6 @@ void DateRemoval::PutInPlace(RemovedDate& removed) {
   removed.files += waiting_;
   removed.records += records_;
   waiting_ = 0;
-  bytes_ = 0;
   records_ = 0;
 }
 
@@ -118,7 +114,7 @@ void DateRemoval::Run(Progress& progress, Dialogs& dialogs, RemovedDate& removed
     inHand = folder_ + std::string(item.code) + ".WDT";
     Visit(item, progress);
     code = item.code;
-    if (waiting_ >= kFilesTogether || bytes_ >= kBytesTogether) {
+    if (waiting_ >= kFilesTogether) {
       PutInPlace(removed);
       removed.last = code;
     }
