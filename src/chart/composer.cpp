@@ -169,6 +169,7 @@ void Composer::DrawTitle() {
   const std::string title =
       code + (request_.ScriptPrintMode ? "  " : "    ") + FromAnsi(name.Name.trimmed());
   pen_.Text('T', font, {size, 20, 2, title, canvas_.colour(kChartTitle)});
+  chart_.TitleBottom = services_.price.CurrentY();
   if (const std::string other = FromAnsi(name.OtherDetails.trimmed()); !other.empty()) {
     const double y = services_.price.CurrentY();
     const std::string text = std::string(15, ' ') + other;

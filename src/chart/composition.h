@@ -41,6 +41,7 @@ struct Composition : ChartLayout {
   bool ChartDrawn = false;         // the composition ended without a failure
   std::string DataFile;            // "ORE.WDT", for messages
   double SurfaceHeight = 0;
+  double TitleBottom = 0;  // below the line of code and name
 };
 
 }  // namespace kora

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <limits>
 #include <vector>
 
 #include "base/numbers.h"
@@ -12,9 +13,11 @@
 namespace kora {
 namespace {
 
-constexpr double kLabelGap = 5;  // between a right-aligned label and the frame
-constexpr double kWordX = 14;    // the middle of "VOL"
-constexpr double kDateGap = 2;   // the least between two texts of the date axis
+constexpr double kLabelGap = 5;     // between a right-aligned label and the frame
+constexpr double kWordX = 14;       // the middle of "VOL"
+constexpr double kDateGap = 2;      // the least between two texts of the date axis
+constexpr double kTitleGap = 2;     // by which the title may reach into the line below it
+constexpr double kLabelHeight = 9;  // of the figures of a price label
 
 double LnAbove0(double value) {
   if (!(value > 0)) throw RunTimeError(kBadCall);
@@ -43,11 +46,16 @@ std::vector<ScaleTick> ScaleTicks(const ChartCanvas& canvas) {
   const double low = chart.Scale.ScaleLow, step = chart.Scale.GridStep;
   const bool fromZero = chart.Scale.ScaleLow == 0.001f;
   std::vector<ScaleTick> ticks;
+  double lastLabel = std::numeric_limits<double>::max();
   for (int i = 0; i <= chart.Scale.GridCount; ++i) {
     const auto v = static_cast<float>(fromZero && i > 0 ? step * i : step * i + low);
     const double y = chart.Price.Y(v);
     if (y < chart.ChartTop) break;
-    const bool labelled = chart.Scale.GridCount <= 12 || i <= 6 || i % 2 == 0;
+    bool labelled = chart.Scale.GridCount <= 12 || i <= 6 || i % 2 == 0;
+    if (canvas.request.Legible && labelled) {
+      labelled = lastLabel - y >= kLabelHeight;
+      if (labelled) lastLabel = y;
+    }
     ticks.push_back({i, y, labelled ? Format(v, v > 0 && v < 0.2 ? ".00#" : format) : ""});
   }
   return ticks;
@@ -168,9 +176,12 @@ void DrawScale(const ChartCanvas& canvas, bool lineChart, std::string_view class
   pen.Box('B', {left, double(chart.ChartTop), right, double(chart.ChartBottom), border});
 
   if (!IsSplit(request.Place) && !IsSuperimposed(request.Place)) {
-    const std::string mode = ModeLine(canvas, lineChart, classText);
-    pen.Text('S', canvas.Font1(size), {size, left + 2, chart.ChartTop - 18.0, mode, text},
-             {size, left + 2, chart.ChartTop - 12.0, mode, text});
+    // On a low chart its place is that of the title.
+    const double y = chart.ChartTop - 18.0;
+    if (const std::string mode = ModeLine(canvas, lineChart, classText);
+        !request.Legible || y >= chart.TitleBottom - kTitleGap)
+      pen.Text('S', canvas.Font1(size), {size, left + 2, y, mode, text},
+               {size, left + 2, chart.ChartTop - 12.0, mode, text});
   }
   if (IsSuperimposed(request.Place)) return;
 
