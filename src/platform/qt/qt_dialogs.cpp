@@ -6,8 +6,10 @@
 #include <QInputDialog>
 #include <QMessageBox>
 #include <QProgressDialog>
+#include <QScreen>
 #include <QSpacerItem>
 #include <QStyle>
+#include <algorithm>
 
 #include "platform/qt/to_qt.h"
 
@@ -35,6 +37,19 @@ void FitTitle(QMessageBox& box) {
   const int buttons = 5 * box.style()->pixelMetric(QStyle::PM_TitleBarHeight);
   const int width = QFontMetrics(bold).horizontalAdvance(box.windowTitle()) + buttons;
   grid->addItem(new QSpacerItem(width, 0), grid->rowCount(), 0, 1, grid->columnCount());
+}
+
+// A box of the start stands below the splash window, not over it.
+void KeepOffSplash(QDialog& box) {
+  for (const QWidget* window : QApplication::topLevelWidgets()) {
+    if (window->windowType() != Qt::SplashScreen || !window->isVisible()) continue;
+    box.adjustSize();
+    const QRect room = window->screen()->availableGeometry();
+    const QRect splash = window->geometry();
+    const int gap = box.style()->pixelMetric(QStyle::PM_TitleBarHeight);
+    const int top = std::min(splash.bottom() + gap, room.bottom() - box.height() - gap);
+    box.move(splash.center().x() - box.width() / 2, top);
+  }
 }
 
 // While a question stands the pointer is the normal one, whatever goes on behind it.
@@ -118,6 +133,7 @@ Answer QtDialogs::Ask(std::string_view text, std::string_view title, Buttons but
   const bool declines = buttons == Buttons::kYesNo || buttons == Buttons::kNoYes;
   if (declines) box.setEscapeButton(B::No);
   FitTitle(box);
+  KeepOffSplash(box);
   switch (box.exec()) {
     case B::Ok: return Answer::kOk;
     case B::Yes: return Answer::kYes;
@@ -136,6 +152,7 @@ std::optional<std::string> QtDialogs::Prompt(std::string_view text, std::string_
   box.setWindowTitle(ToQt(title));
   box.setLabelText(ToQt(text));
   box.setTextValue(ToQt(standing));
+  KeepOffSplash(box);
   if (box.exec() != QDialog::Accepted) return std::nullopt;
   const std::string answer = box.textValue().toStdString();
   if (answer.empty()) return std::nullopt;
