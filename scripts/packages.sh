@@ -11,6 +11,8 @@ kora_packages=(
 test_packages=(cups printer-driver-cups-pdf desktop-file-utils appstream man-db shared-mime-info)
 # For the packages of scripts/package.sh and their check.
 package_packages=(dpkg-dev lintian debootstrap)
+# For the fuzz targets of scripts/fuzz.sh.
+fuzz_packages=(clang libclang-rt-14-dev)
 
 # Installs what is missing of the packages named. Nothing is asked, and nothing is looked up
 # where all are there.

@@ -56,7 +56,7 @@ inline constexpr std::int32_t kMostRecords = 32767;
 // SkipBad. What the others hold changes together at the end, price files before the name file,
 // and that before the lists; a failure, as a full disk, and a user who stops it leave every file
 // as it was. Every failure is told by a message titled "Import", rows with file and line number.
-// Returns whether all rows were taken.
+// Returns whether all rows were taken, but for those that SkipBad leaves out.
 bool ImportHistory(const Files& files, const std::string& dataPath,
                    std::span<const std::string> hostFiles, const ImportOptions& options,
                    Dialogs& dialogs, ImportCounts& counts);
