@@ -51,7 +51,8 @@ const Settings& ChartDefaults() {
     SettingsFile ini(home.files, "C:\\WINDOWS\\Kora.ini");
     WriteDefaultSettings(ini);
     ReadSettings(ini, home.files, home.dialogs, home.settings);
-    for (const OscKey& key : OscKeys()) home.settings.osc[key] = {key.defaultDaily, key.defaultTwin};
+    for (const OscKey& key : OscKeys())
+      home.settings.osc[key] = {key.defaultDaily, key.defaultTwin};
     home.settings.osc.CompFile = "c:\\korawin\\data\\IDX.WDT";
     return home.settings;
   }();
@@ -151,9 +152,10 @@ void DrawPricesBody(std::string_view bytes) {
 
   CheckedSurface price(638, 452), panel(638, 144);
   ChartScript script;
-  ChartServices services{home.files, home.dialogs, settings.paths, settings.fonts, colours,
-                         price,      &panel,       &script,
-                         PriceOverlays((switches & 4) != 0, settings.osc.MMASet)};
+  ChartServices services{
+      home.files,     home.dialogs, settings.paths,
+      settings.fonts, colours,      price,
+      &panel,         &script,      PriceOverlays((switches & 4) != 0, settings.osc.MMASet)};
   services.overlays.push_back(SavedMarksOverlay(home.files, settings.paths.ChartMiscPath));
   Composition chart;
   const bool drawn = ComposeChart(services, request, chart);
@@ -161,11 +163,14 @@ void DrawPricesBody(std::string_view bytes) {
   home.OnlyChanged(before, {});
   if (!drawn) return;
   if (!request.OscName.empty()) {
-    OscHost host{home.files, home.dialogs, settings, colours, request, chart, price, panel, &script};
+    OscHost host{home.files, home.dialogs, settings, colours, request,
+                 chart,      price,        panel,    &script};
     host.OscCode = request.OscName;
     host.SlowStochastic = (osc & 128) != 0;
     ShowOscillatorPanel(host);
   }
+  // A script has no way to write the comma of a note.
+  if (input.Rest().find(',') != std::string_view::npos) return;
   CheckedSurface again(638, 600);
   Promise(PlayChartScript(script.text(), again, settings.fonts, colours),
           "a chart that was drawn can be played");

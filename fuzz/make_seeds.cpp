@@ -78,8 +78,9 @@ void MakeSeeds(Seeds& seeds) {
       seeds.Add("prices", Last(bytes, 12 * sizeof(PriceRec)));
       const std::string quarter = Last(bytes, 70 * sizeof(PriceRec));
       for (int style = 0; style < 4; ++style)
-        seeds.Add("charts", std::string{char(0x20 + style), char(prices * 5 + style * 2), '\x06',
-                                        '\x03'} + quarter);
+        seeds.Add("charts",
+                  std::string{char(0x20 + style), char(prices * 5 + style * 2), '\x06', '\x03'} +
+                      quarter);
       seeds.Add("scans", '\x3F' + Last(bytes, 40 * sizeof(PriceRec)));
     }
     if ((end == ".D" || end == ".d") && ++days <= 2) {

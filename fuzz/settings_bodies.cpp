@@ -71,8 +71,7 @@ void ReadSettingsBody(std::string_view bytes) {
     again.paths.WindowsPath = "C:\\WINDOWS\\";
     SettingsFile fresh(session.files, session.ini.path());
     Promise(ReadSettings(fresh, session.files, session.dialogs, again), "settings read back");
-    if (WhyNotKept(data).empty())
-      Promise(again.paths.CurrentDataPath == data, "folders read back");
+    if (WhyNotKept(data).empty()) Promise(again.paths.CurrentDataPath == data, "folders read back");
   }
   for (const std::string& name : GetSubLists(session.user))
     Promise(!name.empty(), "a list has a name");

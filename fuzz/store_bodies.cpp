@@ -122,8 +122,8 @@ void ReadNamesBody(std::string_view bytes) {
 
   home.Put("data/Names.dat", bytes);
   SettingsFile ini(home.files, "C:\\WINDOWS\\Kora.ini");
-  NameEditor editor({home.files, home.data, home.system, home.dialogs, ini,
-                     home.settings.download});
+  NameEditor editor(
+      {home.files, home.data, home.system, home.dialogs, ini, home.settings.download});
   editor.Load();
   Promise(BytesOf(editor.rows()) == BytesOf(names), "a row a record");
   editor.FillClasses();
@@ -140,7 +140,8 @@ void ReadNamesBody(std::string_view bytes) {
     for (const NameRec& rec : kept)
       Promise(rec.NameStatus == 0 && !rec.Code.trimmed().empty(), "a saved name has a code");
     editor.SaveNames();
-    Promise(BytesOf(ReadNames(home.files, home.data)) == BytesOf(kept), "a second save is the first");
+    Promise(BytesOf(ReadNames(home.files, home.data)) == BytesOf(kept),
+            "a second save is the first");
   }
   SortNameFile(home.files, home.data, NameSort::kCode);
 }
@@ -172,7 +173,8 @@ void ReadPricesBody(std::string_view bytes) {
     ParseFileDate(rec.RecDate.raw());
     DateToDisplay(rec.RecDate.raw());
   }
-  const std::string wanted = records.empty() ? "19980914" : std::string(records.back().RecDate.raw());
+  const std::string wanted =
+      records.empty() ? "19980914" : std::string(records.back().RecDate.raw());
   const AdjustmentDates dates = FindAdjustmentDate(records, wanted);
   Promise(dates.empty() || dates.Selected < dates.Lines.size(), "the line chosen is one");
   OtherDateText(records, dates, wanted, "14/9/98");
@@ -278,8 +280,8 @@ void ReadTrendlinesBody(std::string_view bytes) {
   line.TLPeriod.set("A");
   const std::int32_t slot = SaveTrendline(home.files, path, line);
   auto saved = ReadTrendlines(home.files, path);
-  Promise(slot >= 1 && size_t(slot) <= saved.size() && BytesOf(saved[size_t(slot) - 1]) ==
-                                                           BytesOf(line),
+  Promise(slot >= 1 && size_t(slot) <= saved.size() &&
+              BytesOf(saved[size_t(slot) - 1]) == BytesOf(line),
           "a saved line reads back");
   Promise(saved.size() == std::max(lines.size(), size_t(slot)), "others stay");
   for (size_t i = 0; i < lines.size(); ++i)
@@ -396,8 +398,8 @@ void ReadTablesBody(std::string_view bytes) {
       ReadMarketVolumeFactors(home.files, home.settings.download.ServiceSystem);
   Promise(general >= 0 && general <= 1e4 && index >= 0 && index <= 1e4, "factors are powers");
   for (const std::string_view code : {"ORE", "", "BHP"})
-    if (const auto one = FindDefinition(
-            home.files, home.settings.download.ServiceSystem + "Mainfile.asx", code))
+    if (const auto one =
+            FindDefinition(home.files, home.settings.download.ServiceSystem + "Mainfile.asx", code))
       for (const auto power : {one->pricePower, one->volumePower})
         if (power) PowerOfTen(*power);
   home.settings.download.DataService = 1;

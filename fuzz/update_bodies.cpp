@@ -94,8 +94,8 @@ void ReadDownloadBody(std::string_view bytes) {
   TakeDay(bytes, 1, pieces);
   CheckRecords(whole.home);
   whole.home.OnlyChanged(whole.before,
-                         {"data/*.WDT", "data/Names.dat", "idx/*.WDT", "idx/Names.dat",
-                          "sum/*.WDT", "opt/*.WDT", "opt/Names.dat", "download/*"});
+                         {"data/*.WDT", "data/Names.dat", "idx/*.WDT", "idx/Names.dat", "sum/*.WDT",
+                          "opt/*.WDT", "opt/Names.dat", "download/*"});
   Promise(whole.end == pieces.end && whole.home.io.Store() == pieces.home.io.Store(),
           "a day held in pieces is the day held whole");
   if (whole.end != UpdateEnd::kAbandoned || whole.home.settings.download.DataService >= 3) return;
@@ -196,8 +196,7 @@ void ReadImportBody(std::string_view bytes) {
   const auto before = home.io.Store();
   const std::string path[] = {"home/BHP.csv"};
   ImportCounts counts;
-  const bool all =
-      ImportHistory(home.files, home.data, path, options, home.dialogs, counts);
+  const bool all = ImportHistory(home.files, home.data, path, options, home.dialogs, counts);
   CheckRecords(home);
   home.OnlyChanged(before, {"data/*.WDT", "data/Names.dat", "data/SubListA.Dat"});
   Promise(all || !home.dialogs.said.empty(), "what was not taken is told");
@@ -274,8 +273,7 @@ void ReadAdjustmentsBody(std::string_view bytes) {
   const auto before = home.io.Store();
   LineReader lines(input.Rest());
   std::string_view line;
-  while (lines.Next(line))
-    Promise(AdjustLine(ParseAdjustLine(line)) == line, "a line reads back");
+  while (lines.Next(line)) Promise(AdjustLine(ParseAdjustLine(line)) == line, "a line reads back");
   AdjustRows rows = ReadAdjustList(home.files, home.data);
   const std::string text = AdjustListText(rows);
   if (choice & 4) SortAdjustments(rows);

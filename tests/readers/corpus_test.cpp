@@ -40,7 +40,8 @@ TEST_P(CorpusTest, HoldsWhatItPromises) {
   EXPECT_NO_THROW(hand.Give(reader, "nothing", ""));
 }
 
-INSTANTIATE_TEST_SUITE_P(Readers, CorpusTest, ::testing::ValuesIn(Readers().begin(), Readers().end()),
+INSTANTIATE_TEST_SUITE_P(Readers, CorpusTest,
+                         ::testing::ValuesIn(Readers().begin(), Readers().end()),
                          [](const auto& info) { return std::string(info.param.name); });
 
 TEST(CorpusFolderTest, EachFolderAndEachDictionaryIsAReaders) {

@@ -1,9 +1,10 @@
 #pragma once
 
+#include <unistd.h>
+
 #include <csignal>
 #include <fstream>
 #include <string>
-#include <unistd.h>
 
 #include "fuzz/readers.h"
 
