@@ -343,6 +343,8 @@ void Files::MakeFolder(std::string_view path) const {
 
 void Files::Remove(std::string_view path) const {
   const std::string host = HostPath(path);
+  if (io_.Status(host).readOnly)
+    throw RunTimeError(kPathAccess, std::string(FileNameOf(path)) + " is read-only");
   const std::int64_t before = Modified(HostFolderOf(host));
   io_.Remove(host);
   Note(host, false, before);

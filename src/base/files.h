@@ -65,6 +65,7 @@ class Files {
   std::vector<std::string> List(std::string_view folder) const;
   // Makes the folder and those above it; nothing when it is there.
   void MakeFolder(std::string_view path) const;
+  // Error 75 for a read-only file.
   void Remove(std::string_view path) const;
   // Replaces `to` where it exists; a name that differs in case alone changes its case.
   void Rename(std::string_view from, std::string_view to) const;

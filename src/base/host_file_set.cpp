@@ -266,7 +266,10 @@ void HostFileSet::KeepAside(Step& step, const std::string& path) {
 void HostFileSet::Perform(Step& step) {
   switch (step.kind) {
     case Kind::kWrite:
-      if (io_.Status(step.path).exists) KeepAside(step, step.path);
+      if (io_.Status(step.path).exists)
+        KeepAside(step, step.path);
+      else if (io_.Status(step.aside).exists)
+        Quietly([&] { io_.Remove(step.aside); });  // a crash left it, of a file that went since
       io_.Rename(step.temporary, step.path);
       step.staged = false;
       step.making.reset();

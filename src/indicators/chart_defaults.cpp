@@ -8,14 +8,16 @@ namespace {
 
 std::string Text(std::int16_t value) { return Str(std::int32_t(value)); }
 
-// Writes keys and gathers those that were refused.
+// Writes keys, together at the end, and gathers those that were refused.
 class KeyWriter {
  public:
-  KeyWriter(SettingsFile& ini, const char* section) : ini_(ini), section_(section) {}
+  KeyWriter(SettingsFile& ini, const char* section) : ini_(ini), section_(section), batch_(ini) {}
 
   void Section(const char* section) { section_ = section; }
   void Put(const char* key, const std::string& value) {
-    if (!ini_.PutSetting(section_, key, value)) failed_ += std::string("; ") + key;
+    const std::string named = std::string("; ") + key;
+    all_ += named;
+    if (!ini_.PutSetting(section_, key, value)) failed_ += named;
   }
   void Put(const char* key, const std::string& typed, std::int16_t& live) {
     live = SettingCInt(typed);
@@ -25,12 +27,14 @@ class KeyWriter {
     live = value;
     Put(key, value ? "True" : "False");
   }
-  const std::string& failed() const { return failed_; }
+  // Those that could not be written: where the file can't be, all.
+  std::string End() { return batch_.End() ? failed_ : all_; }
 
  private:
   SettingsFile& ini_;
   const char* section_;
-  std::string failed_;
+  SettingsFile::Batch batch_;
+  std::string failed_, all_;
 };
 
 }  // namespace
@@ -102,7 +106,8 @@ DefaultsSaved SaveChartDefaults(SettingsFile& ini, const Files& files, Dialogs& 
   keys.Put("AvCalc", typed.AvCalc, charts.AvCalc);
   keys.Put("ScMethod", typed.ScMethod, charts.ScMethod);
 
-  if (!keys.failed().empty()) dialogs.Message(keys.failed(), "Chart Defaults");
+  if (const std::string failed = keys.End(); !failed.empty())
+    dialogs.Message(failed, "Chart Defaults");
   return DefaultsSaved::kAll;
 }
 

@@ -1,5 +1,6 @@
 #include <algorithm>
 #include <memory>
+#include <optional>
 
 #include "base/text.h"
 #include "companies/snapshot.h"
@@ -16,8 +17,10 @@ struct SnapshotWords {
 };
 
 struct SnapshotRun {
-  SnapshotRun(const CommandLine& line, int list) : run(line), number(list) {
+  SnapshotRun(const CommandLine& line, int list, bool writes = false) : run(line), number(list) {
     run.Open();
+    if (writes)
+      held.emplace(run.session.files.lock().Hold());  // from what is read to what is saved
     try {
       rows = ReadSnapshot(run.session.files, SystemPath(), number);
     } catch (const RunTimeError& e) {
@@ -42,6 +45,7 @@ struct SnapshotRun {
   }
 
   Run run;
+  std::optional<HomeLock::Held> held;
   int number;
   std::vector<SnapshotRow> rows;
 };
@@ -52,7 +56,7 @@ int Show(const CommandLine& line, const SnapshotWords& words) {
 }
 
 int Add(const CommandLine& line, const SnapshotWords& words) {
-  SnapshotRun s(line, words.list);
+  SnapshotRun s(line, words.list, true);
   const std::string code = UCase(Trim(words.code));
   if (!IsFileCode(code)) throw UsageError("\"" + words.code + "\" is no code");
   if (s.Find(code) != s.rows.end()) return kDone;
@@ -63,7 +67,7 @@ int Add(const CommandLine& line, const SnapshotWords& words) {
 }
 
 int Remove(const CommandLine& line, const SnapshotWords& words) {
-  SnapshotRun s(line, words.list);
+  SnapshotRun s(line, words.list, true);
   const auto row = s.Find(std::string(Trim(words.code)));
   if (row == s.rows.end()) s.run.Abandon("Code not found", kSnapshotTitle);
   s.rows.erase(row);

@@ -72,11 +72,12 @@ UserListNames GetSubLists(const SettingsFile& user) {
 
 bool SaveSLNames(SettingsFile& user, const UserListNames& names) {
   bool saved = true;
+  SettingsFile::Batch batch(user);
   for (size_t i = 0; i < names.size(); ++i) {
     const auto number = std::int16_t(kFirstChartList + int(i));
     saved = user.PutSetting(kUserSection, Key(number), names[i]) && saved;
   }
-  return saved;
+  return batch.End() && saved;
 }
 
 std::vector<ListRec> ReadList(const Files& files, const std::string& dataPath,
@@ -151,10 +152,12 @@ void StageLists(FileSet& set, const Files& files, const std::string& dataPath,
                 const CodeNumbers& numbers) {
   for (std::int16_t number = kFirstChartList; number <= kResultList; ++number) {
     try {
-      StageList(set, files, dataPath, number, numbers);
-    } catch (const RunTimeError&) {
-      // It can't be shown either.
+      ReadList(files, dataPath, number);
+    } catch (const RunTimeError& e) {
+      if (e.number() == kOverflow || e.number() == kPathAccess) continue;  // nor can it be shown
+      throw;
     }
+    StageList(set, files, dataPath, number, numbers);
   }
 }
 

@@ -97,7 +97,8 @@ class CodeNumbers {
 // left the name file. Nothing where it is right as it stands.
 void StageList(FileSet& set, const Files& files, const std::string& dataPath,
                std::int16_t ChartListNo, const CodeNumbers& numbers);
-// All lists that can be read.
+// All lists that can be shown. An error of reading that may pass, or of a list that may not be
+// written, is raised: its numbers would lead to other securities.
 void StageLists(FileSet& set, const Files& files, const std::string& dataPath,
                 const CodeNumbers& numbers);
 

@@ -92,7 +92,12 @@ NameEditor::SaveEnd NameEditor::SaveNames() {
     };
     if (!kora::SaveNames(services_.files, services_.dataPath, rows_, services_.dialogs, lists))
       return {};
-    Load();
+    changed_ = false;
+    try {
+      Load();
+    } catch (const RunTimeError& e) {
+      services_.dialogs.Message(e.what(), kNameFileTitle);  // it is saved all the same
+    }
     return {true, {}};
   } catch (const RunTimeError& e) {
     services_.dialogs.Message(e.what(), kNameFileTitle);
@@ -107,12 +112,15 @@ bool NameEditor::DeleteWarrants() {
   if (answer != Answer::kYes) return false;
   std::vector<NameRec> before = rows_;
   if (RemoveWarrantRows(rows_) == 0) return false;
+  // First: where the program ends between the two, a second try still finds warrants to remove.
+  const UpdateChoice choice = UpdateChoiceOf(services_.download);
+  SaveUpdateChoice(UpdateChoice::kNoWarrants, services_.ini, services_.download);
   if (!SaveNames().saved) {
     rows_ = std::move(before);  // a removal that can't be saved has not been made
+    SaveUpdateChoice(choice, services_.ini, services_.download);
     return false;
   }
   services_.dialogs.Message(" Warrants removed", kNameFileTitle);
-  SaveUpdateChoice(UpdateChoice::kNoWarrants, services_.ini, services_.download);
   return true;
 }
 

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <memory>
+#include <utility>
 
 #include "base/runtime_error.h"
 #include "base/text.h"
@@ -181,8 +182,11 @@ bool SettingsFile::Save() {
   return true;
 }
 
-SettingsFile::Batch::~Batch() {
-  if (--file_.batch_ == 0 && file_.dirty_) file_.Save();
+SettingsFile::Batch::~Batch() { End(); }
+
+bool SettingsFile::Batch::End() {
+  if (std::exchange(ended_, true)) return true;
+  return --file_.batch_ > 0 || !file_.dirty_ || file_.Save();
 }
 
 }  // namespace kora

@@ -62,11 +62,14 @@ class SettingsFile {
    public:
     explicit Batch(SettingsFile& file) : file_(file) { ++file_.batch_; }
     ~Batch();
+    // Ends it now. False when what was gathered can't be written; the old values stay.
+    bool End();
     Batch(const Batch&) = delete;
     Batch& operator=(const Batch&) = delete;
 
    private:
     SettingsFile& file_;
+    bool ended_ = false;
   };
 
  private:

@@ -7,9 +7,11 @@
 
 namespace kora {
 
+std::string IndustryClassFile(const std::string& systemPath) { return systemPath + "IndClass.dat"; }
+
 std::vector<IndustryClass> ReadIndustryClasses(const Files& files, const std::string& systemPath) {
   std::vector<IndustryClass> out;
-  const std::string path = systemPath + "IndClass.dat";
+  const std::string path = IndustryClassFile(systemPath);
   if (!files.CheckFile(path)) return out;
   const std::string text = files.ReadAll(path, 1u << 20);
   LineReader lines(text);
@@ -52,7 +54,7 @@ void WriteIndustryClasses(const Files& files, const std::string& systemPath,
   for (const IndustryClass& row : rows)
     if (!row.id.empty()) text += ToAnsi(Trim(row.id + "," + row.description)) + "\r\n";
   const auto held = files.lock().Hold();
-  files.WriteAll(systemPath + "IndClass.dat", text);
+  files.WriteAll(IndustryClassFile(systemPath), text);
 }
 
 bool MatchesIndClass(std::string_view indClass, std::string_view filter) {

@@ -13,6 +13,7 @@ struct IndustryClass {
   std::string id, description;  // "011", free of commas
 };
 
+std::string IndustryClassFile(const std::string& systemPath);
 // The table of industry classes, IndClass.dat in the program folder: one class a line, id, a
 // comma, description. Lines without an id are left out; a line without a comma is an id alone.
 // Empty when the file is not there. Errors of reading; 7 for a file of more than 1 MB.

@@ -7,8 +7,6 @@
 namespace kora {
 namespace {
 
-constexpr std::string_view kWorkFile = "Temp.Wk3";
-
 void WriteWhole(const Files& files, const std::string& path,
                 const std::vector<TrendlineRec>& records) {
   files.WriteAll(
@@ -63,9 +61,7 @@ void CompactTrendlines(const Files& files, const std::string& path) {
   std::vector<TrendlineRec> kept;
   for (const TrendlineRec& rec : ReadTrendlines(files, path))
     if (!rec.TLStartDate.trimmed().empty() && rec.TLStartPrice != 0) kept.push_back(rec);
-  const std::string work = path.substr(0, path.find_last_of('\\') + 1) + std::string(kWorkFile);
-  WriteWhole(files, work, kept);
-  files.Rename(work, path);
+  WriteWhole(files, path, kept);
 }
 
 void RemoveTrendlines(const Files& files, const std::string& path) {

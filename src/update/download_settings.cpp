@@ -277,6 +277,16 @@ bool SaveUpdateList(const Files& files, const std::string& systemPath,
   }
   const auto held = files.lock().Hold();
   const std::string path = UpdateListFile(systemPath), backup = systemPath + "Update.Bak";
+  if (text.empty() && choice == UpdateChoice::kListed) {
+    dialogs.Message(
+        "You have selected the option to update only stocks the stocks listed, but THERE ARE NO "
+        "STOCKS LISTED. Your option will be reset to update All Stocks.",
+        "Update List");
+    choice = UpdateChoice::kAll;
+  }
+  // First, so that nothing is left to do once the new list is in its place.
+  const UpdateChoice before = UpdateChoiceOf(download);
+  SaveUpdateChoice(choice, ini, download);
   try {
     // The old list stays in its place until the new one replaces it.
     if (text.empty())
@@ -286,16 +296,12 @@ bool SaveUpdateList(const Files& files, const std::string& systemPath,
   } catch (const RunTimeError&) {
     // There was no list yet, or its copy has to wait for the next save.
   }
-  if (!text.empty()) {
-    files.WriteAll(path, text);
-  } else if (choice == UpdateChoice::kListed) {
-    dialogs.Message(
-        "You have selected the option to update only stocks the stocks listed, but THERE ARE NO "
-        "STOCKS LISTED. Your option will be reset to update All Stocks.",
-        "Update List");
-    choice = UpdateChoice::kAll;
+  try {
+    if (!text.empty()) files.WriteAll(path, text);
+  } catch (...) {
+    SaveUpdateChoice(before, ini, download);
+    throw;
   }
-  SaveUpdateChoice(choice, ini, download);
   return !text.empty();
 }
 

@@ -269,6 +269,14 @@ TEST(FileSetTest, WhatACrashSetAsideIsClearedAwayByTheNextWrite) {
   EXPECT_EQ(ContentsOf(home), (Contents{{"a", "new"}}));
 }
 
+TEST(FileSetTest, WhatACrashSetAsideOfAFileThatWentSinceIsClearedAwayToo) {
+  TempHome home;
+  home.Put("drive_c/a.old~", "left");
+  home.files().WriteAll("c:\\a", "new");
+  EXPECT_EQ(home.Get("drive_c/a"), "new");
+  EXPECT_FALSE(home.Exists("drive_c/a.old~"));
+}
+
 TEST(FileSetTest, AReadOnlyFileIsNeitherReplacedNorRemoved) {
   TempHome home;
   home.Put("drive_c/a", "old");

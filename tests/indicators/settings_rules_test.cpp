@@ -294,17 +294,30 @@ TEST_F(ChartDefaultsRules, KeysThatCantBeWrittenAreListedAtTheEnd) {
   EXPECT_EQ(text.substr(text.size() - 10), "; ScMethod");
 }
 
-TEST_F(ChartDefaultsRules, OneKeyThatCantBeWrittenIsTheOnlyOneListed) {
+TEST_F(ChartDefaultsRules, OneFailedWriteLeavesNoneOfThemHalfKept) {
   test::FailingIo io;
   test::TempHome failing(io);
   failing.Put("drive_c/korawin/data/ALODB.WDT", "");
   SettingsFile file(failing.files(), "C:\\WINDOWS\\Kora.ini");
   ASSERT_TRUE(file.PutSetting("OscDef", "StochK", "1"));
+  const std::string before = failing.Get("Kora.ini");
   io.Reset(1);
   EXPECT_EQ(SaveChartDefaults(file, failing.files(), dialogs, typed, settings),
             DefaultsSaved::kAll);
   ASSERT_EQ(dialogs.said.size(), 1u);
-  EXPECT_EQ(dialogs.said[0].text, "; StochK");
+  EXPECT_EQ(dialogs.said[0].text.substr(0, 18), "; StochK; StochKW;");
+  EXPECT_EQ(failing.Get("Kora.ini"), before);
+}
+
+TEST_F(ChartDefaultsRules, OneKeyThatCantBeKeptIsTheOnlyOneListed) {
+  const std::string folder = "c:\\" + std::string(60, 'x');
+  home.files().MakeFolder(folder);
+  typed.CompFile = folder + "\\ALODB.WDT";
+  home.files().WriteAll(typed.CompFile, "");
+  EXPECT_EQ(SaveChartDefaults(ini, home.files(), dialogs, typed, settings), DefaultsSaved::kAll);
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].text, "; CompFile");
+  EXPECT_EQ(Osc("FillIn"), "False");
 }
 
 // ---- Overlays

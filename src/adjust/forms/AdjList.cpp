@@ -211,19 +211,24 @@ bool AdjList::MayReplace() {
 }
 
 bool AdjList::Save() {
-  if (!ss1_->EndEdit() || !MayReplace()) return false;
-  return Tell([this] {
-    const auto held = services_.files.lock().Hold();
-    WriteAdjustList(services_.files, folder_, rows_);
-    stamp_ = services_.files.Stamp(AdjustListPath(folder_));
-    changed_ = false;
-  });
+  if (!ss1_->EndEdit()) return false;
+  bool saved = false;
+  return Tell([&] {
+           const auto held = services_.files.lock().Hold();
+           if (!MayReplace()) return;
+           WriteAdjustList(services_.files, folder_, rows_);
+           stamp_ = services_.files.Stamp(AdjustListPath(folder_));
+           changed_ = false;
+           saved = true;
+         }) &&
+         saved;
 }
 
 void AdjList::RemoveMarked() {
-  if (!ss1_->EndEdit() || !MayReplace()) return;
+  if (!ss1_->EndEdit()) return;
   Tell([this] {
     const auto held = services_.files.lock().Hold();
+    if (!MayReplace()) return;
     AdjustRows left = rows_;
     RemoveDone(left);
     WriteAdjustList(services_.files, folder_, left);
@@ -235,11 +240,13 @@ void AdjList::RemoveMarked() {
 }
 
 void AdjList::Make() {
-  if (panel_->running() || !ss1_->EndEdit() || !MayReplace()) return;
-  made_ = true;
+  if (panel_->running() || !ss1_->EndEdit()) return;
   AdjustResult result;
-  services_.dialogs.SetBusy(true);
   Tell([&] {
+    const auto held = services_.files.lock().Hold();
+    if (!MayReplace()) return;
+    made_ = true;
+    services_.dialogs.SetBusy(true);
     panel_->Run({}, [&](Progress& progress) {
       result = MakeAdjustments({.files = services_.files,
                                 .settings = services_.settings,
@@ -252,11 +259,12 @@ void AdjList::Make() {
                                     }},
                                rows_, folder_);
     });
+    stamp_ = services_.files.Stamp(AdjustListPath(folder_));
   });
+  if (!made_) return;
   services_.dialogs.SetBusy(false);
   ShowRows();
   if (!result.begun) return;
-  stamp_ = services_.files.Stamp(AdjustListPath(folder_));
   changed_ = false;
   if (services_.adjusted) services_.adjusted();
   if (const std::string text = FailuresText(result); !text.empty())

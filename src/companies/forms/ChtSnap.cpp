@@ -217,6 +217,7 @@ void ChtSnap::AddMenu() {
 
 void ChtSnap::ChooseList(int list) {
   try {
+    stamp_ = StampOf(list);
     rows_ = ReadSnapshot(services_.snapshot.files, services_.snapshot.paths.SystemPath, list);
   } catch (const RunTimeError& e) {
     services_.snapshot.dialogs.Message(e.what(), kSnapshotTitle);
@@ -230,10 +231,21 @@ void ChtSnap::ChooseList(int list) {
   ShowState();
 }
 
+FileStamp ChtSnap::StampOf(int list) const {
+  return services_.snapshot.files.Stamp(SnapshotFile(services_.snapshot.paths.SystemPath, list));
+}
+
 bool ChtSnap::Save() {
   if (!ss1_->EndEdit() || !ss2_->EndEdit()) return false;
+  const Files& files = services_.snapshot.files;
   try {
-    SaveSnapshot(services_.snapshot.files, services_.snapshot.paths.SystemPath, list_, rows_);
+    const auto held = files.lock().Hold();
+    if (StampOf(list_) != stamp_ &&
+        services_.snapshot.dialogs.Ask(kListChangedOutside, kSnapshotTitle, Buttons::kYesNo) !=
+            Answer::kYes)
+      return false;
+    SaveSnapshot(files, services_.snapshot.paths.SystemPath, list_, rows_);
+    stamp_ = StampOf(list_);
     changed_ = false;
     return true;
   } catch (const RunTimeError& e) {
@@ -275,6 +287,7 @@ void ChtSnap::MoveTo(int list) {
   try {
     const auto& [files, system] = std::pair<const Files&, const std::string&>(
         services_.snapshot.files, services_.snapshot.paths.SystemPath);
+    const auto held = files.lock().Hold();  // from what is read to what is saved
     std::vector<SnapshotRow> there = ReadSnapshot(files, system, list);
     if (there.size() + size_t(block.count()) > kMostSnapshotRows) {
       dialogs.Message(kTooManyRows, kSnapshotTitle);

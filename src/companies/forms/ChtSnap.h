@@ -38,6 +38,8 @@ class ChtSnap : public QDialog {
                  const char* name);
   void AddMenu();
   void ChooseList(int list);
+  FileStamp StampOf(int list) const;
+  // Asks where another program changed the list since it was shown.
   bool Save();
   bool AskToSave();  // false: the user stays
   void Add();
@@ -58,6 +60,7 @@ class ChtSnap : public QDialog {
   QLabel *label1_, *label2_;
   WorkPanel* panel_;
   int list_ = 1;
+  FileStamp stamp_;  // of the list as it was read
   bool changed_ = false;
 };
 

@@ -5,6 +5,7 @@
 #include <QVBoxLayout>
 
 #include "base/runtime_error.h"
+#include "lists/chart_list.h"
 #include "lists/forms/list_box.h"
 #include "platform/dialogs.h"
 #include "platform/qt/form_parts.h"
@@ -43,7 +44,10 @@ IndClass::IndClass(const Files& files, Dialogs& dialogs, const std::string& syst
       source_(std::make_unique<Source>()) {
   setObjectName("IndClass");
   setWindowTitle(kTitle);
-  TellErrors(dialogs_, kTitle, [&] { source_->rows = ReadIndustryClasses(files_, systemPath_); });
+  TellErrors(dialogs_, kTitle, [&] {
+    stamp_ = files_.Stamp(IndustryClassFile(systemPath_));
+    source_->rows = ReadIndustryClasses(files_, systemPath_);
+  });
 
   grid_ = new Grid(*source_,
                    {.dialogs = dialogs_,
@@ -115,7 +119,12 @@ void IndClass::reject() {
   if (!grid_->EndEdit()) return;
   if (changed_) {
     try {
-      WriteIndustryClasses(files_, systemPath_, source_->rows);
+      const auto held = files_.lock().Hold();
+      const Answer answer = files_.Stamp(IndustryClassFile(systemPath_)) == stamp_
+                                ? Answer::kYes
+                                : dialogs_.Ask(kListChangedOutside, kTitle, Buttons::kYesNoCancel);
+      if (answer == Answer::kCancel) return;
+      if (answer == Answer::kYes) WriteIndustryClasses(files_, systemPath_, source_->rows);
     } catch (const RunTimeError& e) {
       const std::string text = std::string(e.what()) + "\nClose without saving ?";
       if (dialogs_.Ask(text, kTitle, Buttons::kYesNo) != Answer::kYes) return;

@@ -28,7 +28,8 @@ class IndClass : public QDialog {
   // Asks the user for that size over a form, for the entry "Display".
   std::function<int(QWidget* over)> changeSize = {};
 
-  // A changed table is saved first.
+  // A changed table is saved first; where another program changed it since, the user is asked, and
+  // No closes without saving.
   void reject() override;
 
  private:
@@ -41,6 +42,7 @@ class IndClass : public QDialog {
   const std::string systemPath_;
   std::unique_ptr<Source> source_;
   Grid* grid_;
+  FileStamp stamp_;  // of the table as it was read
   bool changed_ = false;
 };
 

@@ -238,6 +238,25 @@ TEST_F(ChtSnapTest, ARowMovesToAnotherList) {
   On<QComboBox>("Combo1")->setCurrentIndex(2);
 }
 
+TEST_F(ChtSnapTest, AListThatAnotherProgramChangedIsSavedOverOnlyWhenTheUserSaysSo) {
+  const std::string list = "drive_c/korawin/Snapshot.Dat";
+  Open();
+  Entry("csAdd");
+  TypeKeys("cba");
+  QTest::keyClick(QApplication::focusWidget(), Qt::Key_Return);
+  home.Put(list, "NAB,S,,,\r\n");
+  dialogs.answers = {Answer::kNo, Answer::kYes};
+  Entry("smSave");
+  ExpectSaid("The list was changed by another program. Save over these changes ?",
+             "Current Snapshot");
+  EXPECT_EQ(home.Get(list), "NAB,S,,,\r\n");
+  Entry("smSave");
+  EXPECT_EQ(home.Get(list), "BHP,S,100,8,0.5\r\nXAO,I,,,\r\nCBA,S,,,\r\n");
+  const size_t asked = dialogs.said.size();
+  Entry("smSave");
+  EXPECT_EQ(dialogs.said.size(), asked) << "its own save is no change of another program";
+}
+
 TEST_F(ChtSnapTest, AChangedListAsksBeforeItIsLeft) {
   Open();
   Entry("csAdd");

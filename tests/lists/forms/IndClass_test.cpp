@@ -3,6 +3,7 @@
 #include <QAction>
 #include <QTableView>
 
+#include "lists/chart_list.h"
 #include "tests/support/qt/list_form_fixture.h"
 
 namespace kora::test {
@@ -43,6 +44,33 @@ TEST_F(IndClassTest, AnUnchangedTableIsNotWritten) {
   home.Put(kHost, "another program's");
   QTest::keyClick(form.get(), Qt::Key_Escape);
   EXPECT_EQ(home.Get(kHost), "another program's");
+}
+
+TEST_F(IndClassTest, ATableThatAnotherProgramChangedIsSavedOverOnlyWhenTheUserSaysSo) {
+  const std::string theirs = "010,Gold\r\n099,Odds\r\n";
+  Open();
+  Entry("icAddRow");
+  TypeKeys("9");
+  QTest::keyClick(QApplication::focusWidget(), Qt::Key_Return);
+  home.Put(kHost, theirs);
+  dialogs.answers = {Answer::kCancel};
+  Entry("icSave");
+  ExpectSaid(std::string(kListChangedOutside), "Industry Classification");
+  EXPECT_TRUE(form->isVisible());
+  EXPECT_EQ(home.Get(kHost), theirs);
+  dialogs.answers = {Answer::kNo};
+  Entry("icSave");
+  EXPECT_FALSE(form->isVisible());
+  EXPECT_EQ(home.Get(kHost), theirs);
+
+  Open();
+  Entry("icAddRow");
+  TypeKeys("9");
+  QTest::keyClick(QApplication::focusWidget(), Qt::Key_Return);
+  home.Put(kHost, "");
+  dialogs.answers = {Answer::kYes};
+  Entry("icSave");
+  EXPECT_EQ(home.Get(kHost), theirs + "009,\r\n");
 }
 
 TEST_F(IndClassTest, LettersInAnIdAreRefused) {
