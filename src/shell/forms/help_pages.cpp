@@ -7,9 +7,7 @@ namespace {
 
 constexpr const char* kFirstPage = "index.html";
 
-}  // namespace
-
-QString HelpPageOf(const QString& form) {
+const QHash<QString, QString>& Pages() {
   static const QHash<QString, QString> pages{
       {"Main", "start.html"},
       {"FirstStart", "start.html"},
@@ -89,9 +87,19 @@ QString HelpPageOf(const QString& form) {
       {"TextFull", "maintenance.html"},
       {"TxtData", "maintenance.html"},
   };
-  return pages.value(form, kFirstPage);
+  return pages;
 }
 
+}  // namespace
+
+QString HelpPageOf(const QString& form) { return Pages().value(form, kFirstPage); }
+
 bool HasHelpPage(const QString& form) { return HelpPageOf(form) != kFirstPage; }
+
+QStringList FormsOfTheGuide() {
+  QStringList forms = Pages().keys();
+  forms.sort();
+  return forms;
+}
 
 }  // namespace kora

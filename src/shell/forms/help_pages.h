@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QString>
+#include <QStringList>
 
 namespace kora {
 
@@ -8,5 +9,7 @@ namespace kora {
 // ("charts.html#keys"); the first page for a form that has none.
 QString HelpPageOf(const QString& form);
 bool HasHelpPage(const QString& form);
+// The forms that have one, by name.
+QStringList FormsOfTheGuide();
 
 }  // namespace kora
