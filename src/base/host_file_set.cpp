@@ -15,6 +15,11 @@ namespace {
 constexpr int kMostTemporaries = 100;
 constexpr int kManyFiles = 16;
 
+// What stands behind a file's name beside it: new bytes, a number and "~" behind it, and what gave way.
+constexpr std::string_view kTemporaryEnd = ".tmp", kAsideEnd = ".old~";
+
+std::string AsideOf(const std::string& path) { return path + std::string(kAsideEnd); }
+
 std::string_view NameOf(std::string_view host) { return host.substr(host.rfind('/') + 1); }
 
 // What stands at `host`.
@@ -54,7 +59,7 @@ std::unique_ptr<HostFile> OpenNew(Io& io, const std::string& host) {
 
 std::unique_ptr<HostFile> OpenTemporary(Io& io, const std::string& host, std::string& temporary) {
   for (int n = 0; n <= kMostTemporaries; ++n) {
-    temporary = host + ".tmp" + (n == 0 ? "" : std::to_string(n)) + "~";
+    temporary = host + std::string(kTemporaryEnd) + (n == 0 ? "" : std::to_string(n)) + "~";
     if (auto file = OpenNew(io, temporary)) return file;
     if (!IsLeftOver(io, temporary)) continue;
     io.Remove(temporary);
@@ -89,6 +94,19 @@ struct Pending {
   HostStatus before;  // of `path`
 };
 
+// True where the files beside are those that a set makes. What has others is no journal of a set, and
+// could name any file of the machine to be taken away.
+bool IsOfASet(const Pending& step) {
+  const std::string& kept = step.kind == 'R' ? step.to : step.path;
+  if (step.aside != AsideOf(kept)) return false;
+  if (step.kind != 'W') return step.kind == 'D' || step.kind == 'R';
+  std::string_view end = step.temporary;
+  if (!end.starts_with(step.path) || !end.ends_with('~')) return false;
+  end.remove_prefix(step.path.size());
+  return end.starts_with(kTemporaryEnd) &&
+         end.find_first_not_of("0123456789", kTemporaryEnd.size()) == end.size() - 1;
+}
+
 // Nothing for a journal that was cut short, or is none.
 std::optional<std::vector<Pending>> ReadJournal(Io& io, const std::string& journal) {
   constexpr size_t kFields = 8;
@@ -111,6 +129,7 @@ std::optional<std::vector<Pending>> ReadJournal(Io& io, const std::string& journ
     number(i + 5, step.before.id);
     number(i + 6, step.before.size);
     number(i + 7, step.before.modified);
+    if (!IsOfASet(step)) return std::nullopt;
     steps.push_back(std::move(step));
   }
   return steps;
@@ -153,20 +172,20 @@ void HostFileSet::Write(std::string path, std::string bytes) {
 HostStatus HostFileSet::AddWrite(std::string path, std::string bytes) {
   Step step{.kind = Kind::kWrite, .path = io_.LinkTarget(path), .bytes = std::move(bytes)};
   const HostStatus old = RefuseUnlessReplaceable(io_, step.path);
-  step.aside = step.path + ".old~";
+  step.aside = AsideOf(step.path);
   steps_.push_back(std::move(step));
   return old;
 }
 
 void HostFileSet::Remove(std::string path) {
   RefuseUnlessReplaceable(io_, path);
-  std::string aside = path + ".old~";
+  std::string aside = AsideOf(path);
   steps_.push_back({.kind = Kind::kRemove, .path = std::move(path), .aside = std::move(aside)});
 }
 
 void HostFileSet::Rename(std::string from, std::string to) {
   if (from != to) RefuseUnlessReplaceable(io_, to);
-  std::string aside = to + ".old~";
+  std::string aside = AsideOf(to);
   steps_.push_back({.kind = Kind::kRename,
                     .path = std::move(from),
                     .to = std::move(to),

@@ -206,6 +206,41 @@ TEST(FileSetTest, AJournalCutShortOrOfRubbishIsClearedAwayAndChangesNothing) {
   }
 }
 
+// Who is given a folder of data is given its journal too.
+TEST(FileSetTest, AJournalThatNamesOtherFilesThanASetMakesBesideTakesNoneAway) {
+  TempHome home;
+  const auto lay = [&] {
+    home.Put("drive_c/a", "old");
+    home.Put("drive_c/a.tmp~", "new");
+    home.Put("mine", "kept");
+    home.Put("mine.tmp~", "kept");
+  };
+  const std::string path = home.path() + "/drive_c/a", mine = home.path() + "/mine";
+  const auto finish = [&](const std::string& kind, const std::string& temporary,
+                          const std::string& aside) {
+    lay();
+    std::string journal;
+    for (const std::string& field :
+         {std::string("KORA set 1"), kind, path, std::string(), temporary, aside, std::string("0"),
+          std::string("0"), std::string("0"), std::string("whole")})
+      journal += field + '\0';
+    home.Put("Kora.set~", journal);
+    { const auto held = home.files().lock().Hold(); }
+    EXPECT_FALSE(home.Exists("Kora.set~"));
+    return home.Get("drive_c/a");
+  };
+  for (const std::string& temporary : {mine, mine + ".tmp~", path + ".tmp",
+                                       path + ".tmp/../../mine~", path + "~", std::string()}) {
+    EXPECT_EQ(finish("W", temporary, path + ".old~"), "old") << temporary;
+    EXPECT_EQ(home.Get("mine") + home.Get("mine.tmp~"), "keptkept") << temporary;
+  }
+  for (const std::string& kind : {"W", "D", "R", "x", ""}) {
+    EXPECT_EQ(finish(kind, path + ".tmp~", mine), "old") << kind;
+    EXPECT_EQ(home.Get("mine"), "kept") << kind;
+  }
+  EXPECT_EQ(finish("W", path + ".tmp~", path + ".old~"), "new");
+}
+
 TEST(FileSetTest, AFileThatCameInThePlaceOfAMovedOneIsNotMovedAgain) {
   TempHome home;
   home.Put("drive_c/a", "old");

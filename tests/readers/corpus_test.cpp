@@ -42,7 +42,7 @@ TEST_P(CorpusTest, HoldsWhatItPromises) {
 
 INSTANTIATE_TEST_SUITE_P(Readers, CorpusTest,
                          ::testing::ValuesIn(Readers().begin(), Readers().end()),
-                         [](const auto& info) { return std::string(info.param.name); });
+                         [](const auto& each) { return std::string(each.param.name); });
 
 TEST(CorpusFolderTest, EachFolderAndEachDictionaryIsAReaders) {
   std::uintmax_t bytes = 0;

@@ -54,4 +54,4 @@ TEST_P(MutationTest, HoldsWhatItPromises) {
 
 INSTANTIATE_TEST_SUITE_P(Readers, MutationTest,
                          ::testing::ValuesIn(Readers().begin(), Readers().end()),
-                         [](const auto& info) { return std::string(info.param.name); });
+                         [](const auto& each) { return std::string(each.param.name); });
