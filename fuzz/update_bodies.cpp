@@ -356,6 +356,7 @@ void ReadJournalsBody(std::string_view bytes) {
     Promise(!home.io.Status("home/Kora.set~").exists, "a set is finished once");
     return;
   }
+  const auto before = home.io.Store();
   // A journal that is none is no journal; one with the right end is what it says.
   home.Put("Update.Jnl", input.Rest());
   UpdateReport report;
@@ -382,6 +383,15 @@ void ReadJournalsBody(std::string_view bytes) {
     UpdateJournal(home.files, home.system).Finish(report, inHand);
   });
   report.Text();
+  // Besides the journal and the entry, whose name tells that it was taken, prices and names alone.
+  const auto after = home.io.Store();
+  for (const auto& [path, stored] : after) {
+    const auto old = before.find(path);
+    if (old != before.end() && old->second == stored) continue;
+    Promise(EndsNoCase(path, ".WDT") || EndsNoCase(path, "/Names.dat") ||
+                EndsNoCase(path, "/Update.Jnl") || path.ends_with('X'),
+            "an update's journal changes what an update does");
+  }
 }
 
 }  // namespace kora::test

@@ -1,5 +1,6 @@
 #include "update/update_journal.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cstring>
 
@@ -91,6 +92,14 @@ DayProgress ReadNote(std::string_view note) {
   return day;
 }
 
+// The files that an update changes, whatever their folders. A journal with others is none of an
+// update's.
+bool IsOfAnUpdate(const EditJournal& journal) {
+  return std::all_of(journal.edits.begin(), journal.edits.end(), [](const FileEdit& edit) {
+    return EndsNoCase(edit.path, ".WDT") || EqualNoCase(FileNameOf(edit.path), "Names.dat");
+  });
+}
+
 }  // namespace
 
 TakenFile IdentityOf(const std::string& path, std::string_view text) {
@@ -106,7 +115,7 @@ UpdateJournal::UpdateJournal(const Files& files, const std::string& systemPath)
 std::string UpdateJournal::Finish(UpdateReport& report, std::string& inHand) {
   progress = {};
   const auto journal = ReadEditJournal(files_, path_);
-  if (!journal) return {};
+  if (!journal || !IsOfAnUpdate(*journal)) return {};
   progress = ReadNote(journal->note);
   onDisk_ = true;
   const bool whole = progress.leaving != DayProgress::kStays;

@@ -408,6 +408,25 @@ TEST_F(FaultTest, HalfWrittenRecordsOfAPowerCutAreWrittenAgain) {
   }
 }
 
+// Who is given a folder of data is given its journal too.
+TEST_F(FaultTest, AJournalThatChangesOtherFilesThanAnUpdateDoesCountsAsNone) {
+  for (const std::string& path :
+       {"c:\\korawin\\mine.txt", "c:\\mine\\xNames.dat", "c:\\.WDT\\mine"}) {
+    Lay([this] { LayAppend(); });
+    home.files().MakeFolder("c:\\mine");
+    home.files().MakeFolder("c:\\.WDT");
+    FileEdit edit;
+    edit.path = path;
+    edit.existed = false;
+    edit.changes.push_back({0, "", "foreign"});
+    WriteEditJournal(home.files(), kSystem + "Update.Jnl", "Entry=\r\nLeaving=0\r\n",
+                     std::vector{edit});
+    EXPECT_EQ(Update(), UpdateEnd::kUpdated) << path;
+    EXPECT_FALSE(home.files().CheckFile(path)) << path;
+    EXPECT_FALSE(home.Exists(kJournal)) << path;
+  }
+}
+
 TEST_F(FaultTest, AJournalThatIsCutShortOrDamagedCountsAsNone) {
   Lay([this] { LayAppend(); });
   ASSERT_TRUE(RunKilledAt(7));
