@@ -61,7 +61,10 @@ void ReadSettingsBody(std::string_view bytes) {
     PrintSetupFrom(s, session.printer);
     PrintedLineWidth(s);
     ChartDefaults typed = DefaultsFromSettings(s);
-    SaveChartDefaults(session.ini, session.files, session.dialogs, typed, session.settings);
+    {
+      const SettingsFile::Batch batch(session.ini);  // sixty writes are one
+      SaveChartDefaults(session.ini, session.files, session.dialogs, typed, session.settings);
+    }
     UpdateChoiceOf(s.download);
     FormatToStore(s.download.InternetDLfmt);
     WizardTicks(session.ini);

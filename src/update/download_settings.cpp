@@ -236,7 +236,7 @@ std::vector<UpdateRow> ReadUpdateList(const Files& files, const std::string& sys
   while (lines.Next(line)) {
     const auto fields = Split(line, ',');
     UpdateRow row;
-    row.code = UCase(Trim(fields[0]));
+    row.code = FromAnsi(UCase(Trim(fields[0])));
     if (row.code.empty()) continue;
     if (rows.size() == kMostUpdateRows) throw RunTimeError(kOutOfMemory);
     if (fields.size() > 1) {

@@ -85,7 +85,7 @@ bool SaveServiceChoice(const ServiceChoice& choice, SettingsFile& ini, DownloadS
 // ---- Which securities an update takes: Update.Lst of the program folder
 
 struct UpdateRow {
-  std::string code;  // upper case
+  std::string code;  // upper case, UTF-8
   std::int16_t category = 0;
   std::string name;  // UTF-8
 };

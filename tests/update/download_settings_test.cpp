@@ -252,6 +252,10 @@ TEST_F(DownloadSettingsTest, TextsCannotBreakTheListsLines) {
   const auto rows = ReadUpdateList(home.files(), kSystem);
   ASSERT_EQ(rows.size(), 2u);
   EXPECT_EQ(rows[1].name, "Smith, Jones");
+  EXPECT_EQ(rows[1].code, "C\xC3\xA9");
+  const std::string once = home.Get(kHostSystem + "Update.Lst");
+  EXPECT_TRUE(Save(rows, choice));
+  EXPECT_EQ(home.Get(kHostSystem + "Update.Lst"), once);
 }
 
 TEST_F(DownloadSettingsTest, AHugeUpdateListIsRefused) {
