@@ -6,6 +6,7 @@
 #include "chart/script_player.h"
 #include "chart/script_reading.h"
 #include "chartwindow/tools/saved_marks.h"
+#include "fuzz/drawing.h"
 #include "fuzz/readers.h"
 #include "fuzz/small_home.h"
 #include "indicators/oscillators.h"
@@ -64,6 +65,36 @@ bool IsLong(std::string_view script) { return script.size() > 20'000; }
 
 }  // namespace
 
+void DrawChart(SmallHome& home, const Settings& settings, const ChartRequest& request, bool slow,
+               bool plays) {
+  ChartColours colours{};
+  LoadColours(home.files, home.system, "Black", colours);
+  CheckedSurface price(638, 452), panel(638, 144);
+  ChartScript script;
+  ChartServices services{
+      home.files,     home.dialogs, settings.paths,
+      settings.fonts, colours,      price,
+      &panel,         &script,      PriceOverlays(request.Ma1On, settings.osc.MMASet)};
+  services.overlays.push_back(SavedMarksOverlay(home.files, settings.paths.ChartMiscPath));
+  Composition chart;
+  home.dialogs.said.clear();
+  if (!ComposeChart(services, request, chart)) {
+    Promise(!home.dialogs.said.empty(), "a chart that fails is told");
+    return;
+  }
+  if (!request.OscName.empty()) {
+    OscHost host{home.files, home.dialogs, settings, colours, request,
+                 chart,      price,        panel,    &script};
+    host.OscCode = request.OscName;
+    host.SlowStochastic = slow;
+    ShowOscillatorPanel(host);
+  }
+  if (!plays) return;
+  CheckedSurface again(638, 600);
+  Promise(PlayChartScript(script.text(), again, settings.fonts, colours),
+          "a chart that was drawn can be played");
+}
+
 void ReadScriptBody(std::string_view bytes) {
   LineReader lines(bytes);
   std::string_view line;
@@ -119,8 +150,6 @@ void DrawPricesBody(std::string_view bytes) {
   const auto before = home.io.Store();
   Settings settings = ChartDefaults();
   settings.osc.BCCalTp = settings.osc.LCalTp = settings.osc.VCalTp = (switches & 1) != 0;
-  ChartColours colours{};
-  LoadColours(home.files, home.system, "Black", colours);
 
   ChartRequest request = RequestFromSettings(settings);
   request.Name = NewNameRec("ORE");
@@ -142,7 +171,7 @@ void DrawPricesBody(std::string_view bytes) {
   request.ColourMarks = request.OutsideMarks = (switches & 64) != 0;
   request.Legible = (switches & 128) != 0;
   if (kind & 16) {
-    request.Swing = SwingKind(kind >> 5);
+    request.Swing = SwingKind((kind >> 5) % 5);
     request.SwingSize = 3;
   }
   const auto oscillators = Oscillators();
@@ -150,30 +179,10 @@ void DrawPricesBody(std::string_view bytes) {
   if (at < oscillators.size() && request.ChartStyle != Style::kPointFigure)
     request.OscName = oscillators[at].code;
 
-  CheckedSurface price(638, 452), panel(638, 144);
-  ChartScript script;
-  ChartServices services{
-      home.files,     home.dialogs, settings.paths,
-      settings.fonts, colours,      price,
-      &panel,         &script,      PriceOverlays((switches & 4) != 0, settings.osc.MMASet)};
-  services.overlays.push_back(SavedMarksOverlay(home.files, settings.paths.ChartMiscPath));
-  Composition chart;
-  const bool drawn = ComposeChart(services, request, chart);
-  Promise(drawn || !home.dialogs.said.empty(), "a chart that fails is told");
-  home.OnlyChanged(before, {});
-  if (!drawn) return;
-  if (!request.OscName.empty()) {
-    OscHost host{home.files, home.dialogs, settings, colours, request,
-                 chart,      price,        panel,    &script};
-    host.OscCode = request.OscName;
-    host.SlowStochastic = (osc & 128) != 0;
-    ShowOscillatorPanel(host);
-  }
   // A script has no way to write the comma of a note.
-  if (input.Rest().find(',') != std::string_view::npos) return;
-  CheckedSurface again(638, 600);
-  Promise(PlayChartScript(script.text(), again, settings.fonts, colours),
-          "a chart that was drawn can be played");
+  const bool plays = input.Rest().find(',') == std::string_view::npos;
+  DrawChart(home, settings, request, (osc & 128) != 0, plays);
+  home.OnlyChanged(before, {});
 }
 
 // A byte of choices, and the price file.

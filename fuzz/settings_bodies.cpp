@@ -4,10 +4,12 @@
 #include "chart/chart_printing.h"
 #include "chart/chart_request.h"
 #include "chart/chart_state.h"
+#include "fuzz/drawing.h"
 #include "fuzz/readers.h"
 #include "fuzz/small_home.h"
 #include "indicators/chart_defaults.h"
 #include "indicators/multi_osc.h"
+#include "indicators/oscillators.h"
 #include "lists/chart_list.h"
 #include "looks/colours.h"
 #include "looks/look_settings.h"
@@ -40,6 +42,20 @@ void CheckPut(const Files& files, const std::string& path, std::string_view sect
   if (!same) Promise(fresh.GetSetting("Charts", "Type") == other, "other keys stay");
 }
 
+// A chart by these settings, and one of the oscillators.
+void DrawWith(SmallHome& home, Settings settings, size_t which) {
+  SetDefaultPaths(settings.paths, "c:");
+  ChartRequest request = RequestFromSettings(settings);
+  request.Name = NewNameRec("ORE");
+  request.ChartStyle = ParseStyle(settings.charts.Type).value_or(Style::kBar);
+  request.ChartPeriod = ParsePeriod(settings.charts.Period).value_or(Period::kDaily);
+  request.BandKind = settings.charts.Bands;
+  const auto oscillators = Oscillators();
+  if (request.ChartStyle != Style::kPointFigure)
+    request.OscName = oscillators[which % oscillators.size()].code;
+  DrawChart(home, settings, request, settings.charts.AvCalc, false);
+}
+
 }  // namespace
 
 // The file, and behind a mark a section, a key and a value to write.
@@ -51,12 +67,14 @@ void ReadSettingsBody(std::string_view bytes) {
   home.io.confined = false;  // folders are where the settings say
   home.io.Put("home/Kora.ini", text);
   home.io.Put("home/KoraUser.ini", text);
+  home.PutMarket();
+  home.Put("data/ORE.WDT", ManyDays());
   const FixedClock clock;
   Session session("home", home.dialogs, home.io, clock);
   if (ReadAllSettings(session, "XT N", false)) {
     const Settings& s = session.settings;
     Promise(s.Zoom >= kLeastZoom && s.Zoom <= kMostZoom, "a zoom in its range");
-    RequestFromSettings(s);
+    DrawWith(home, s, text.size());
     MakeRequest(session.charts, s, NewNameRec("ORE"));
     PrintSetupFrom(s, session.printer);
     PrintedLineWidth(s);

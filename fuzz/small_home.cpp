@@ -1,5 +1,6 @@
 #include "fuzz/small_home.h"
 
+#include "base/dates.h"
 #include "base/text.h"
 #include "store/name_rec.h"
 #include "store/price_rec.h"
@@ -69,6 +70,17 @@ void SmallHome::PutMarket() {
       {Day("19980910", 1, 100), Day("19980911", 1.25f, 200, 0.8f), Day("19980914", 1.3f, 300)});
   add("OREWAA", kShare, 84, {Day("19980914", 0.2f, 50)});
   Put("data/Names.dat", BytesOf(names));
+}
+
+std::string ManyDays() {
+  std::vector<PriceRec> days;
+  CalendarDate date{1998, 1, 5};
+  for (int n = 0; n < 60; ++n) {
+    days.push_back(
+        Day(FormatFileDate(date), 2 + 0.1f * float(n % 7) - 0.05f * float(n % 11), 100 * (n % 13)));
+    date = DateOfDayNumber(DayNumber(date) + (n % 5 == 4 ? 3 : 1));
+  }
+  return BytesOf(days);
 }
 
 void SmallHome::OnlyChanged(const std::map<std::string, std::string>& before,

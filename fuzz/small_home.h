@@ -63,6 +63,9 @@ struct SmallHome {
                    const std::vector<std::string>& names) const;
 };
 
+// Sixty days of prices that go up and down.
+std::string ManyDays();
+
 struct FixedClock : Clock {
   CalendarDate Today() const override { return {1998, 9, 20}; }
 };
