@@ -22,6 +22,14 @@
 namespace kora::test {
 namespace {
 
+// A value as a key keeps it.
+std::string OnOneLine(std::string_view value) {
+  std::string out(value);
+  for (char& c : out)
+    if (c == '\r' || c == '\n' || c == '\0') c = ' ';
+  return std::string(Trim(out));
+}
+
 // The value of a key comes back, and nothing else has changed.
 void CheckPut(const Files& files, const std::string& path, std::string_view section,
               std::string_view key, std::string_view value) {
@@ -31,10 +39,7 @@ void CheckPut(const Files& files, const std::string& path, std::string_view sect
     Promise(SettingsFile(files, path).GetSetting("Charts", "Type") == other, "no key has changed");
     return;
   }
-  std::string wanted(value);
-  for (char& c : wanted)
-    if (c == '\r' || c == '\n' || c == '\0') c = ' ';
-  wanted = Trim(wanted);
+  std::string wanted = OnOneLine(value);
   if (wanted.empty()) wanted = kUnknown;
   const SettingsFile fresh(files, path);
   Promise(fresh.GetSetting(section, key) == wanted, "what was written reads back");
@@ -92,7 +97,8 @@ void ReadSettingsBody(std::string_view bytes) {
     again.paths.WindowsPath = "C:\\WINDOWS\\";
     SettingsFile fresh(session.files, session.ini.path());
     Promise(ReadSettings(fresh, session.files, session.dialogs, again), "settings read back");
-    if (WhyNotKept(data).empty()) Promise(again.paths.CurrentDataPath == data, "folders read back");
+    if (WhyNotKept(data).empty())
+      Promise(again.paths.CurrentDataPath == OnOneLine(data), "folders read back");
   }
   for (const std::string& name : GetSubLists(session.user))
     Promise(!name.empty(), "a list has a name");
