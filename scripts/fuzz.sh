@@ -56,7 +56,7 @@ for reader in "$@"; do
   for more in "$root/fuzz/corpus/$reader" "$work/seeds/$reader"; do
     [[ ! -d "$more" ]] || folders+=("$more")
   done
-  options=(-print_funcs=0 -entropic=0 -timeout=25 -rss_limit_mb=2048 -print_final_stats=1 -verbosity=1
+  options=(-print_funcs=0 -entropic=0 -len_control=10 -timeout=25 -rss_limit_mb=2048 -print_final_stats=1 -verbosity=1
     -max_len="$(longest_input "$reader")" -artifact_prefix="$work/found/$reader-")
   [[ ! -f "$root/fuzz/$reader.dict" ]] || options+=(-dict="$root/fuzz/$reader.dict")
   began="$(date +%s)" done=0 found=0
