@@ -3,6 +3,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QFileDialog>
+#include <QFileInfo>
 #include <QGridLayout>
 #include <QLabel>
 #include <QLineEdit>
@@ -13,6 +14,7 @@
 #include "base/text.h"
 #include "chart/forms/printer_list.h"
 #include "platform/qt/form_parts.h"
+#include "platform/qt/modal.h"
 #include "platform/qt/qt_printer.h"
 
 namespace kora {
@@ -89,10 +91,13 @@ void PrintKora::Browse() {
   if (choice_.pickPdf) {
     chosen = choice_.pickPdf(standing);
   } else {
-    const QString file = QFileDialog::getSaveFileName(
-        this, windowTitle(), QString::fromStdString(standing), "PDF files (*.pdf)", nullptr,
-        QFileDialog::DontConfirmOverwrite);
-    if (!file.isEmpty()) chosen = file.toStdString();
+    const QFileInfo file(QString::fromStdString(standing));
+    Modal<QFileDialog> dialog(this, windowTitle(), file.path(), "PDF files (*.pdf)");
+    dialog->setAcceptMode(QFileDialog::AcceptSave);
+    dialog->setOption(QFileDialog::DontConfirmOverwrite);  // the question is the form's own
+    dialog->selectFile(file.fileName());
+    if (dialog.Run() != QDialog::Accepted || dialog->selectedFiles().isEmpty()) return;
+    chosen = dialog->selectedFiles().first().toStdString();
   }
   if (!chosen) return;
   if (!EndsNoCase(*chosen, ".pdf")) *chosen += ".pdf";

@@ -35,6 +35,7 @@
 #include "chartwindow/forms/ZoomKora.h"
 #include "indicators/oscillators.h"
 #include "indicators/price_overlays.h"
+#include "platform/qt/modal.h"
 #include "platform/qt/picture.h"
 #include "platform/qt/to_qt.h"
 
@@ -701,29 +702,31 @@ void Chts::SaveAs() {
   if (s_.pickSaved) {
     path = s_.pickSaved(window_.SuggestedName());
   } else {
-    QFileDialog dialog(this, "Save Chart As ...");
-    dialog.setObjectName("SaveKora");
-    dialog.setAcceptMode(QFileDialog::AcceptSave);
-    dialog.setFileMode(QFileDialog::AnyFile);
-    dialog.setOption(QFileDialog::DontConfirmOverwrite);  // the question is the window's own
-    dialog.setNameFilters(
+    Modal<QFileDialog> dialog(this, "Save Chart As ...");
+    dialog->setObjectName("SaveKora");
+    dialog->setAcceptMode(QFileDialog::AcceptSave);
+    dialog->setFileMode(QFileDialog::AnyFile);
+    dialog->setOption(QFileDialog::DontConfirmOverwrite);  // the question is the window's own
+    dialog->setNameFilters(
         {"Saved charts (*.cht)", "Pictures (*.png)", "Drawings (*.svg)", "Documents (*.pdf)"});
-    dialog.setDefaultSuffix("cht");
-    QObject::connect(&dialog, &QFileDialog::filterSelected, &dialog, [&dialog](const QString& f) {
+    dialog->setDefaultSuffix("cht");
+    QObject::connect(&*dialog, &QFileDialog::filterSelected, &*dialog, [&dialog](const QString& f) {
       const QString ending = f.section("*.", 1).chopped(1);
-      dialog.setDefaultSuffix(ending);
-      if (dialog.selectedFiles().isEmpty()) return;
-      dialog.selectFile(QFileInfo(dialog.selectedFiles().first()).completeBaseName() + "." +
+      dialog->setDefaultSuffix(ending);
+      if (dialog->selectedFiles().isEmpty()) return;
+      dialog->selectFile(QFileInfo(dialog->selectedFiles().first()).completeBaseName() + "." +
                         ending);
     });
     try {
-      dialog.setDirectory(ToQt(s_.files.HostPath(paths.ChartSavePath)));
+      dialog->setDirectory(ToQt(s_.files.HostPath(paths.ChartSavePath)));
     } catch (const RunTimeError&) {
       // A folder that can't be one: the dialog opens where it likes.
     }
-    dialog.selectFile(ToQt(window_.SuggestedName()));
-    if (dialog.exec() == QDialog::Accepted && !dialog.selectedFiles().isEmpty())
-      path = s_.files.DosPath(dialog.selectedFiles().first().toStdString());
+    dialog->selectFile(ToQt(window_.SuggestedName()));
+    const auto result = dialog.Run();
+    if (!result) return;  // this window went with it
+    if (result == QDialog::Accepted && !dialog->selectedFiles().isEmpty())
+      path = s_.files.DosPath(dialog->selectedFiles().first().toStdString());
   }
   Do([&] {
     window_.SaveChartAs(path, [this](const std::string& file) { return MakePictureFile(file); });
@@ -754,9 +757,10 @@ void Chts::ShowSaved() {
       folder = ToQt(s_.files.HostPath(s_.settings.paths.ChartSavePath));
     } catch (const RunTimeError&) {
     }
-    const QString file =
-        QFileDialog::getOpenFileName(this, "Display Saved Chart", folder, "Saved charts (*.cht)");
-    if (!file.isEmpty()) path = s_.files.DosPath(file.toStdString());
+    Modal<QFileDialog> dialog(this, "Display Saved Chart", folder, "Saved charts (*.cht)");
+    dialog->setFileMode(QFileDialog::ExistingFile);
+    if (dialog.Run() != QDialog::Accepted || dialog->selectedFiles().isEmpty()) return;
+    path = s_.files.DosPath(dialog->selectedFiles().first().toStdString());
   }
   if (path) ShowSavedFile(*path);
 }
@@ -857,22 +861,23 @@ bool Chts::PictureEvent(PictureBox* picture, QEvent* event) {
 }
 
 TrendChoice Chts::PopUpTrend() {
-  QMenu menu(this);
-  menu.setObjectName("smTrend");
-  QAction* move = menu.addAction("&Move");
+  Modal<QMenu> menu(this);
+  menu->setObjectName("smTrend");
+  QAction* move = menu->addAction("&Move");
   move->setObjectName("smMove");
-  QAction* remove = menu.addAction("&Delete");
+  QAction* remove = menu->addAction("&Delete");
   remove->setObjectName("smDelete");
-  const QAction* chosen = menu.exec(QCursor::pos());
-  if (chosen == nullptr) return TrendChoice::kNothing;
-  return chosen == move ? TrendChoice::kMove : TrendChoice::kDelete;
+  const auto chosen = menu.Run(QCursor::pos());
+  if (!chosen || *chosen == nullptr) return TrendChoice::kNothing;
+  return *chosen == move ? TrendChoice::kMove : TrendChoice::kDelete;
 }
 
 void Chts::OpenZoom(const ZoomBox& box) {
   QWidget* over = s_.zoomOver ? s_.zoomOver() : this;
-  ZoomKora form({s_.dialogs, window_.Chart, window_.Request, s_.colours, s_.settings.fonts}, box,
-                over, this);
-  form.exec();
+  Modal<ZoomKora> form(
+      ZoomKoraServices{s_.dialogs, window_.Chart, window_.Request, s_.colours, s_.settings.fonts}, box,
+      over, this);
+  form.Run();
 }
 
 void Chts::OpenScroll() {
@@ -880,9 +885,8 @@ void Chts::OpenScroll() {
   bool ready = false;
   Do([&] { ready = scroll_.SetScrollBar(); });
   if (!ready) return;
-  const QPointer<Chts> alive(this);
-  KoraScroll(scroll_, this).exec();
-  if (alive) Do([this] { window_.Redraw(); });
+  Modal<KoraScroll> form(scroll_, this);
+  if (form.Run()) Do([this] { window_.Redraw(); });
 }
 
 bool Chts::FrameEvent(QEvent* event) {

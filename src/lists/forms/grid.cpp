@@ -17,6 +17,7 @@
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "platform/dialogs.h"
+#include "platform/qt/modal.h"
 #include "platform/qt/to_qt.h"
 #include "platform/settings_file.h"
 
@@ -46,6 +47,12 @@ QVariant Foreground(GridShade shade, const QPalette& colours) {
   if (shade == GridShade::kFaint) return colours.color(QPalette::Disabled, QPalette::Text);
   if (shade == GridShade::kFall) return IsDark(colours) ? QColor(255, 120, 110) : QColor(192, 0, 0);
   return {};
+}
+
+// What was pasted may be longer than any message.
+std::string ForMessage(const QString& text) {
+  constexpr qsizetype kLongest = 60;
+  return (text.size() > kLongest ? text.left(kLongest) + "..." : text).toStdString();
 }
 
 }  // namespace
@@ -620,7 +627,8 @@ void Grid::Paste() {
                    .match(wanted)
                    .hasMatch());
           const auto refused = fits ? source_.SetText(row, column, text)
-                                    : Refusal{"\"" + text + "\" can't stand in this column",
+                                    : Refusal{"\"" + ForMessage(wanted) +
+                                                  "\" can't stand in this column",
                                               ToQt(rule.heading).simplified().toStdString()};
           if (refused) {
             refusal = *refused;
@@ -650,12 +658,13 @@ void Grid::SaveCsv(const std::string& hostPath) const {
 
 void Grid::SaveAs() {
   if (!EndEdit()) return;
-  QFileDialog dialog(this, "Save As", {}, "Comma separated (*.csv);;All files (*)");
-  dialog.setObjectName("GridSaveDialog");
-  dialog.setAcceptMode(QFileDialog::AcceptSave);
-  dialog.setDefaultSuffix("csv");
-  if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty()) return;
-  const std::string path = dialog.selectedFiles().constFirst().toStdString();
+  Modal<QFileDialog> dialog(this, "Save As", QString(),
+                            "Comma separated (*.csv);;All files (*)");
+  dialog->setObjectName("GridSaveDialog");
+  dialog->setAcceptMode(QFileDialog::AcceptSave);
+  dialog->setDefaultSuffix("csv");
+  if (dialog.Run() != QDialog::Accepted || dialog->selectedFiles().isEmpty()) return;
+  const std::string path = dialog->selectedFiles().constFirst().toStdString();
   try {
     SaveCsv(path);
   } catch (const RunTimeError& e) {

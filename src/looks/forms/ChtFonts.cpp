@@ -8,6 +8,7 @@
 
 #include "base/numbers.h"
 #include "platform/qt/form_parts.h"
+#include "platform/qt/modal.h"
 
 namespace kora {
 namespace {
@@ -23,11 +24,10 @@ std::optional<FontChoice> PickFromPlatform(QWidget* over, const FontChoice& stan
   QFont font = over->font();
   if (!standing.name.empty()) font.setFamily(ToQt(standing.name));
   if (standing.points > 0) font.setPointSizeF(standing.points);
-  bool chosen = false;
-  font = QFontDialog::getFont(
-      &chosen, font, over, {},
-      printerFontsOnly ? QFontDialog::ScalableFonts : QFontDialog::FontDialogOptions());
-  if (!chosen) return std::nullopt;
+  Modal<QFontDialog> dialog(font, over);
+  if (printerFontsOnly) dialog->setOption(QFontDialog::ScalableFonts);
+  if (dialog.Run() != QDialog::Accepted) return std::nullopt;
+  font = dialog->selectedFont();
   return FontChoice{font.family().toStdString(), font.pointSizeF()};
 }
 

@@ -92,11 +92,12 @@ void EnterCode::ShowChoice() {
 }
 
 void EnterCode::CodeTyped() {
-  std::optional<size_t> moveTo;
-  if (selection_.Enter(getCode_->text().toStdString(), services_.dialogs, moveTo)) {
+  TellErrors(services_.dialogs, "Code Selection", [this] {
+    std::optional<size_t> moveTo;
+    if (!selection_.Enter(getCode_->text().toStdString(), services_.dialogs, moveTo)) return;
     if (moveTo) list1_->SelectOnly(*moveTo);
     ShowChoice();
-  }
+  });
   getCode_->selectAll();
 }
 

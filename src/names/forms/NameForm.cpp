@@ -10,6 +10,7 @@
 #include "base/runtime_error.h"
 #include "names/forms/ExMaster.h"
 #include "platform/qt/form_parts.h"
+#include "platform/qt/modal.h"
 #include "platform/qt/to_qt.h"
 
 namespace kora {
@@ -210,9 +211,9 @@ bool NameForm::Save() {
 
 void NameForm::UpdateFromMasterList() {
   Update([this] {
-    ExMaster form(this);
-    form.start = [&] { return editor_.UpdateNames(form.ticks()); };
-    form.exec();
+    Modal<ExMaster> form(this);
+    form->start = [&] { return editor_.UpdateNames(form->ticks()); };
+    form.Run();
   });
 }
 

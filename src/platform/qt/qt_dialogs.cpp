@@ -11,6 +11,7 @@
 #include <QStyle>
 #include <algorithm>
 
+#include "platform/qt/modal.h"
 #include "platform/qt/to_qt.h"
 
 namespace kora {
@@ -19,8 +20,12 @@ namespace {
 // What a dialog stands over, and gives the keyboard back to: the form that holds the others back,
 // which has just opened and may not be active yet.
 QWidget* Below() {
-  QWidget* modal = QApplication::activeModalWidget();
-  return modal ? modal : QApplication::activeWindow();
+  QWidget* form = QApplication::activeModalWidget();
+  if (!form) form = QApplication::activeWindow();
+  // A menu goes before what is said over it.
+  while (form && form->windowType() == Qt::Popup)
+    form = form->parentWidget() ? form->parentWidget()->window() : nullptr;
+  return form;
 }
 
 // A box that is answered, not kept: nothing to minimise or maximise.
@@ -69,15 +74,15 @@ class NormalPointer {
 class ProgressWindow : public Progress {
  public:
   explicit ProgressWindow(std::string_view title) {
-    window_.setObjectName("Progress");
-    window_.setWindowTitle(ToQt(title));
-    window_.setLabelText(ToQt(title));
-    window_.setRange(0, 1000);
-    window_.setWindowModality(Qt::ApplicationModal);
-    window_.setMinimumDuration(500);
-    window_.setAutoClose(false);
-    window_.setAutoReset(false);
-    window_.setValue(0);
+    window_->setObjectName("Progress");
+    window_->setWindowTitle(ToQt(title));
+    window_->setLabelText(ToQt(title));
+    window_->setRange(0, 1000);
+    window_->setWindowModality(Qt::ApplicationModal);
+    window_->setMinimumDuration(500);
+    window_->setAutoClose(false);
+    window_->setAutoReset(false);
+    window_->setValue(0);
     sincePaint_.start();
   }
 
@@ -87,16 +92,17 @@ class ProgressWindow : public Progress {
 
   bool Step(int done, int total) override {
     // The event queue costs more than most steps: it has its turn some thirty times a second.
-    if (done < total && sincePaint_.elapsed() < 30) return !window_.wasCanceled();
+    if (window_.Gone()) return false;
+    if (done < total && sincePaint_.elapsed() < 30) return !window_->wasCanceled();
     sincePaint_.restart();
-    if (!item_.empty()) window_.setLabelText(ToQt(item_));
-    window_.setValue(total > 0 ? int(1000.0 * done / total) : 1000);
+    if (!item_.empty()) window_->setLabelText(ToQt(item_));
+    window_->setValue(total > 0 ? int(1000.0 * done / total) : 1000);
     QCoreApplication::processEvents();
-    return !window_.wasCanceled();
+    return !window_.Gone() && !window_->wasCanceled();
   }
 
  private:
-  QProgressDialog window_{Below()};
+  Modal<QProgressDialog> window_{Below()};
   QElapsedTimer sincePaint_;
   std::string item_;
 };
@@ -111,30 +117,31 @@ void QtDialogs::Message(std::string_view text, std::string_view title) {
 
 Answer QtDialogs::Ask(std::string_view text, std::string_view title, Buttons buttons) {
   const NormalPointer pointer(busy_);
-  QMessageBox box(Below());
-  box.setObjectName("MessageBox");
-  box.setWindowFlags(kBoxFlags);
-  box.setWindowTitle(ToQt(title));
-  box.setTextFormat(Qt::PlainText);
-  box.setText(ToQt(text));
+  Modal<QMessageBox> box(Below());
+  box->setObjectName("MessageBox");
+  box->setWindowFlags(kBoxFlags);
+  box->setWindowTitle(ToQt(title));
+  box->setTextFormat(Qt::PlainText);
+  box->setText(ToQt(text));
   using B = QMessageBox;
   switch (buttons) {
-    case Buttons::kOk: box.setStandardButtons(B::Ok); break;
-    case Buttons::kOkCancel: box.setStandardButtons(B::Ok | B::Cancel); break;
-    case Buttons::kYesNo: box.setStandardButtons(B::Yes | B::No); break;
+    case Buttons::kOk: box->setStandardButtons(B::Ok); break;
+    case Buttons::kOkCancel: box->setStandardButtons(B::Ok | B::Cancel); break;
+    case Buttons::kYesNo: box->setStandardButtons(B::Yes | B::No); break;
     case Buttons::kNoYes:
-      box.setStandardButtons(B::Yes | B::No);
-      box.setDefaultButton(B::No);
+      box->setStandardButtons(B::Yes | B::No);
+      box->setDefaultButton(B::No);
       break;
-    case Buttons::kYesNoCancel: box.setStandardButtons(B::Yes | B::No | B::Cancel); break;
-    case Buttons::kRetryCancel: box.setStandardButtons(B::Retry | B::Cancel); break;
+    case Buttons::kYesNoCancel: box->setStandardButtons(B::Yes | B::No | B::Cancel); break;
+    case Buttons::kRetryCancel: box->setStandardButtons(B::Retry | B::Cancel); break;
   }
-  box.setIcon(buttons == Buttons::kOk ? B::Information : B::Question);
+  box->setIcon(buttons == Buttons::kOk ? B::Information : B::Question);
   const bool declines = buttons == Buttons::kYesNo || buttons == Buttons::kNoYes;
-  if (declines) box.setEscapeButton(B::No);
-  FitTitle(box);
-  KeepOffSplash(box);
-  switch (box.exec()) {
+  if (declines) box->setEscapeButton(B::No);
+  FitTitle(*box);
+  KeepOffSplash(*box);
+  // A box that went with its form was closed without a button.
+  switch (box.Run().value_or(B::NoButton)) {
     case B::Ok: return Answer::kOk;
     case B::Yes: return Answer::kYes;
     case B::No: return Answer::kNo;
@@ -146,15 +153,15 @@ Answer QtDialogs::Ask(std::string_view text, std::string_view title, Buttons but
 std::optional<std::string> QtDialogs::Prompt(std::string_view text, std::string_view title,
                                              std::string_view standing) {
   const NormalPointer pointer(busy_);
-  QInputDialog box(Below());
-  box.setObjectName("Prompt");
-  box.setWindowFlags(kBoxFlags);
-  box.setWindowTitle(ToQt(title));
-  box.setLabelText(ToQt(text));
-  box.setTextValue(ToQt(standing));
-  KeepOffSplash(box);
-  if (box.exec() != QDialog::Accepted) return std::nullopt;
-  const std::string answer = box.textValue().toStdString();
+  Modal<QInputDialog> box(Below());
+  box->setObjectName("Prompt");
+  box->setWindowFlags(kBoxFlags);
+  box->setWindowTitle(ToQt(title));
+  box->setLabelText(ToQt(text));
+  box->setTextValue(ToQt(standing));
+  KeepOffSplash(*box);
+  if (box.Run() != QDialog::Accepted) return std::nullopt;
+  const std::string answer = box->textValue().toStdString();
   if (answer.empty()) return std::nullopt;
   return answer;
 }

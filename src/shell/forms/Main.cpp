@@ -17,6 +17,7 @@
 #include "base/runtime_error.h"
 #include "base/version.h"
 #include "looks/forms/F1Size.h"
+#include "platform/qt/modal.h"
 #include "platform/qt/to_qt.h"
 #include "shell/forms/AbtKora.h"
 #include "shell/forms/HelpWindow.h"
@@ -386,12 +387,12 @@ void Main::AskPrinter() {
 }
 
 int Main::AskTableSize(QWidget* over) {
-  F1Size form({.ini = session_.ini,
-               .settings = session_.settings,
-               .dialogs = session_.dialogs,
-               .saved = {}},
-              over);
-  form.exec();
+  Modal<F1Size> form(LookServices{.ini = session_.ini,
+                                  .settings = session_.settings,
+                                  .dialogs = session_.dialogs,
+                                  .saved = {}},
+                     over);
+  form.Run();
   return session_.settings.Zoom;
 }
 

@@ -37,6 +37,7 @@
 #include "looks/forms/VHeight.h"
 #include "maintenance/forms/TxtData.h"
 #include "platform/qt/form_parts.h"
+#include "platform/qt/modal.h"
 #include "store/name_file.h"
 
 namespace kora {
@@ -324,9 +325,8 @@ void ChartDesk::CloseView() {
 }
 
 void ChartDesk::OpenMultiOsc() {
-  MultiOsc form({session_.user, session_.dialogs}, Over());
-  form.exec();
-  Refresh();
+  Modal<MultiOsc> form(MultiOscServices{session_.user, session_.dialogs}, Over());
+  if (form.Run()) Refresh();
 }
 
 void ChartDesk::PrintView() {

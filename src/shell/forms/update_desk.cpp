@@ -5,6 +5,7 @@
 #include "adjust/adjust_list.h"
 #include "adjust/bulletins.h"
 #include "base/text.h"
+#include "platform/qt/modal.h"
 #include "store/market_folders.h"
 #include "update/forms/DLList.h"
 #include "update/forms/ModDetails.h"
@@ -110,9 +111,8 @@ void UpdateDesk::OfferAdjustments() {
 
 bool UpdateDesk::OpenDestinations(QWidget* over) {
   const std::string before = session_.settings.paths.CurrentDataPath;
-  WMPath form(FormServices(), over);
-  form.exec();
-  return session_.settings.paths.CurrentDataPath != before;
+  Modal<WMPath> form(FormServices(), over);
+  return form.Run() && session_.settings.paths.CurrentDataPath != before;
 }
 
 }  // namespace kora

@@ -540,6 +540,17 @@ TEST_F(GridTest, APasteTakesNoTextThatCouldNotBeTyped) {
   EXPECT_EQ(dialogs.said.size(), 2u);
 }
 
+TEST_F(GridTest, ATextOfAnyLengthIsRefusedInAMessageThatFitsTheScreen) {
+  rows.rows = {{{"AAA"}}};
+  Make(rows, {{.heading = "Code", .limit = 6, .typing = "[A-Z]*"}});
+  Show();
+  grid->GoTo(0, 0);
+  QGuiApplication::clipboard()->setText(QString(33000, 'M'));
+  grid->Paste();
+  EXPECT_EQ(dialogs.said.back().text,
+            "\"" + std::string(60, 'M') + "...\" can't stand in this column");
+}
+
 TEST_F(GridTest, SavesAllRowsUnderTheirHeadings) {
   Three();
   rows.Set(0, 0, "A,\xC3\xA4");

@@ -54,6 +54,16 @@ TEST_F(EnterCodeTest, ATypedCodeMovesTheListAndItsTextIsSelected) {
   EXPECT_TRUE(viewed.empty());
 }
 
+TEST_F(EnterCodeTest, ACodeTypedWhenTheNameFileIsGoneIsTold) {
+  Open();
+  std::filesystem::remove(home.path() + "/drive_c/korawin/data/Names.dat");
+  Enter("GetCode", "BBB");
+  ASSERT_EQ(dialogs.said.size(), 1u);
+  EXPECT_EQ(dialogs.said[0].title, "Code Selection");
+  EXPECT_TRUE(dialogs.said[0].text.starts_with("There is an unexpected error number 53\n"))
+      << dialogs.said[0].text;
+}
+
 TEST_F(EnterCodeTest, TheFirstCodeIsTakenWhereTheListStands) {
   lastIndex = 2;
   Open();

@@ -1,4 +1,4 @@
-// kora_monkey [--events N] [--seed S] [--hangs SECONDS] [--log FILE]: uses the program with windows
+// kora_monkey [--events N] [--seed S] [--hangs SECONDS] [--log FILE] [--messages yes]: uses the program with windows
 // at random, and tells what should not be. Ends with 0 where nothing was found.
 //
 // The work is done by a second process, so that a crash of any kind is told with the events
@@ -41,6 +41,7 @@ struct Arguments {
   long events = 2000;
   std::uint64_t seed = 1;
   double hangs = 60;
+  bool messages = false;  // all that were told are listed
   std::string log;   // empty: in the folder of the run
   std::string work;  // the folder of the run; named for the second process alone
 };
@@ -142,7 +143,7 @@ ProgramArguments SomeArguments(Generator& generator, const std::string& home) {
   return arguments;
 }
 
-void TellCounts(const Monkey& monkey, int runs, int started, int browser) {
+void TellCounts(const Monkey& monkey, int runs, int started, int browser, bool messages) {
   const auto reached = [](const auto& counts) {
     return std::count_if(counts.begin(), counts.end(), [](const auto& c) { return c.second > 0; });
   };
@@ -164,6 +165,9 @@ void TellCounts(const Monkey& monkey, int runs, int started, int browser) {
   std::printf("forms opened: %zu of %zu, %zu with the system's own, %ld times\n", open, known,
               monkey.forms.size(), shown);
   std::printf("controls used: %zu\n", monkey.used.size());
+  if (messages)
+    for (const auto& [text, count] : monkey.messages)
+      std::printf("  told %ld times: %.300s\n", count, text.c_str());
   long told = 0;
   for (const auto& [text, count] : monkey.messages) told += count;
   std::printf("messages told: %ld, %zu different\n", told, monkey.messages.size());
@@ -216,7 +220,7 @@ int Use(const Arguments& a, int argc, char** argv) {
     }
     monkey.CheckNothingIsLeft();
   }
-  TellCounts(monkey, runs, processes.started, browser.asked);
+  TellCounts(monkey, runs, processes.started, browser.asked, a.messages);
   app.monkey = nullptr;
   return monkey.failures() == 0 ? 0 : 1;
 }
@@ -265,6 +269,7 @@ int LookAfter(Arguments a, const char* self) {
     if (chdir((work + "/user").c_str()) != 0) _exit(127);
     const std::string words[] = {"--events", Number(double(a.events)), "--seed", std::to_string(a.seed),
                                  "--hangs",  Number(a.hangs),          "--log",  a.log,
+                                 "--messages", a.messages ? "yes" : "no",
                                  "--work",   work};
     std::vector<char*> argv{const_cast<char*>(self)};
     for (const std::string& word : words) argv.push_back(const_cast<char*>(word.c_str()));
@@ -298,9 +303,10 @@ int main(int argc, char** argv) {
     else if (name == "--seed") a.seed = std::stoull(value);
     else if (name == "--hangs") a.hangs = std::stod(value);
     else if (name == "--log") a.log = value;
+    else if (name == "--messages") a.messages = value == "yes";
     else if (name == "--work") a.work = value;
     else {
-      std::fprintf(stderr, "kora_monkey [--events N] [--seed S] [--hangs SECONDS] [--log FILE]\n");
+      std::fprintf(stderr, "kora_monkey [--events N] [--seed S] [--hangs SECONDS] [--log FILE] [--messages yes]\n");
       return 2;
     }
   }

@@ -1,26 +1,42 @@
 #include "tests/monkey/driver/messages.h"
 
-#include <regex>
+#include <charconv>
+#include <string_view>
+#include <system_error>
+#include <vector>
 
 #include "base/runtime_error.h"
 
 namespace kora::monkey {
+namespace {
 
-std::set<int> NumbersOfGuide(const std::string& html) {
-  std::set<int> numbers;
-  const size_t from = html.find("<table id=\"numbers\">");
-  if (from == html.npos) return numbers;
-  const std::string table = html.substr(from, html.find("</table>", from) - from);
-  static const std::regex row("<tr><td>([0-9]+)</td>");
-  for (std::sregex_iterator it(table.begin(), table.end(), row), end; it != end; ++it)
-    numbers.insert(std::stoi((*it)[1]));
+
+// The numbers that stand behind `before`, blanks between.
+std::vector<int> NumbersBehind(std::string_view text, std::string_view before) {
+  std::vector<int> numbers;
+  for (size_t at = text.find(before); at != text.npos; at = text.find(before, at)) {
+    at += before.size();
+    while (at < text.size() && text[at] == ' ') ++at;
+    int number = 0;
+    const char* end = text.data() + text.size();
+    if (std::from_chars(text.data() + at, end, number).ec == std::errc()) numbers.push_back(number);
+  }
   return numbers;
 }
 
+}  // namespace
+
+std::set<int> NumbersOfGuide(const std::string& html) {
+  const size_t from = html.find("<table id=\"numbers\">");
+  if (from == html.npos) return {};
+  const auto rows = NumbersBehind(html.substr(from, html.find("</table>", from) - from), "<tr><td>");
+  return {rows.begin(), rows.end()};
+}
+
 std::string FaultOfMessage(const std::string& text, const std::set<int>& numbers) {
-  static const std::regex told("[Ee]rror (?:No\\.|number) *(-?[0-9]+)");
-  for (std::sregex_iterator it(text.begin(), text.end(), told), end; it != end; ++it)
-    if (!numbers.contains(std::stoi((*it)[1]))) return "the guide lacks the number";
+  for (const char* before : {"rror No.", "rror number"})
+    for (const int number : NumbersBehind(text, before))
+      if (!numbers.contains(number)) return "the guide lacks the number";
   // The standing text of a number, wherever it stands in a message.
   for (int number = 1; number < 1000; ++number) {
     const std::string standing = ErrorText(number);

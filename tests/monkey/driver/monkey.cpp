@@ -233,15 +233,15 @@ void Monkey::timerEvent(QTimerEvent* event) {
   levels_.pop_back();
 }
 
-// A button that was pressed by its letter comes up again a little later, and does its work then.
+// A button that was pressed by its letter comes up again a tenth of a second later, and does its
+// work then. Another that stays down is one that holds a menu open.
 bool Monkey::ButtonGoesDown() {
   if (!keyed_) return false;
-  for (QWidget* window : QApplication::topLevelWidgets())
-    for (auto* button : window->findChildren<QAbstractButton*>())
-      if (button->isDown() && button->isVisible() && !button->isChecked() && !(buttons_ & Qt::LeftButton))
-        return ++waits_ < 100000;
+  if (!QApplication::activePopupWidget() && pressed_.elapsed() < 300)
+    for (QWidget* window : QApplication::topLevelWidgets())
+      for (auto* button : window->findChildren<QAbstractButton*>())
+        if (button->isDown() && button->isVisible() && !button->inherits("QToolButton")) return true;
   keyed_ = false;
-  waits_ = 0;
   return false;
 }
 
@@ -628,6 +628,7 @@ void Monkey::Key(int key, Qt::KeyboardModifiers keys, const QString& text) {
     if (!window()) return;
   }
   keyed_ = true;
+  pressed_.start();
   qt_handleKeyEvent(window(), QEvent::KeyPress, key, keys, text);
   if (window()) qt_handleKeyEvent(window(), QEvent::KeyRelease, key, keys, text);
 }

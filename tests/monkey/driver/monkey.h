@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QElapsedTimer>
 #include <QObject>
 #include <QPoint>
 #include <QPointer>
@@ -132,7 +133,7 @@ class Monkey : public QObject {
   int chartDeeds_ = 0;       // events that the chart gets, after a tool was taken up
   Qt::MouseButtons buttons_;
   bool keyed_ = false;
-  int waits_ = 0;
+  QElapsedTimer pressed_;
   QPointer<QWidget> held_;  // where the button went down and was not let go
   unsigned long time_ = 1000;
 };

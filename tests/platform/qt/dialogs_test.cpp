@@ -2,7 +2,9 @@
 
 #include <QApplication>
 #include <QInputDialog>
+#include <QMenu>
 #include <QMessageBox>
+#include <QPointer>
 #include <QProgressDialog>
 #include <QPushButton>
 #include <QTest>
@@ -143,6 +145,49 @@ TEST(QtDialogs, ProgressTellsWhenTheUserStops) {
   ASSERT_NE(window, nullptr);
   window->cancel();
   EXPECT_FALSE(progress->Step(2, 10));
+}
+
+// What stands on a form and closes it may have more to say.
+TEST(QtDialogs, ABoxThatGoesWithItsFormHasNoAnswer) {
+  QtDialogs dialogs;
+  QPointer<QDialog> form;
+  const auto open = [&form] {
+    form = new QDialog;
+    form->open();
+  };
+  const auto goes = [&form](QWidget&) { delete form; };
+  open();
+  OnNext<QMessageBox>(goes);
+  EXPECT_EQ(dialogs.Ask("Save ?", "Data", Buttons::kYesNoCancel), Answer::kCancel);
+  EXPECT_TRUE(form.isNull());
+  open();
+  OnNext<QMessageBox>(goes);
+  EXPECT_EQ(dialogs.Ask("Save ?", "Data", Buttons::kYesNo), Answer::kNo);
+  open();
+  OnNext<QInputDialog>(goes);
+  EXPECT_EQ(dialogs.Prompt("Name", "Data", "A"), std::nullopt);
+  open();
+  const auto progress = dialogs.StartProgress("Working");
+  delete form;
+  EXPECT_FALSE(progress->Step(1, 10));
+}
+
+TEST(QtDialogs, AMessageOverAMenuStandsOverTheFormOfTheMenu) {
+  QWidget window;
+  window.show();
+  ASSERT_TRUE(QTest::qWaitForWindowExposed(&window));
+  QMenu menu(&window);
+  menu.addAction("Entry");
+  menu.popup({});
+  QApplication::setActiveWindow(&menu);
+  QtDialogs dialogs;
+  const QWidget* over = nullptr;
+  OnNext<QMessageBox>([&](QMessageBox& box) {
+    over = box.parentWidget();
+    box.reject();
+  });
+  dialogs.Message("There is none", "Charts");
+  EXPECT_EQ(over, &window);
 }
 
 TEST(QtDialogs, YieldHandlesWhatWaits) {
