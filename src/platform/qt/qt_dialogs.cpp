@@ -10,6 +10,7 @@
 #include <QSpacerItem>
 #include <QStyle>
 #include <algorithm>
+#include <utility>
 
 #include "platform/qt/modal.h"
 #include "platform/qt/to_qt.h"
@@ -71,6 +72,41 @@ class NormalPointer {
   bool busy_;
 };
 
+int heldBack = 0;
+
+// From a box's answer until whoever asked goes on. Keys and clicks that were made ahead would reach
+// the form below, whose routine still waits, and could take it down: they are passed over.
+class Hold : public QObject {
+ public:
+  explicit Hold(QDialog& box) {
+    connect(&box, &QDialog::finished, this, [this] {
+      if (std::exchange(on_, true)) return;
+      ++heldBack;
+      qApp->installEventFilter(this);
+    });
+  }
+  ~Hold() override {
+    if (on_) --heldBack;
+  }
+
+ protected:
+  bool eventFilter(QObject*, QEvent* event) override {
+    switch (event->type()) {
+      case QEvent::KeyPress:
+      case QEvent::ShortcutOverride:
+      case QEvent::Shortcut:
+      case QEvent::MouseButtonPress:
+      case QEvent::MouseButtonDblClick:
+      case QEvent::Wheel:
+      case QEvent::ContextMenu: return true;
+      default: return false;
+    }
+  }
+
+ private:
+  bool on_ = false;
+};
+
 class ProgressWindow : public Progress {
  public:
   explicit ProgressWindow(std::string_view title) {
@@ -109,6 +145,8 @@ class ProgressWindow : public Progress {
 
 }  // namespace
 
+bool InputIsHeldBack() { return heldBack > 0; }
+
 QtDialogs::~QtDialogs() { SetBusy(false); }
 
 void QtDialogs::Message(std::string_view text, std::string_view title) {
@@ -140,6 +178,7 @@ Answer QtDialogs::Ask(std::string_view text, std::string_view title, Buttons but
   if (declines) box->setEscapeButton(B::No);
   FitTitle(*box);
   KeepOffSplash(*box);
+  const Hold hold(*box);
   // A box that went with its form was closed without a button.
   switch (box.Run().value_or(B::NoButton)) {
     case B::Ok: return Answer::kOk;
@@ -160,6 +199,7 @@ std::optional<std::string> QtDialogs::Prompt(std::string_view text, std::string_
   box->setLabelText(ToQt(text));
   box->setTextValue(ToQt(standing));
   KeepOffSplash(*box);
+  const Hold hold(*box);
   if (box.Run() != QDialog::Accepted) return std::nullopt;
   const std::string answer = box->textValue().toStdString();
   if (answer.empty()) return std::nullopt;

@@ -23,4 +23,7 @@ class QtDialogs : public Dialogs {
   bool busy_ = false;
 };
 
+// While a box was answered and the routine that asked has not gone on yet: keys and clicks do nothing.
+bool InputIsHeldBack();
+
 }  // namespace kora

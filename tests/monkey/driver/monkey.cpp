@@ -28,6 +28,7 @@
 #include <algorithm>
 #include <array>
 
+#include "platform/qt/qt_dialogs.h"
 #include "tests/monkey/driver/messages.h"
 
 namespace kora::monkey {
@@ -223,7 +224,7 @@ void Monkey::timerEvent(QTimerEvent* event) {
     return;
   }
   if (Windows().empty()) return;  // the splash
-  if (ButtonGoesDown()) return;
+  if (ButtonGoesDown() || InputIsHeldBack()) return;
   levels_.push_back(level);
   watchdog_.NextEvent();
   ++number_;

@@ -172,6 +172,26 @@ TEST(QtDialogs, ABoxThatGoesWithItsFormHasNoAnswer) {
   EXPECT_FALSE(progress->Step(1, 10));
 }
 
+TEST(QtDialogs, WhatIsClickedAheadOfAnAnswerDoesNotReachTheFormBelow) {
+  QDialog form;
+  QPushButton button("Close", &form);
+  int clicks = 0;
+  QObject::connect(&button, &QPushButton::clicked, [&clicks] { ++clicks; });
+  form.show();
+  ASSERT_TRUE(QTest::qWaitForWindowExposed(&form));
+  QtDialogs dialogs;
+  OnNext<QMessageBox>([&](QMessageBox& box) {
+    QTest::keyClick(&box, Qt::Key_Return);
+    QTest::mouseClick(form.windowHandle(), Qt::LeftButton, {}, button.geometry().center());
+    EXPECT_TRUE(InputIsHeldBack());
+  });
+  EXPECT_EQ(dialogs.Ask("Go on ?", "Data", Buttons::kOkCancel), Answer::kOk);
+  EXPECT_EQ(clicks, 0);
+  EXPECT_FALSE(InputIsHeldBack());
+  QTest::mouseClick(form.windowHandle(), Qt::LeftButton, {}, button.geometry().center());
+  EXPECT_EQ(clicks, 1);
+}
+
 TEST(QtDialogs, AMessageOverAMenuStandsOverTheFormOfTheMenu) {
   QWidget window;
   window.show();
