@@ -112,6 +112,9 @@ Main::Main(Session& session, std::string commandLine)
   PathsChanged();
 }
 
+// The guide is a window by itself, and goes when the program does.
+Main::~Main() { delete help_; }
+
 void Main::BuildMenu() {
   std::map<std::string_view, QMenu*> menus;
   const auto entries = MainMenu();

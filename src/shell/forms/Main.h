@@ -29,6 +29,7 @@ class Main : public QMainWindow {
  public:
   // `commandLine`: the words the program was started with, for reading the settings again.
   Main(Session& session, std::string commandLine);
+  ~Main() override;
 
   // What an entry does. An entry without it is there and greyed.
   void SetOpener(const std::string& entry, std::function<void()> open);

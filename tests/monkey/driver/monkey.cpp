@@ -206,11 +206,16 @@ bool Monkey::eventFilter(QObject* object, QEvent* event) {
 // ---- One event after the other
 
 // A timer does not run within its own event: each event has one of its own, so that modal forms go
-// on getting theirs.
+// on getting theirs. It begins a round later, when what the windows do to one another by the event
+// before is done: this platform makes menus active, which others do not.
+void Monkey::customEvent(QEvent*) {
+  if (running_) startTimer(0);
+}
+
 void Monkey::timerEvent(QTimerEvent* event) {
   killTimer(event->timerId());
   if (!running_) return;
-  startTimer(0);
+  QCoreApplication::postEvent(this, new QEvent(QEvent::User));
   if (ended_) return;
   const int level = QThread::currentThread()->loopLevel();
   if (!levels_.empty() && levels_.back() >= level) {

@@ -66,6 +66,7 @@ class Monkey : public QObject {
 
  protected:
   void timerEvent(QTimerEvent* event) override;
+  void customEvent(QEvent* event) override;
   bool eventFilter(QObject* object, QEvent* event) override;
 
  private:
