@@ -270,8 +270,9 @@ void ChtSel::OpenIndClass() {
 }
 
 void ChtSel::ClickFinishDate() {
+  const QPointer<ChtSel> there(this);
   services_.selection.ClickFinishDate(services_.openFinDate);
-  Refresh();
+  if (there) Refresh();
 }
 
 bool ChtSel::FieldEnter(QObject* field) {

@@ -522,7 +522,8 @@ void Chts::RefreshTitle() {
 
 template <typename Deed>
 void Chts::Do(Deed deed) {
-  if (busy_) return;
+  // Drawing lets events through: one of them may be that which takes a closed window down.
+  if (busy_ || closed_) return;
   busy_ = true;
   // A deed may run a form, and the window may be gone when that one is left.
   const QPointer<Chts> window(this);
@@ -1038,7 +1039,9 @@ void Chts::closeEvent(QCloseEvent* event) {
     return;
   }
   QMainWindow::closeEvent(event);
-  if (event->isAccepted() && s_.closed) s_.closed();
+  if (!event->isAccepted()) return;
+  closed_ = true;
+  if (s_.closed) s_.closed();
 }
 
 }  // namespace kora

@@ -146,6 +146,7 @@ class Chts : public QMainWindow {
   int wheelAngle_ = 0;  // turned and not used yet
   bool twoPanes_ = false;
   bool busy_ = false;
+  bool closed_ = false;
   bool sizeWaits_ = false;
   bool frameStood_ = false;  // it was shown where it is
   QPoint frameGrip_;
