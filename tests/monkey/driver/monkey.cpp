@@ -110,11 +110,13 @@ void Monkey::BeginRun(const std::string& home, std::function<QWidget*()> mainWin
   held_ = nullptr;
   chartDeeds_ = 0;
   Note("a run begins");
-  startTimer(0);
+  timer_ = startTimer(0);
 }
 
 void Monkey::EndRun() {
   running_ = false;
+  QCoreApplication::removePostedEvents(this);
+  if (timer_) killTimer(std::exchange(timer_, 0));
   if (QWidget* main = mainWindow_()) {
     // Forms that were left stay with the main window until it goes: some are kept on purpose.
     std::map<std::string, int> kept;
@@ -209,11 +211,12 @@ bool Monkey::eventFilter(QObject* object, QEvent* event) {
 // on getting theirs. It begins a round later, when what the windows do to one another by the event
 // before is done: this platform makes menus active, which others do not.
 void Monkey::customEvent(QEvent*) {
-  if (running_) startTimer(0);
+  if (running_) timer_ = startTimer(0);
 }
 
 void Monkey::timerEvent(QTimerEvent* event) {
   killTimer(event->timerId());
+  timer_ = 0;
   if (!running_) return;
   QCoreApplication::postEvent(this, new QEvent(QEvent::User));
   if (ended_) return;
@@ -230,13 +233,17 @@ void Monkey::timerEvent(QTimerEvent* event) {
   }
   if (Windows().empty()) return;  // the splash
   if (ButtonGoesDown() || InputIsHeldBack()) return;
+  // What no form caught passes through here.
+  struct Under {
+    std::vector<int>& levels;
+    ~Under() { levels.pop_back(); }
+  } under{levels_};
   levels_.push_back(level);
   watchdog_.NextEvent();
   ++number_;
   workDeed_ = Chance(generator_, 0.3) ? 1 + Below(generator_, 8) : 0;
   if (number_ % 25 == 0) Look();
   Act();
-  levels_.pop_back();
 }
 
 // A button that was pressed by its letter comes up again a tenth of a second later, and does its

@@ -133,6 +133,7 @@ class Monkey : public QObject {
   int workDeed_ = 0;         // what the work of this event is to suffer
   int chartDeeds_ = 0;       // events that the chart gets, after a tool was taken up
   Qt::MouseButtons buttons_;
+  int timer_ = 0;  // of the next event
   bool keyed_ = false;
   QElapsedTimer pressed_;
   QPointer<QWidget> held_;  // where the button went down and was not let go
