@@ -3,7 +3,11 @@
 #include <gtest/gtest.h>
 
 #include <cstdio>
+#include <fstream>
+#include <iterator>
 
+#include "base/runtime_error.h"
+#include "tests/monkey/driver/messages.h"
 #include "tests/support/places.h"
 #include "tests/support/program.h"
 
@@ -21,6 +25,34 @@ std::string LineOf(const std::string& text, const std::string& begin) {
 }
 
 }  // namespace
+
+TEST(MonkeyTest, AMessageOfAnErrorMustHaveItsNumberInTheGuide) {
+  using kora::monkey::FaultOfMessage;
+  const std::set<int> numbers = kora::monkey::NumbersOfGuide(
+      "<td>9</td><table id=\"numbers\"><tr><td>6</td></tr><tr><td>53</td></tr></table><tr><td>7</td>");
+  EXPECT_EQ(numbers, (std::set<int>{6, 53}));
+  EXPECT_EQ(FaultOfMessage("There is an unexpected error No. 53\nFile not found", numbers), "");
+  EXPECT_EQ(FaultOfMessage("Code not found", numbers), "");
+  EXPECT_NE(FaultOfMessage("There is an unexpected error number 76", numbers), "");
+  EXPECT_NE(FaultOfMessage("Unexpected Error No. -1", numbers), "");
+  EXPECT_NE(FaultOfMessage("Disk full", numbers), "");
+  EXPECT_NE(FaultOfMessage("vector::_M_range_check", numbers), "");
+  EXPECT_NE(FaultOfMessage("Application-defined error", numbers), "");
+  EXPECT_NE(FaultOfMessage(" ", numbers), "");
+}
+
+TEST(MonkeyTest, TheGuideExplainsEveryNumber) {
+  std::ifstream in(kora::SourceDir() + "/docs/guide/messages.html");
+  const std::string page{std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+  const auto numbers = kora::monkey::NumbersOfGuide(page);
+  for (int number = 1; number < 1000; ++number) {
+    const std::string text = kora::ErrorText(number);
+    EXPECT_EQ(numbers.contains(number), text != kora::ErrorText(0)) << number;
+    if (numbers.contains(number)) {
+      EXPECT_NE(page.find("<td>" + text + "</td>"), page.npos) << text;
+    }
+  }
+}
 
 TEST(MonkeyTest, AProgramThatIsUsedAtRandomNeitherDiesNorHangsNorLeavesItsHome) {
   const ProgramResult run = Monkey("1500", "7");
