@@ -357,6 +357,7 @@ void ReadJournalsBody(std::string_view bytes) {
     return;
   }
   const auto before = home.io.Store();
+  home.io.confined = false;  // the folders of prices may be on any drive
   // A journal that is none is no journal; one with the right end is what it says.
   home.Put("Update.Jnl", input.Rest());
   UpdateReport report;

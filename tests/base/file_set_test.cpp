@@ -234,7 +234,7 @@ TEST(FileSetTest, AJournalThatNamesOtherFilesThanASetMakesBesideTakesNoneAway) {
     EXPECT_EQ(finish("W", temporary, path + ".old~"), "old") << temporary;
     EXPECT_EQ(home.Get("mine") + home.Get("mine.tmp~"), "keptkept") << temporary;
   }
-  for (const std::string& kind : {"W", "D", "R", "x", ""}) {
+  for (const std::string kind : {"W", "D", "R", "x", ""}) {
     EXPECT_EQ(finish(kind, path + ".tmp~", mine), "old") << kind;
     EXPECT_EQ(home.Get("mine"), "kept") << kind;
   }

@@ -410,7 +410,7 @@ TEST_F(FaultTest, HalfWrittenRecordsOfAPowerCutAreWrittenAgain) {
 
 // Who is given a folder of data is given its journal too.
 TEST_F(FaultTest, AJournalThatChangesOtherFilesThanAnUpdateDoesCountsAsNone) {
-  for (const std::string& path :
+  for (const std::string path :
        {"c:\\korawin\\mine.txt", "c:\\mine\\xNames.dat", "c:\\.WDT\\mine"}) {
     Lay([this] { LayAppend(); });
     home.files().MakeFolder("c:\\mine");
