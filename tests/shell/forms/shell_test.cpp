@@ -797,28 +797,6 @@ TEST_F(ChtsTest, AChartThatFailsIsNotToldAgainAtEverySize) {
   EXPECT_GT(Ink(), 1000);
 }
 
-// As the program's own dialogs do: what waits is handled between the steps of a drawing.
-class YieldingDialogs : public test::ScriptedDialogs {
- public:
-  void Yield() override { QCoreApplication::processEvents(); }
-};
-
-TEST_F(ChtsTest, AWindowThatIsClosedBeforeItsNewSizeIsDrawnIsNotDrawn) {
-  YieldingDialogs yielding;
-  session = std::make_unique<Session>(home.path(), yielding);
-  const QPointer<Chts> charts = &OpenCharts();
-  charts->parentWidget()->resize(charts->parentWidget()->size() / 2);
-  QCoreApplication::sendPostedEvents();
-  charts->parentWidget()->close();
-  ASSERT_FALSE(charts.isNull());
-  // Only a loop takes down what was closed.
-  QEventLoop loop;
-  QTimer::singleShot(20, &loop, [&loop] { loop.quit(); });
-  loop.exec();
-  EXPECT_TRUE(charts.isNull());
-  form.reset();
-}
-
 class LogoTest : public test::FormTest {
  protected:
   Logo& Make() {
