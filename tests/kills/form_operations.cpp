@@ -36,8 +36,6 @@
 namespace kora::test {
 namespace {
 
-const std::string kData = "drive_c/korawin/data/";
-const std::string kMisc = "drive_c/korawin/chtmisc/";
 const std::string kOther = "drive_c/korawin/other/";
 
 NameEditor Editor(Session& s) {

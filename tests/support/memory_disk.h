@@ -14,8 +14,7 @@ namespace kora::test {
 // What stands on a disk: a value, cheap to copy, since files share their bytes until they change.
 struct Disk {
   struct Bytes {
-    explicit Bytes(std::string text)
-        : text(std::move(text)), hash(std::hash<std::string>{}(this->text)) {}
+    explicit Bytes(std::string all) : text(std::move(all)), hash(std::hash<std::string>{}(text)) {}
     const std::string text;
     const size_t hash;
   };
