@@ -143,8 +143,8 @@ std::string Candidates(const CLI::App& app, const std::vector<std::string>& word
     for (const CLI::Option* option : place.at->get_options())
       if (option->get_positional()) positionals.push_back(option);
     // The last one may take as many as there are.
-    if (!positionals.empty() && (place.positional < positionals.size() ||
-                                 positionals.back()->get_expected_max() > 1))
+    if (!positionals.empty() &&
+        (place.positional < positionals.size() || positionals.back()->get_expected_max() > 1))
       AddValues(out, *positionals[std::min(place.positional, positionals.size() - 1)], place, io);
   }
   return out.text();

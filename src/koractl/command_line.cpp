@@ -28,8 +28,9 @@ int RunKoractl(int argc, const char* const* argv, Io& io) {
   CommandLine line;
   line.io = &io;
   app.require_subcommand(1);
-  app.set_version_flag("--version", [] { return VersionLine("koractl"); },
-                       "Print the version and the revision, and exit");
+  app.set_version_flag(
+      "--version", [] { return VersionLine("koractl"); },
+      "Print the version and the revision, and exit");
   app.fallthrough();
   app.add_option("--home", line.home,
                  "Folder of the installation (default: KORA_HOME, else kora under the user's "

@@ -94,8 +94,8 @@ TEST_F(Installed, WithoutTheModulePicturesAreRefusedAndScriptsAreNot) {
   TempHome home;
   home.Put("a.cht", "L,10,10,300,200,255\r\n");
   ASSERT_EQ(Koractl({"--home", home.path(), "init"}).code, 0);
-  const ProgramResult result = Koractl({"--home", home.path(), "play", home.path() + "/a.cht",
-                                        "--out", home.path() + "/a.png"});
+  const ProgramResult result = Koractl(
+      {"--home", home.path(), "play", home.path() + "/a.cht", "--out", home.path() + "/a.png"});
   EXPECT_EQ(result.code, 1);
   EXPECT_NE(result.err.find("koractl_pictures.so can't be loaded, it is not there"),
             std::string::npos)
@@ -172,11 +172,11 @@ TEST_F(Installed, TheManualPagesAreQuiet) {
   if (tool.empty() || Tool("groff").empty()) GTEST_SKIP() << "man or groff is not installed";
   for (const char* page : {"kora", "koractl"})
     for (const char* width : {"80", "120"}) {
-      const ProgramResult result = RunProgram(
-          tool,
-          {"--warnings", "-E", "UTF-8", "-l", "-Tutf8", "-Z",
-           Path("share/man/man1/" + std::string(page) + ".1")},
-          {"MANWIDTH=" + std::string(width), "LC_ALL=C.UTF-8", "MANROFFSEQ="});
+      const ProgramResult result =
+          RunProgram(tool,
+                     {"--warnings", "-E", "UTF-8", "-l", "-Tutf8", "-Z",
+                      Path("share/man/man1/" + std::string(page) + ".1")},
+                     {"MANWIDTH=" + std::string(width), "LC_ALL=C.UTF-8", "MANROFFSEQ="});
       EXPECT_EQ(result.code, 0) << page;
       EXPECT_EQ(result.err, "") << page;
       EXPECT_GT(result.out.size(), 1000u) << page;
@@ -226,10 +226,10 @@ TEST_F(Installed, TheManualPageOfKoraHasEveryOptionAndWord) {
 }
 
 TEST_F(Installed, TheShellsFindTheirCompletions) {
-  for (const char* file : {"bash-completion/completions/kora", "bash-completion/completions/koractl",
-                           "zsh/site-functions/_kora", "zsh/site-functions/_koractl",
-                           "fish/vendor_completions.d/kora.fish",
-                           "fish/vendor_completions.d/koractl.fish"})
+  for (const char* file :
+       {"bash-completion/completions/kora", "bash-completion/completions/koractl",
+        "zsh/site-functions/_kora", "zsh/site-functions/_koractl",
+        "fish/vendor_completions.d/kora.fish", "fish/vendor_completions.d/koractl.fish"})
     EXPECT_TRUE(fs::exists(Path(std::string("share/") + file))) << file;
 }
 

@@ -114,7 +114,7 @@ TEST(Completion, FilesAndFoldersAreTheShells) {
 TEST(Completion, BashListsEveryCommand) {
   const std::string run = WithPath("source '" + Script("koractl.bash") +
                                    "'; COMP_WORDS=(koractl \"$@\"); COMP_CWORD=$#; _koractl; "
-                          "printf '%s\\n' \"${COMPREPLY[@]}\"");
+                                   "printf '%s\\n' \"${COMPREPLY[@]}\"");
   const std::string bash = Shell("bash");
   if (bash.empty()) GTEST_SKIP() << "bash is not installed";
   const ProgramResult all = RunProgram(bash, {"--norc", "-c", run, "bash", ""});
@@ -122,8 +122,8 @@ TEST(Completion, BashListsEveryCommand) {
   EXPECT_EQ(FirstColumn(all.out), Commands());
   TempHome home;
   home.Put("my chart.cht", "");
-  const ProgramResult file = RunProgram(
-      bash, {"--norc", "-c", "cd '" + home.path() + "'; " + run, "bash", "play", "my"});
+  const ProgramResult file =
+      RunProgram(bash, {"--norc", "-c", "cd '" + home.path() + "'; " + run, "bash", "play", "my"});
   EXPECT_EQ(file.out, "my chart.cht\n");
 }
 
@@ -134,7 +134,8 @@ TEST(Completion, ZshListsEveryCommand) {
   const std::string run = WithPath(
       "_describe() { local c; for c in ${(P)2}; do print -r -- \"${c%%:*}\"; done }; "
       "_files() { print files \"$@\" }; "
-      "words=(koractl \"$@\"); CURRENT=$#words; source '" + Script("_koractl") + "'");
+      "words=(koractl \"$@\"); CURRENT=$#words; source '" +
+      Script("_koractl") + "'");
   const ProgramResult all = RunProgram(zsh, {"-f", "-c", run, "zsh", ""});
   EXPECT_EQ(all.err, "");
   EXPECT_EQ(FirstColumn(all.out), Commands());
@@ -173,13 +174,13 @@ TEST(Completion, OfKoraHasItsOptionsWordsAndCharts) {
   TempHome home;
   for (const char* file : {"a.cht", "b.png", "folder/c.cht"}) home.Put(file, "");
   const auto offered = [&](const std::string& typed) {
-    return FirstColumn(RunProgram(bash,
-                                  {"--norc", "-c",
-                                   "cd '" + home.path() + "'; source '" + Script("kora.bash") +
-                                       "'; COMP_WORDS=(kora \"$1\"); COMP_CWORD=1; _kora; "
-                                       "printf '%s\\n' \"${COMPREPLY[@]}\"",
-                                   "bash", typed})
-                           .out);
+    return FirstColumn(
+        RunProgram(bash, {"--norc", "-c",
+                          "cd '" + home.path() + "'; source '" + Script("kora.bash") +
+                              "'; COMP_WORDS=(kora \"$1\"); COMP_CWORD=1; _kora; "
+                              "printf '%s\\n' \"${COMPREPLY[@]}\"",
+                          "bash", typed})
+            .out);
   };
   auto all = words;
   all.insert({"a.cht", "folder", "drive_c"});

@@ -110,8 +110,9 @@ TEST_F(KoractlTest, EveryCommandButInitAndDemoNeedsASettingsFile) {
 
 TEST_F(KoractlTest, TheVersionIsThatOfTheProgramWithTheRevision) {
   const std::string out = Out({"--version"});
-  EXPECT_TRUE(std::regex_match(out, std::regex("koractl " + std::string(kVersion) +
-                                               " \\(revision (unknown|[0-9a-f]{7,}(-dirty)?)\\)\n")))
+  EXPECT_TRUE(
+      std::regex_match(out, std::regex("koractl " + std::string(kVersion) +
+                                       " \\(revision (unknown|[0-9a-f]{7,}(-dirty)?)\\)\n")))
       << out;
 }
 

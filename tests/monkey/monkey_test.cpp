@@ -16,7 +16,8 @@ namespace {
 using kora::test::ProgramResult;
 
 ProgramResult Monkey(const char* events, const char* seed) {
-  return kora::test::RunProgram(kora::BinDir() + "/kora_monkey", {"--events", events, "--seed", seed});
+  return kora::test::RunProgram(kora::BinDir() + "/kora_monkey",
+                                {"--events", events, "--seed", seed});
 }
 
 std::string LineOf(const std::string& text, const std::string& begin) {
@@ -29,7 +30,8 @@ std::string LineOf(const std::string& text, const std::string& begin) {
 TEST(MonkeyTest, AMessageOfAnErrorMustHaveItsNumberInTheGuide) {
   using kora::monkey::FaultOfMessage;
   const std::set<int> numbers = kora::monkey::NumbersOfGuide(
-      "<td>9</td><table id=\"numbers\"><tr><td>6</td></tr><tr><td>53</td></tr></table><tr><td>7</td>");
+      "<td>9</td><table "
+      "id=\"numbers\"><tr><td>6</td></tr><tr><td>53</td></tr></table><tr><td>7</td>");
   EXPECT_EQ(numbers, (std::set<int>{6, 53}));
   EXPECT_EQ(FaultOfMessage("There is an unexpected error No. 53\nFile not found", numbers), "");
   EXPECT_EQ(FaultOfMessage("Code not found", numbers), "");
@@ -62,7 +64,8 @@ TEST(MonkeyTest, AProgramThatIsUsedAtRandomNeitherDiesNorHangsNorLeavesItsHome) 
 }
 
 TEST(MonkeyTest, TheSameSeedGivesTheSameEvents) {
-  const ProgramResult first = Monkey("250", "3"), second = Monkey("250", "3"), other = Monkey("250", "4");
+  const ProgramResult first = Monkey("250", "3"), second = Monkey("250", "3"),
+                      other = Monkey("250", "4");
   const std::string digest = LineOf(first.out, "digest");
   EXPECT_NE(digest, "");
   EXPECT_EQ(LineOf(second.out, "digest"), digest);

@@ -277,8 +277,7 @@ void Chts::BuildMenus() {
     // Escape in a menu leaves the keys with the bar, which does nothing with them.
     connect(menu, &QMenu::aboutToHide, this, [this] {
       QTimer::singleShot(0, this, [this] {
-        if (QWidget::window()->focusWidget() == menuBar() &&
-            !QApplication::activePopupWidget())
+        if (QWidget::window()->focusWidget() == menuBar() && !QApplication::activePopupWidget())
           setFocus();
       });
     });
@@ -716,7 +715,7 @@ void Chts::SaveAs() {
       dialog->setDefaultSuffix(ending);
       if (dialog->selectedFiles().isEmpty()) return;
       dialog->selectFile(QFileInfo(dialog->selectedFiles().first()).completeBaseName() + "." +
-                        ending);
+                         ending);
     });
     try {
       dialog->setDirectory(ToQt(s_.files.HostPath(paths.ChartSavePath)));
@@ -876,8 +875,8 @@ TrendChoice Chts::PopUpTrend() {
 void Chts::OpenZoom(const ZoomBox& box) {
   QWidget* over = s_.zoomOver ? s_.zoomOver() : this;
   Modal<ZoomKora> form(
-      ZoomKoraServices{s_.dialogs, window_.Chart, window_.Request, s_.colours, s_.settings.fonts}, box,
-      over, this);
+      ZoomKoraServices{s_.dialogs, window_.Chart, window_.Request, s_.colours, s_.settings.fonts},
+      box, over, this);
   form.Run();
 }
 

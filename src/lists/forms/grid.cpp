@@ -626,10 +626,10 @@ void Grid::Paste() {
                QRegularExpression(QRegularExpression::anchoredPattern(ToQt(rule.typing)))
                    .match(wanted)
                    .hasMatch());
-          const auto refused = fits ? source_.SetText(row, column, text)
-                                    : Refusal{"\"" + ForMessage(wanted) +
-                                                  "\" can't stand in this column",
-                                              ToQt(rule.heading).simplified().toStdString()};
+          const auto refused =
+              fits ? source_.SetText(row, column, text)
+                   : Refusal{"\"" + ForMessage(wanted) + "\" can't stand in this column",
+                             ToQt(rule.heading).simplified().toStdString()};
           if (refused) {
             refusal = *refused;
             throw RunTimeError(kBadCall);
@@ -658,8 +658,7 @@ void Grid::SaveCsv(const std::string& hostPath) const {
 
 void Grid::SaveAs() {
   if (!EndEdit()) return;
-  Modal<QFileDialog> dialog(this, "Save As", QString(),
-                            "Comma separated (*.csv);;All files (*)");
+  Modal<QFileDialog> dialog(this, "Save As", QString(), "Comma separated (*.csv);;All files (*)");
   dialog->setObjectName("GridSaveDialog");
   dialog->setAcceptMode(QFileDialog::AcceptSave);
   dialog->setDefaultSuffix("csv");

@@ -48,8 +48,8 @@ FirstStart::FirstStart(FirstStartServices services, QWidget* parent)
   setWindowTitle(ToQt(kProgramTitle));
   auto* grid = new QGridLayout(this);
   QLabel* head = NewNote(this,
-                         "There is no installation yet in\n" + ToQt(services_.session.files.home()) +
-                             "\n\nWhat shall it begin with?",
+                         "There is no installation yet in\n" +
+                             ToQt(services_.session.files.home()) + "\n\nWhat shall it begin with?",
                          60);
   head->setObjectName("Label1");
   grid->addWidget(head, 0, 0, 1, 3);

@@ -276,31 +276,30 @@ void ChartDesk::OpenView(int set) {
     return;
   }
   chts_->window().AnalPageMode = true;
-  anal_ =
-      new Anal({.view = {.files = session_.files,
-                         .dialogs = session_.dialogs,
-                         .settings = session_.settings,
-                         .user = session_.user,
-                         .colours = session_.colours,
-                         .current = session_.current,
-                         .state = session_.charts,
-                         .VolumeUnitText = hooks_.VolumeUnitText},
-                .print = [this] { PrintView(); },
-                // The view has closed itself in the middle of an event of its menu bar, which a
-                // form that ran within that event would take away.
-                .openMultiOsc =
-                    [this] { QTimer::singleShot(0, over_, [this] { OpenMultiOsc(); }); },
-                .returned =
-                    [this] {
-                      if (!anal_) return;
-                      anal_.clear();
-                      if (!chts_) return;
-                      chts_->window().AnalPageMode = false;
-                      mdi_->setActiveSubWindow(qobject_cast<QMdiSubWindow*>(chts_->parentWidget()));
-                      chts_->setFocus();
-                      Refresh();
-                    }},
-               set);
+  anal_ = new Anal(
+      {.view = {.files = session_.files,
+                .dialogs = session_.dialogs,
+                .settings = session_.settings,
+                .user = session_.user,
+                .colours = session_.colours,
+                .current = session_.current,
+                .state = session_.charts,
+                .VolumeUnitText = hooks_.VolumeUnitText},
+       .print = [this] { PrintView(); },
+       // The view has closed itself in the middle of an event of its menu bar, which a
+       // form that ran within that event would take away.
+       .openMultiOsc = [this] { QTimer::singleShot(0, over_, [this] { OpenMultiOsc(); }); },
+       .returned =
+           [this] {
+             if (!anal_) return;
+             anal_.clear();
+             if (!chts_) return;
+             chts_->window().AnalPageMode = false;
+             mdi_->setActiveSubWindow(qobject_cast<QMdiSubWindow*>(chts_->parentWidget()));
+             chts_->setFocus();
+             Refresh();
+           }},
+      set);
   QMdiSubWindow* frame = mdi_->addSubWindow(anal_);
   frame->setAttribute(Qt::WA_DeleteOnClose);
   frame->setGeometry(chts_->parentWidget()->geometry());

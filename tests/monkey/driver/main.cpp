@@ -42,8 +42,8 @@ struct Arguments {
   std::uint64_t seed = 1;
   double hangs = 60;
   bool messages = false;  // all that were told are listed
-  std::string log;   // empty: in the folder of the run
-  std::string work;  // the folder of the run; named for the second process alone
+  std::string log;        // empty: in the folder of the run
+  std::string work;       // the folder of the run; named for the second process alone
 };
 
 std::string Bytes(const fs::path& path) {
@@ -103,7 +103,8 @@ std::map<std::string, long>& Warnings() {
 }
 
 void TakeWarning(QtMsgType, const QMessageLogContext&, const QString& text) {
-  if (!text.startsWith("This plugin does not support") && !text.contains("OpenType support missing"))
+  if (!text.startsWith("This plugin does not support") &&
+      !text.contains("OpenType support missing"))
     ++Warnings()[text.toStdString()];
 }
 
@@ -137,7 +138,8 @@ ProgramArguments SomeArguments(Generator& generator, const std::string& home) {
   const char* service = kServices[Below(generator, 5)];
   if (*service) arguments.overrides.push_back({"Download", "DataService", service});
   for (const char* word : {"RM", "N", "XT", "XS"})
-    if (Chance(generator, 0.4)) arguments.words += (arguments.words.empty() ? "" : " ") + std::string(word);
+    if (Chance(generator, 0.4))
+      arguments.words += (arguments.words.empty() ? "" : " ") + std::string(word);
   if (Chance(generator, 0.1)) arguments.words += " A";
   if (Chance(generator, 0.15)) arguments.file = home + "/drive_c/korawin/chtsave/broken.cht";
   return arguments;
@@ -263,35 +265,36 @@ void TellLast(const std::string& log) {
 
 int LookAfter(Arguments a, const char* self) {
   const bool memory = !getenv("TMPDIR") && access("/dev/shm", W_OK) == 0;
-  std::string work = (memory ? fs::path("/dev/shm") : fs::temp_directory_path()) / "kora-monkey-XXXXXX";
+  std::string work =
+      (memory ? fs::path("/dev/shm") : fs::temp_directory_path()) / "kora-monkey-XXXXXX";
   if (!mkdtemp(work.data())) throw std::runtime_error("no temporary folder");
   if (a.log.empty()) a.log = work + "/events.log";
-  for (const char* folder : {"homes", "user/tmp", "user/config", "user/cache", "user/data", "user/run"})
+  for (const char* folder :
+       {"homes", "user/tmp", "user/config", "user/cache", "user/data", "user/run"})
     fs::create_directories(work + "/" + folder);
   fs::permissions(work + "/user/run", fs::perms::owner_all);
   LaySentinels(work + "/outside");
   LaySentinels(work + "/homes/beside");
   const auto outside = Tree(work + "/outside"), beside = Tree(work + "/homes/beside");
-  const std::map<const char*, std::string> environment{
-      {"HOME", work + "/user"},
-      {"TMPDIR", work + "/user/tmp"},
-      {"XDG_CONFIG_HOME", work + "/user/config"},
-      {"XDG_CACHE_HOME", work + "/user/cache"},
-      {"XDG_DATA_HOME", work + "/user/data"},
-      {"XDG_RUNTIME_DIR", work + "/user/run"},
-      {"CUPS_SERVER", work + "/no-printers"},
-      {"QT_QPA_PLATFORM", "offscreen"},
-      {"QT_HASH_SEED", "0"}};
+  const std::map<const char*, std::string> environment{{"HOME", work + "/user"},
+                                                       {"TMPDIR", work + "/user/tmp"},
+                                                       {"XDG_CONFIG_HOME", work + "/user/config"},
+                                                       {"XDG_CACHE_HOME", work + "/user/cache"},
+                                                       {"XDG_DATA_HOME", work + "/user/data"},
+                                                       {"XDG_RUNTIME_DIR", work + "/user/run"},
+                                                       {"CUPS_SERVER", work + "/no-printers"},
+                                                       {"QT_QPA_PLATFORM", "offscreen"},
+                                                       {"QT_HASH_SEED", "0"}};
   const pid_t child = fork();
   if (child == 0) {
     for (const auto& [name, value] : environment) setenv(name, value.c_str(), 1);
     unsetenv("DISPLAY");
     unsetenv("WAYLAND_DISPLAY");
     if (chdir((work + "/user").c_str()) != 0) _exit(127);
-    const std::string words[] = {"--events", Number(double(a.events)), "--seed", std::to_string(a.seed),
-                                 "--hangs",  Number(a.hangs),          "--log",  a.log,
-                                 "--messages", a.messages ? "yes" : "no",
-                                 "--work",   work};
+    const std::string words[] = {
+        "--events",   Number(double(a.events)),  "--seed", std::to_string(a.seed),
+        "--hangs",    Number(a.hangs),           "--log",  a.log,
+        "--messages", a.messages ? "yes" : "no", "--work", work};
     std::vector<char*> argv{const_cast<char*>(self)};
     for (const std::string& word : words) argv.push_back(const_cast<char*>(word.c_str()));
     argv.push_back(nullptr);
@@ -302,7 +305,8 @@ int LookAfter(Arguments a, const char* self) {
   waitpid(child, &status, 0);
   int code = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
   if (code > 1) {
-    std::fprintf(stderr, "DIED with %d, seed %llu\n", code, static_cast<unsigned long long>(a.seed));
+    std::fprintf(stderr, "DIED with %d, seed %llu\n", code,
+                 static_cast<unsigned long long>(a.seed));
     TellLast(a.log);
   }
   if (Tree(work + "/outside") != outside || Tree(work + "/homes/beside") != beside) {
@@ -320,14 +324,22 @@ int main(int argc, char** argv) {
   kora::monkey::Arguments a;
   for (int i = 1; i + 1 < argc; i += 2) {
     const std::string name = argv[i], value = argv[i + 1];
-    if (name == "--events") a.events = std::stol(value);
-    else if (name == "--seed") a.seed = std::stoull(value);
-    else if (name == "--hangs") a.hangs = std::stod(value);
-    else if (name == "--log") a.log = value;
-    else if (name == "--messages") a.messages = value == "yes";
-    else if (name == "--work") a.work = value;
+    if (name == "--events")
+      a.events = std::stol(value);
+    else if (name == "--seed")
+      a.seed = std::stoull(value);
+    else if (name == "--hangs")
+      a.hangs = std::stod(value);
+    else if (name == "--log")
+      a.log = value;
+    else if (name == "--messages")
+      a.messages = value == "yes";
+    else if (name == "--work")
+      a.work = value;
     else {
-      std::fprintf(stderr, "kora_monkey [--events N] [--seed S] [--hangs SECONDS] [--log FILE] [--messages yes]\n");
+      std::fprintf(
+          stderr,
+          "kora_monkey [--events N] [--seed S] [--hangs SECONDS] [--log FILE] [--messages yes]\n");
       return 2;
     }
   }

@@ -10,7 +10,6 @@
 namespace kora::monkey {
 namespace {
 
-
 // The numbers that stand behind `before`, blanks between.
 std::vector<int> NumbersBehind(std::string_view text, std::string_view before) {
   std::vector<int> numbers;
@@ -29,7 +28,8 @@ std::vector<int> NumbersBehind(std::string_view text, std::string_view before) {
 std::set<int> NumbersOfGuide(const std::string& html) {
   const size_t from = html.find("<table id=\"numbers\">");
   if (from == html.npos) return {};
-  const auto rows = NumbersBehind(html.substr(from, html.find("</table>", from) - from), "<tr><td>");
+  const auto rows =
+      NumbersBehind(html.substr(from, html.find("</table>", from) - from), "<tr><td>");
   return {rows.begin(), rows.end()};
 }
 

@@ -97,7 +97,8 @@ void Monkey::Fail(const std::string& what) {
   std::fflush(stderr);
 }
 
-void Monkey::FailMessage(const std::string& text, const std::string& title, const std::string& why) {
+void Monkey::FailMessage(const std::string& text, const std::string& title,
+                         const std::string& why) {
   Fail(why + ": \"" + text + "\" (" + title + ")");
 }
 
@@ -121,7 +122,8 @@ void Monkey::EndRun() {
     // Forms that were left stay with the main window until it goes: some are kept on purpose.
     std::map<std::string, int> kept;
     for (QWidget* w : main->findChildren<QWidget*>())
-      if (w->isWindow() && !w->isVisible() && !qobject_cast<QMenu*>(w) && !w->objectName().isEmpty())
+      if (w->isWindow() && !w->isVisible() && !qobject_cast<QMenu*>(w) &&
+          !w->objectName().isEmpty())
         ++kept[Text(w->objectName())];
     for (const auto& [name, count] : kept)
       if (count > kWindowsOfAName)
@@ -253,7 +255,8 @@ bool Monkey::ButtonGoesDown() {
   if (!QApplication::activePopupWidget() && pressed_.elapsed() < 300)
     for (QWidget* window : QApplication::topLevelWidgets())
       for (auto* button : window->findChildren<QAbstractButton*>())
-        if (button->isDown() && button->isVisible() && !button->inherits("QToolButton")) return true;
+        if (button->isDown() && button->isVisible() && !button->inherits("QToolButton"))
+          return true;
   keyed_ = false;
   return false;
 }
@@ -412,8 +415,10 @@ void Monkey::UsePopup(QWidget* popup) {
   }
   if (how < 5) return SomeKey();
   QWidget* target = popup;
-  if (auto* view = qobject_cast<QAbstractItemView*>(popup)) target = view->viewport();
-  else if (auto* inner = popup->findChild<QAbstractItemView*>()) target = inner->viewport();
+  if (auto* view = qobject_cast<QAbstractItemView*>(popup))
+    target = view->viewport();
+  else if (auto* inner = popup->findChild<QAbstractItemView*>())
+    target = inner->viewport();
   const QPoint at = PointIn(target);
   Note("click in a list " + Shown(at));
   Click(target, at);
@@ -498,7 +503,8 @@ void Monkey::UseWindow(QWidget* window) {
       if (!there) return;
       if (Chance(generator_, 0.7)) Key(Qt::Key_A, Qt::ControlModifier);
       Type(text);
-      if (Chance(generator_, 0.4)) Key(Chance(generator_, 0.6) ? Qt::Key_Return : Qt::Key_Tab, {}, "\r");
+      if (Chance(generator_, 0.4))
+        Key(Chance(generator_, 0.6) ? Qt::Key_Return : Qt::Key_Tab, {}, "\r");
       return;
     }
   }
@@ -508,7 +514,8 @@ void Monkey::UseWindow(QWidget* window) {
                         : PointIn(control);
   if (how < 85) {
     Note("click " + KeyOf(control) + " " + Shown(at));
-    return Click(control, at, Qt::LeftButton, Chance(generator_, 0.1) ? SomeModifiers() : Qt::NoModifier);
+    return Click(control, at, Qt::LeftButton,
+                 Chance(generator_, 0.1) ? SomeModifiers() : Qt::NoModifier);
   }
   if (how < 89) {
     Note("double click " + KeyOf(control) + " " + Shown(at));
@@ -648,12 +655,13 @@ void Monkey::Key(int key, Qt::KeyboardModifiers keys, const QString& text) {
 
 void Monkey::SomeKey() {
   static constexpr std::array kKeys{
-      Qt::Key_Tab,  Qt::Key_Backtab, Qt::Key_Return, Qt::Key_Enter,     Qt::Key_Space, Qt::Key_Up,
-      Qt::Key_Down, Qt::Key_Left,    Qt::Key_Right,  Qt::Key_Home,      Qt::Key_End,   Qt::Key_PageUp,
-      Qt::Key_Delete, Qt::Key_PageDown, Qt::Key_Insert, Qt::Key_Backspace, Qt::Key_F1, Qt::Key_F2,
-      Qt::Key_F3,   Qt::Key_F4,      Qt::Key_F5,     Qt::Key_F6,        Qt::Key_F7,    Qt::Key_F8,
-      Qt::Key_F9,   Qt::Key_F10,     Qt::Key_F11,    Qt::Key_F12,       Qt::Key_Menu,  Qt::Key_Plus,
-      Qt::Key_Minus, Qt::Key_Escape};
+      Qt::Key_Tab,       Qt::Key_Backtab, Qt::Key_Return, Qt::Key_Enter,    Qt::Key_Space,
+      Qt::Key_Up,        Qt::Key_Down,    Qt::Key_Left,   Qt::Key_Right,    Qt::Key_Home,
+      Qt::Key_End,       Qt::Key_PageUp,  Qt::Key_Delete, Qt::Key_PageDown, Qt::Key_Insert,
+      Qt::Key_Backspace, Qt::Key_F1,      Qt::Key_F2,     Qt::Key_F3,       Qt::Key_F4,
+      Qt::Key_F5,        Qt::Key_F6,      Qt::Key_F7,     Qt::Key_F8,       Qt::Key_F9,
+      Qt::Key_F10,       Qt::Key_F11,     Qt::Key_F12,    Qt::Key_Menu,     Qt::Key_Plus,
+      Qt::Key_Minus,     Qt::Key_Escape};
   if (Chance(generator_, 0.4)) {
     const int letter = Qt::Key_A + Below(generator_, 26);
     const Qt::KeyboardModifiers keys = SomeModifiers();
@@ -674,7 +682,8 @@ void Monkey::SomeKey() {
 
 // Short ones letter by letter, the others as from a keyboard of another script, or pasted.
 void Monkey::Type(const QString& text) {
-  const bool plain = std::all_of(text.begin(), text.end(), [](QChar c) { return c >= ' ' && c <= '~'; });
+  const bool plain =
+      std::all_of(text.begin(), text.end(), [](QChar c) { return c >= ' ' && c <= '~'; });
   if (plain && text.size() <= 24) {
     for (const QChar c : text) Key(c.toUpper().unicode(), {}, QString(c));
     return;
@@ -740,7 +749,8 @@ std::vector<QWidget*> Monkey::Controls(QWidget* window) const {
                          w->inherits("QScrollBar");
     // Parts of a box take what the box gets.
     const QWidget* parent = w->parentWidget();
-    const bool part = parent && (parent->inherits("QAbstractSpinBox") || parent->inherits("QComboBox"));
+    const bool part =
+        parent && (parent->inherits("QAbstractSpinBox") || parent->inherits("QComboBox"));
     if (control && !part) out.push_back(w);
   }
   return out;

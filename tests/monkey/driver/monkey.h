@@ -33,11 +33,11 @@ class Monkey : public QObject {
   struct Options {
     std::uint64_t seed = 1;
     long events = 2000;
-    long longestRun = 4000;    // events after which the main window is closed
-    double hangs = 60;         // seconds of the processor for one event
-    std::set<int> numbers;     // of errors that the guide explains
+    long longestRun = 4000;  // events after which the main window is closed
+    double hangs = 60;       // seconds of the processor for one event
+    std::set<int> numbers;   // of errors that the guide explains
     std::vector<std::string> codes;
-    std::string log;           // host file: a line an event
+    std::string log;  // host file: a line an event
   };
   explicit Monkey(Options options);
   ~Monkey() override;

@@ -1,10 +1,9 @@
 #pragma once
 
+#include <QString>
 #include <random>
 #include <string>
 #include <vector>
-
-#include <QString>
 
 namespace kora::monkey {
 

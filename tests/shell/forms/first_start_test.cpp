@@ -15,7 +15,8 @@
 namespace kora {
 namespace {
 
-std::map<std::string, std::string> FilesBelow(const test::TempHome& home, const std::string& folder) {
+std::map<std::string, std::string> FilesBelow(const test::TempHome& home,
+                                              const std::string& folder) {
   std::map<std::string, std::string> out;
   const std::string root = home.path() + "/" + folder;
   for (const auto& entry : std::filesystem::recursive_directory_iterator(root)) {
@@ -155,7 +156,8 @@ TEST_F(FirstStartTest, AFolderThatCantBeTheDataFolderIsTold) {
   Folder()->setText(QString::fromStdString(home.path()));
   ExpectRefused("There is no name file (Names.dat) in " + dos +
                 "\\.\n\nIt is an installation of its own. Start the program on it with\n"
-                "kora --home " + home.path());
+                "kora --home " +
+                home.path());
   const std::string deep(60, 'd');
   home.Put(deep + "/Names.dat", "");
   Folder()->setText(QString::fromStdString(home.path() + "/" + deep));
@@ -188,7 +190,8 @@ TEST_F(FirstStartTest, EachControlHasANameAndTheTabGoesThroughThem) {
   for (QWidget* w = Find<QRadioButton>(form.get(), "Option1(2)");;) {
     QAccessibleInterface* node = QAccessible::queryAccessibleInterface(w);
     ASSERT_NE(node, nullptr);
-    EXPECT_FALSE(node->text(QAccessible::Name).trimmed().isEmpty()) << w->objectName().toStdString();
+    EXPECT_FALSE(node->text(QAccessible::Name).trimmed().isEmpty())
+        << w->objectName().toStdString();
     order.push_back(w->objectName().toStdString());
     w->setFocus();
     QTest::keyClick(w, Qt::Key_Tab);
