@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
-#include <limits>
 #include <vector>
 
 #include "base/numbers.h"
@@ -13,11 +12,10 @@
 namespace kora {
 namespace {
 
-constexpr double kLabelGap = 5;     // between a right-aligned label and the frame
-constexpr double kWordX = 14;       // the middle of "VOL"
-constexpr double kDateGap = 2;      // the least between two texts of the date axis
-constexpr double kTitleGap = 2;     // by which the title may reach into the line below it
-constexpr double kLabelHeight = 9;  // of the figures of a price label
+constexpr double kLabelGap = 5;  // between a right-aligned label and the frame
+constexpr double kWordX = 14;    // the middle of "VOL"
+constexpr double kDateGap = 2;   // the least between two texts of the date axis
+constexpr double kTitleGap = 2;  // by which the title may reach into the line below it
 
 double LnAbove0(double value) {
   if (!(value > 0)) throw RunTimeError(kBadCall);
@@ -46,16 +44,11 @@ std::vector<ScaleTick> ScaleTicks(const ChartCanvas& canvas) {
   const double low = chart.Scale.ScaleLow, step = chart.Scale.GridStep;
   const bool fromZero = chart.Scale.ScaleLow == 0.001f;
   std::vector<ScaleTick> ticks;
-  double lastLabel = std::numeric_limits<double>::max();
   for (int i = 0; i <= chart.Scale.GridCount; ++i) {
     const auto v = static_cast<float>(fromZero && i > 0 ? step * i : step * i + low);
     const double y = chart.Price.Y(v);
     if (y < chart.ChartTop) break;
-    bool labelled = chart.Scale.GridCount <= 12 || i <= 6 || i % 2 == 0;
-    if (canvas.request.Legible && labelled) {
-      labelled = lastLabel - y >= kLabelHeight;
-      if (labelled) lastLabel = y;
-    }
+    const bool labelled = chart.Scale.GridCount <= 12 || i <= 6 || i % 2 == 0;
     ticks.push_back({i, y, labelled ? Format(v, v > 0 && v < 0.2 ? ".00#" : format) : ""});
   }
   return ticks;

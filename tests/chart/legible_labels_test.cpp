@@ -1,8 +1,5 @@
 #include <gtest/gtest.h>
 
-#include <algorithm>
-#include <cstdio>
-
 #include "chart/scale_drawing.h"
 #include "tests/chart/composer_fixture.h"
 
@@ -102,7 +99,7 @@ TEST(LegibleLabels, PricesOfThreeDigitsHaveTheRoomThatTheyHad) {
 TEST(LegibleLabels, OnALowChartTheTitleStandsAlone) {
   ComposerFixture f;
   f.Days("20240315", 20);
-  f.price.SetScale(0, 0, 638, 200);
+  f.price = test::RecordingSurface(638, 200);
   const auto modes = [&f] {
     Lines found;
     for (const std::string& line : f.Lines('S'))
@@ -114,42 +111,9 @@ TEST(LegibleLabels, OnALowChartTheTitleStandsAlone) {
   f.request.Legible = true;
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(modes(), Lines{});
-  f.price.SetScale(0, 0, 638, 452);
+  f.price = test::RecordingSurface(638, 452);
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(modes().size(), 1u);
-}
-
-// A figure is 9 units high.
-TEST(LegibleLabels, APriceThatWouldTouchTheOneBelowIsLeftOut) {
-  ComposerFixture f;
-  f.Days("20240315", 20);
-  f.price.SetScale(0, 0, 638, 110);
-  const auto heights = [&f] {
-    std::vector<double> found;
-    for (const std::string& line : f.Lines('S')) {
-      double x = 0, y = 0, price = 0;
-      int colour = 0, end = 0;
-      if (std::sscanf(line.c_str(), "S,8.25,%lf,%lf,%lf,%d%n", &x, &y, &price, &colour, &end) ==
-              4 &&
-          size_t(end) == line.size())
-        found.push_back(y);
-    }
-    return found;
-  };
-  const auto closest = [](const std::vector<double>& ys) {
-    double least = 1000;
-    for (size_t i = 1; i < ys.size(); ++i) least = std::min(least, ys[i - 1] - ys[i]);
-    return least;
-  };
-  ASSERT_TRUE(f.Compose());
-  const auto all = heights();
-  ASSERT_GE(all.size(), 4u);
-  ASSERT_LT(closest(all), 9);
-  f.request.Legible = true;
-  ASSERT_TRUE(f.Compose());
-  EXPECT_GE(closest(heights()), 9);
-  EXPECT_EQ(heights().front(), all.front()) << "the lowest stays";
-  EXPECT_GE(heights().size(), 2u);
 }
 
 // Months 2 units apart: a year is 24, and as wide is its text.
