@@ -40,7 +40,7 @@ const std::string kElsewhere = "elsewhere/";
 int Stride() {
   if (const char* step = std::getenv("KORA_KILLS_STEP")) return std::max(1, std::atoi(step));
 #ifdef __SANITIZE_ADDRESS__
-  return 40;
+  return 80;
 #else
   return 6;
 #endif
