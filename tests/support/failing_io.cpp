@@ -40,7 +40,9 @@ bool FailingIo::Fails() {
 }
 
 std::unique_ptr<HostFile> FailingIo::Open(const std::string& path, OpenMode mode) {
-  if (mode != OpenMode::kRead && mode != OpenMode::kReadWrite) Change();
+  // A new file under a name that is taken is refused, and changes nothing.
+  const bool refused = mode == OpenMode::kNew && base_.Status(path).exists;
+  if (mode != OpenMode::kRead && mode != OpenMode::kReadWrite && !refused) Change();
   if (mode == OpenMode::kRead) ReadCall();
   return std::make_unique<File>(*this, base_.Open(path, mode));
 }
