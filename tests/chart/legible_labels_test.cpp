@@ -95,7 +95,8 @@ TEST(LegibleLabels, PricesOfThreeDigitsHaveTheRoomThatTheyHad) {
   EXPECT_EQ(f.Script(), before);
 }
 
-// The frame of a chart 200 high begins at 20: the line above it at 2, where the title stands.
+// The frame of a chart 200 high begins at 20: the line above it at 2, in the script at 8, where the
+// title stands.
 TEST(LegibleLabels, OnALowChartTheTitleStandsAlone) {
   ComposerFixture f;
   f.Days("20240315", 20);
@@ -107,7 +108,7 @@ TEST(LegibleLabels, OnALowChartTheTitleStandsAlone) {
     return found;
   };
   ASSERT_TRUE(f.Compose());
-  EXPECT_EQ(modes(), Lines{"S,8.25,44,2,DAILY - ARITHMETIC -,27"});
+  EXPECT_EQ(modes(), Lines{"S,8.25,44,8,DAILY - ARITHMETIC -,27"});
   f.request.Legible = true;
   ASSERT_TRUE(f.Compose());
   EXPECT_EQ(modes(), Lines{});

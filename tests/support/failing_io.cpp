@@ -69,7 +69,7 @@ void FailingIo::Rename(const std::string& from, const std::string& to) {
 void FailingIo::FlushDisk(const std::string&) { Change(); }
 
 void FailingIo::Link(const std::string& from, const std::string& to) {
-  Change();
+  if (!base_.Status(to).exists) Change();  // as above
   base_.Link(from, to);
 }
 
