@@ -139,25 +139,34 @@ std::vector<ListRec> CodeNumbers::Refreshed(std::span<const std::string> codes,
   return out;
 }
 
-void StageList(FileSet& set, const Files& files, const std::string& dataPath,
-               std::int16_t ChartListNo, const CodeNumbers& numbers) {
-  const auto old = ReadList(files, dataPath, ChartListNo);
+namespace {
+
+void StageRefreshed(FileSet& set, const std::string& path, std::span<const ListRec> old,
+                    const CodeNumbers& numbers) {
   ListCodes dropped;
   const auto fresh = numbers.Refreshed(CodesOf(old), dropped);
-  if (BytesOf(fresh) != BytesOf(old))
-    set.Add(ListFilePath(dataPath, ChartListNo), std::string(BytesOf(fresh)));
+  if (BytesOf(fresh) != BytesOf(old)) set.Add(path, std::string(BytesOf(fresh)));
+}
+
+}  // namespace
+
+void StageList(FileSet& set, const Files& files, const std::string& dataPath,
+               std::int16_t ChartListNo, const CodeNumbers& numbers) {
+  StageRefreshed(set, ListFilePath(dataPath, ChartListNo), ReadList(files, dataPath, ChartListNo),
+                 numbers);
 }
 
 void StageLists(FileSet& set, const Files& files, const std::string& dataPath,
                 const CodeNumbers& numbers) {
   for (std::int16_t number = kFirstChartList; number <= kResultList; ++number) {
+    std::vector<ListRec> old;
     try {
-      ReadList(files, dataPath, number);
+      old = ReadList(files, dataPath, number);
     } catch (const RunTimeError& e) {
       if (e.number() == kOverflow || e.number() == kPathAccess) continue;  // nor can it be shown
       throw;
     }
-    StageList(set, files, dataPath, number, numbers);
+    StageRefreshed(set, ListFilePath(dataPath, number), old, numbers);
   }
 }
 
