@@ -1,28 +1,17 @@
 #include "tests/support/temp_home.h"
 
-#include <stdlib.h>
-#include <unistd.h>
-
-#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <stdexcept>
 
+#include "tests/support/temp_place.h"
+
 namespace kora::test {
 namespace {
 
-// Where the user names no place, a file system in memory: tests that cut an operation at each of
-// its calls flush thousands of times.
-std::filesystem::path TempPlace() {
-  const char* memory = "/dev/shm";
-  const bool named = std::getenv("TMPDIR") != nullptr;
-  return !named && ::access(memory, W_OK) == 0 ? memory : std::filesystem::temp_directory_path();
-}
-
 std::string MakeFolder() {
-  std::string name = (TempPlace() / "kora-test-XXXXXX").string();
-  if (!::mkdtemp(name.data())) throw std::runtime_error("no temporary folder");
+  std::string name = MakeTempFolder("kora-test");
   std::filesystem::create_directory(name + "/drive_c");
   return name;
 }

@@ -31,6 +31,7 @@
 #include "tests/monkey/driver/monkey.h"
 #include "tests/support/places.h"
 #include "tests/support/scripted_dialogs.h"
+#include "tests/support/temp_place.h"
 
 namespace fs = std::filesystem;
 
@@ -264,10 +265,7 @@ void TellLast(const std::string& log) {
 }
 
 int LookAfter(Arguments a, const char* self) {
-  const bool memory = !getenv("TMPDIR") && access("/dev/shm", W_OK) == 0;
-  std::string work =
-      (memory ? fs::path("/dev/shm") : fs::temp_directory_path()) / "kora-monkey-XXXXXX";
-  if (!mkdtemp(work.data())) throw std::runtime_error("no temporary folder");
+  const std::string work = test::MakeTempFolder("kora-monkey");
   if (a.log.empty()) a.log = work + "/events.log";
   for (const char* folder :
        {"homes", "user/tmp", "user/config", "user/cache", "user/data", "user/run"})
