@@ -365,6 +365,17 @@ class Kills : public ::testing::TestWithParam<Operation> {
     }
   }
 
+  // What ended with a failure told it, and took everything back.
+  void ExpectTold(const Outcome& run, const DiskView& after) {
+    EXPECT_EQ(run.code, 1) << run.err;
+    if (!(GetParam().ends & kQuiet)) {
+      EXPECT_NE(run.err, "");
+    }
+    if (Together()) {
+      EXPECT_TRUE(SameView(WithoutCopy(after), WithoutCopy(before))) << run.err;
+    }
+  }
+
   // All that a failed run may leave.
   void ExpectFailed(const Outcome& run, const Disk& disk) {
     const DiskView after = ViewOf(disk, kHome);
@@ -373,13 +384,7 @@ class Kills : public ::testing::TestWithParam<Operation> {
       // What fails without harm, as the flush of a folder where there is none.
       if (Together() && !(GetParam().ends & kPassedOver)) ExpectSame(after, whole);
     } else {
-      EXPECT_EQ(run.code, 1) << run.err;
-      if (!(GetParam().ends & kQuiet)) {
-        EXPECT_NE(run.err, "");
-      }
-      if (Together()) {
-        EXPECT_TRUE(SameView(WithoutCopy(after), WithoutCopy(before))) << run.err;
-      }
+      ExpectTold(run, after);
     }
     for (const std::string& name : TemporariesOn(disk, kHome))
       ADD_FAILURE() << name << " is left over";
@@ -464,13 +469,7 @@ TEST_P(Kills, FailedReadsAreTold) {
         EXPECT_NE(run.err, "");
       }
     } else {
-      EXPECT_EQ(run.code, 1) << run.err;
-      if (!(GetParam().ends & kQuiet)) {
-        EXPECT_NE(run.err, "");
-      }
-      if (Together()) {
-        EXPECT_TRUE(SameView(WithoutCopy(after), WithoutCopy(before))) << run.err;
-      }
+      ExpectTold(run, after);
     }
     for (const std::string& name : TemporariesOn(disk.disk, kHome))
       ADD_FAILURE() << name << " is left over";
